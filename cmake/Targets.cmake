@@ -1,0 +1,22 @@
+# How our kinds of targets are made.
+
+# vk_platform_library(NAME SOURCES... [LINK LIBS...]): one of the product's shared libraries, lib<NAME>.so.1.
+function(vk_platform_library name)
+    cmake_parse_arguments(ARG "" "" "LINK" ${ARGN})
+    add_library(${name} SHARED ${ARG_UNPARSED_ARGUMENTS})
+    set_target_properties(${name} PROPERTIES VERSION 1 SOVERSION 1 INSTALL_RPATH "$ORIGIN")
+    target_compile_options(${name} PRIVATE -fvisibility=default)
+    target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/platform/include PRIVATE ${CMAKE_SOURCE_DIR}/platform)
+    target_link_libraries(${name} PRIVATE vk_settings ${ARG_LINK})
+endfunction()
+
+# vk_test(NAME SOURCES... [LINK LIBS...] [ENV VAR=VALUE...]): a GoogleTest program, each of its tests known to ctest.
+function(vk_test name)
+    cmake_parse_arguments(ARG "" "" "LINK;ENV;LABELS" ${ARGN})
+    add_executable(${name} ${ARG_UNPARSED_ARGUMENTS})
+    target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/platform ${CMAKE_SOURCE_DIR}/tests)
+    target_link_libraries(${name} PRIVATE vk_settings ${ARG_LINK} GTest::gmock_main)
+    set_target_properties(${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/tests)
+    gtest_discover_tests(${name} TEST_PREFIX ${name}. DISCOVERY_TIMEOUT 60
+        PROPERTIES ENVIRONMENT "${ARG_ENV}" LABELS "${ARG_LABELS}" TIMEOUT 300)
+endfunction()

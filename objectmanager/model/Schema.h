@@ -1,0 +1,59 @@
+#pragma once
+
+#include <cmpidt.h>
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace om {
+
+/// A declared property or parameter.
+struct PropertyDeclaration {
+    std::string name;
+    CMPIType type = CMPI_null; ///< with CMPI_ARRAY for arrays
+    bool key = false;
+    std::string referenceClass; ///< for CMPI_ref only
+};
+
+struct ParameterDeclaration : PropertyDeclaration {
+    bool in = false;
+    bool out = false;
+};
+
+struct MethodDeclaration {
+    std::string name;
+    CMPIType returnType = CMPI_null;
+    std::vector<ParameterDeclaration> parameters;
+};
+
+struct ClassDeclaration {
+    std::string name;
+    std::string superclass; ///< empty at the top
+    bool association = false;
+    std::vector<PropertyDeclaration> properties; ///< its own, without inherited ones
+    std::vector<MethodDeclaration> methods;
+};
+
+/// The classes that the object manager knows. Every name compares without regard to case; look-ups of properties and
+/// methods go up the line of inheritance, nearest class first.
+class Schema {
+public:
+    explicit Schema(std::vector<ClassDeclaration> classes);
+
+    /// The classes built in, those served by the default provider and their ancestry.
+    static const Schema& builtin();
+
+    const std::vector<ClassDeclaration>& classes() const { return classes_; }
+    /// The class, property or method of that name, or null.
+    const ClassDeclaration* find(std::string_view className) const;
+    const PropertyDeclaration* findProperty(std::string_view className, std::string_view property) const;
+    const MethodDeclaration* findMethod(std::string_view className, std::string_view method) const;
+    /// Whether `className` is `ancestor` or derives from it; false for unknown classes.
+    bool isA(std::string_view className, std::string_view ancestor) const;
+
+private:
+    std::vector<ClassDeclaration> classes_;
+};
+
+} // namespace om

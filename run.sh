@@ -1,0 +1,13 @@
+#!/usr/bin/env bash
+# Builds the project and runs vkcim: ./run.sh [ARGS], without ARGS a report of this host. See ./run.sh --help.
+set -euo pipefail
+here=$(cd "$(dirname "${BASH_SOURCE[0]}")" && pwd)
+caller=$PWD
+cd "$here"
+. scripts/common.sh
+# shellcheck disable=SC2086
+install_packages $build_packages
+build_tree release build
+cd "$caller"
+[ $# -gt 0 ] || set -- report
+exec "$here/build/bin/vkcim" "$@"
