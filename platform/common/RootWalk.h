@@ -1,0 +1,49 @@
+#pragma once
+
+#include "common/FileDescriptor.h"
+
+#include <string>
+#include <sys/types.h>
+#include <utility>
+#include <vector>
+
+namespace VK {
+
+/// Follows a path below a directory one name at a time, symbolic links by hand, without ever leaving the directory,
+/// also while somebody renames what is being walked. What the kernel's RESOLVE_IN_ROOT does, for kernels and sandboxes
+/// without it, and with the names walked through.
+class __attribute__((visibility("hidden"))) RootWalk {
+public:
+    explicit RootWalk(FileDescriptor rootDirectory) : root(std::move(rootDirectory)) {}
+
+    /// Walks to the path: 0, or an errno value. With `followLast` a link at its end is followed too.
+    int walk(const std::string& path, bool followLast);
+
+    /// After ENOENT: whether everything but the path's last name is there, so that `open` can make it.
+    bool onlyLastNameIsMissing() const { return !missing.empty(); }
+
+    /// Opens what was walked to (or makes it, with O_CREAT): a descriptor or a negative errno value.
+    int open(int flags, mode_t mode) const;
+
+    /// Where the walk stands: absolute below the root.
+    std::string path() const;
+
+private:
+    struct Step {
+        std::string name;
+        FileDescriptor fd;
+    };
+
+    int enter(const std::string& name, bool followLink);
+    int follow(const FileDescriptor& link);
+    void defer(const std::string& path);
+    int top() const { return steps.empty() ? root.get() : steps.back().fd.get(); }
+
+    FileDescriptor root;
+    std::vector<Step> steps;          ///< from below the root to here
+    std::vector<std::string> pending; ///< names still to walk, the next one last
+    std::string missing;              ///< the last name, when nothing is there
+    unsigned int linksFollowed = 0;
+};
+
+} // namespace VK

@@ -1,0 +1,193 @@
+#include "vk/Root.h"
+
+#include "support/TemporaryDirectory.h"
+
+#include <cerrno>
+#include <fcntl.h>
+#include <gmock/gmock.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+using support::TemporaryDirectory;
+using testing::ElementsAre;
+using testing::StartsWith;
+using VK::Root;
+
+namespace {
+
+class SnapshotRoot : public testing::Test {
+protected:
+    TemporaryDirectory folder;
+    Root root{folder.path()};
+};
+
+} // namespace
+
+TEST_F(SnapshotRoot, ReadsAFile) {
+    folder.write("etc/hostname", "node7\n");
+    const Root::Contents contents = root.read("/etc/hostname");
+    EXPECT_TRUE(contents);
+    EXPECT_EQ(contents.text, "node7\n");
+    EXPECT_FALSE(contents.truncated);
+    EXPECT_EQ(root.read("etc/hostname").text, "node7\n");
+}
+
+TEST_F(SnapshotRoot, ReadsAnEmptyFileAsSuccess) {
+    folder.write("etc/machine-id", "");
+    EXPECT_TRUE(root.read("/etc/machine-id"));
+    EXPECT_EQ(root.read("/etc/machine-id").text, "");
+}
+
+TEST_F(SnapshotRoot, ReadsBytesAsTheyAre) {
+    const std::string bytes("\0\xff\n\0", 4);
+    folder.write("DMI", bytes);
+    EXPECT_EQ(root.read("/DMI").text, bytes);
+}
+
+TEST_F(SnapshotRoot, TellsWhyAFileCannotBeRead) {
+    folder.write("etc/file", "x");
+    EXPECT_EQ(root.read("/etc/missing").error, ENOENT);
+    EXPECT_EQ(root.read("/no/where").error, ENOENT);
+    EXPECT_EQ(root.read("/etc").error, EISDIR);
+    EXPECT_EQ(root.read("/etc/file/below").error, ENOTDIR);
+    EXPECT_EQ(root.read(std::string("/etc/file\0x", 11)).error, EINVAL);
+    EXPECT_EQ(Root(folder.path() + "/none").read("/etc/file").error, ENOENT);
+}
+
+TEST_F(SnapshotRoot, TellsAForbiddenFileFromAMissingOne) {
+    if (geteuid() == 0) GTEST_SKIP() << "root may read everything";
+    folder.write("secret", "x");
+    chmod((folder.path() + "/secret").c_str(), 0);
+    EXPECT_EQ(root.read("/secret").error, EACCES);
+}
+
+TEST_F(SnapshotRoot, NeverWaitsForAFifo) {
+    ASSERT_EQ(mkfifo((folder.path() + "/fifo").c_str(), 0600), 0);
+    EXPECT_EQ(root.read("/fifo").error, EINVAL);
+}
+
+TEST_F(SnapshotRoot, ReadsAtMostTheLimit) {
+    folder.write("big", std::string(Root::DEFAULT_LIMIT + 5, 'x'));
+    folder.write("exact", std::string(Root::DEFAULT_LIMIT, 'x'));
+    EXPECT_EQ(root.read("/big").text.size(), Root::DEFAULT_LIMIT);
+    EXPECT_TRUE(root.read("/big").truncated);
+    EXPECT_EQ(root.read("/exact").text.size(), Root::DEFAULT_LIMIT);
+    EXPECT_FALSE(root.read("/exact").truncated);
+    EXPECT_EQ(root.read("/big", 3).text, "xxx");
+    EXPECT_EQ(root.read("/big", 0).text, "");
+    EXPECT_TRUE(root.read("/big", 0).truncated);
+}
+
+TEST_F(SnapshotRoot, TakesAbsoluteLinksInsideTheRoot) {
+    folder.write("usr/share/zoneinfo/Europe/Berlin", "TZif");
+    folder.link("/usr/share/zoneinfo/Europe/Berlin", "etc/localtime");
+    EXPECT_EQ(root.read("/etc/localtime").text, "TZif");
+    EXPECT_EQ(root.readLink("/etc/localtime").text, "/usr/share/zoneinfo/Europe/Berlin");
+    EXPECT_EQ(root.resolve("/etc/localtime").text, "/usr/share/zoneinfo/Europe/Berlin");
+}
+
+TEST_F(SnapshotRoot, NeverLeavesTheRoot) {
+    TemporaryDirectory outside;
+    outside.write("passwd", "outside");
+    folder.write("passwd", "inside");
+    folder.link("../../../../../../../../../../passwd", "dots");
+    folder.link(outside.path() + "/passwd", "absolute");
+    folder.link(outside.path(), "folder");
+    EXPECT_EQ(root.read("/../../../../passwd").text, "inside");
+    EXPECT_EQ(root.read("/dots").text, "inside");
+    EXPECT_EQ(root.read("/absolute").error, ENOENT);
+    EXPECT_EQ(root.read("/folder/passwd").error, ENOENT);
+}
+
+TEST_F(SnapshotRoot, GivesUpOnLinksThatGoRound) {
+    folder.link("b", "a");
+    folder.link("a", "b");
+    EXPECT_EQ(root.read("/a").error, ELOOP);
+    EXPECT_EQ(root.resolve("/a").error, ELOOP);
+    EXPECT_TRUE(root.readLink("/a"));
+}
+
+TEST_F(SnapshotRoot, ReadsTheTargetOfABrokenLink) {
+    folder.link("../gone", "link");
+    EXPECT_EQ(root.readLink("/link").text, "../gone");
+    EXPECT_FALSE(root.exists("/link"));
+    EXPECT_EQ(root.resolve("/link").error, ENOENT);
+    folder.write("file", "x");
+    EXPECT_EQ(root.readLink("/file").error, EINVAL);
+    EXPECT_EQ(root.readLink("/none").error, ENOENT);
+}
+
+TEST_F(SnapshotRoot, ListsADirectoryInOrder) {
+    folder.write("edac/mc1/ue_count", "0");
+    folder.write("edac/mc0/ue_count", "0");
+    folder.write("edac/uevent", "");
+    EXPECT_THAT(root.list("/edac").names, ElementsAre("mc0", "mc1", "uevent"));
+    EXPECT_EQ(root.list("/none").error, ENOENT);
+    EXPECT_EQ(root.list("/edac/uevent").error, ENOTDIR);
+}
+
+TEST_F(SnapshotRoot, ChecksWhetherSomethingExists) {
+    folder.write("etc/file", "x");
+    EXPECT_TRUE(root.exists("/etc/file"));
+    EXPECT_TRUE(root.exists("/etc"));
+    EXPECT_TRUE(root.exists("/"));
+    EXPECT_FALSE(root.exists("/etc/none"));
+}
+
+TEST_F(SnapshotRoot, OpensForWritingBelowTheRootOnly) {
+    folder.link("/etc/made", "link");
+    folder.write("etc/other", "");
+    const int fd = root.open("/link", O_WRONLY | O_CREAT, 0640);
+    ASSERT_GE(fd, 0);
+    EXPECT_EQ(fcntl(fd, F_GETFD) & FD_CLOEXEC, FD_CLOEXEC);
+    EXPECT_EQ(write(fd, "x", 1), 1);
+    close(fd);
+    EXPECT_EQ(root.read("/etc/made").text, "x");
+    EXPECT_EQ(root.open("/none/file", O_WRONLY | O_CREAT, 0640), -ENOENT);
+}
+
+TEST_F(SnapshotRoot, LeavesNoDescriptorOpen) {
+    folder.write("etc/file", "x");
+    folder.link("/etc/file", "link");
+    const auto openDescriptors = [] { return Root("/").list("/proc/self/fd").names.size(); };
+    const std::size_t before = openDescriptors();
+    root.read("/link");
+    root.read("/etc");
+    root.readLink("/link");
+    root.resolve("/link");
+    root.list("/etc");
+    root.list("/link");
+    root.exists("/link");
+    EXPECT_EQ(openDescriptors(), before);
+}
+
+TEST(LiveRoot, ReadsTheKernelsFilesWhichStateNoSize) {
+    const Root root("/");
+    EXPECT_TRUE(root.isLive());
+    EXPECT_EQ(root.getDirectory(), "/");
+    EXPECT_THAT(root.read("/proc/self/status").text, StartsWith("Name:\t"));
+    EXPECT_EQ(root.read("/dev/null").error, EINVAL);
+}
+
+TEST(LiveRoot, IsAlsoMeantByOtherSpellings) {
+    EXPECT_TRUE(Root("/usr/..").isLive());
+}
+
+TEST(LiveRoot, ResolvesLinks) {
+    TemporaryDirectory folder;
+    folder.write("file", "x");
+    folder.link("file", "link");
+    const Root root("/");
+    EXPECT_EQ(root.resolve(folder.path() + "/link").text, root.resolve(folder.path() + "/file").text);
+}
+
+TEST(RelativeRoot, IsTakenFromTheWorkingDirectoryOfItsMaking) {
+    TemporaryDirectory folder;
+    folder.write("host/etc/hostname", "node7");
+    const int before = open(".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    ASSERT_EQ(chdir(folder.path().c_str()), 0);
+    const Root root("host");
+    ASSERT_EQ(fchdir(before), 0);
+    close(before);
+    EXPECT_EQ(root.read("/etc/hostname").text, "node7");
+}
