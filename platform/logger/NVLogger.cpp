@@ -1,0 +1,89 @@
+#include "nvlog/NVLogger.h"
+
+#include "logger/FileSink.h"
+#include "logger/Line.h"
+#include "logger/Settings.h"
+#include "logger/Write.h"
+
+#include <cerrno>
+#include <pthread.h>
+#include <syslog.h>
+#include <unistd.h>
+
+namespace NVLog {
+
+namespace {
+
+/// What a call must leave as it found it: errno, and the thread's cancelability (a cancellation in here could not be
+/// thrown out of a function that throws nothing).
+class CallerState {
+public:
+    CallerState() noexcept : error(errno) { pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &cancelState); }
+    ~CallerState() {
+        pthread_setcancelstate(cancelState, nullptr);
+        errno = error;
+    }
+    CallerState(const CallerState&) = delete;
+    CallerState& operator=(const CallerState&) = delete;
+
+private:
+    int error;
+    int cancelState = PTHREAD_CANCEL_ENABLE;
+};
+
+bool writeToSink(const Settings& settings, const Event& event) noexcept {
+    if (settings.sink == Settings::Syslog) return false;
+    timespec now{};
+    clock_gettime(CLOCK_REALTIME, &now);
+    Line line;
+    appendTime(line, now);
+    line.append(' ');
+    appendEvent(line, event);
+    line.append('\n');
+    if (line.failed()) return false;
+    return settings.sink == Settings::File ? appendToFile(settings.path.data(), line.text())
+                                           : writeLine(STDERR_FILENO, line.text());
+}
+
+int priorityOf(int level) noexcept {
+    switch (level) {
+    case 3000:
+        return LOG_NOTICE;
+    case 6000:
+        return LOG_ERR;
+    default:
+        return LOG_DEBUG;
+    }
+}
+
+void writeToSyslog(const Event& event) noexcept {
+    Line line;
+    appendEvent(line, event);
+    line.append('\0');
+    if (!line.failed()) syslog(priorityOf(event.level), "%s", line.text().data());
+}
+
+void write(const Settings& settings, const Event& event) noexcept {
+    const CallerState state;
+    if (writeToSink(settings, event)) return;
+    if (event.channel == Channel::Log || settings.sink == Settings::Syslog || settings.traceInSyslog)
+        writeToSyslog(event);
+}
+
+} // namespace
+
+void NVLogger::logLevelMessage(const char* function, const char* file, int line, const std::string& category, int level,
+                               char*, int, int, const std::string& text) {
+    const Settings& settings = currentSettings();
+    if (settings.keeps(Channel::Log, level))
+        write(settings, {Channel::Log, function, file, line, category, level, text});
+}
+
+void NVLogger::traceLevelMessage(const char* function, const char* file, int line, const std::string& category,
+                                 int level, char*, int, int, const std::string& text) {
+    const Settings& settings = currentSettings();
+    if (settings.keeps(Channel::Trace, level))
+        write(settings, {Channel::Trace, function, file, line, category, level, text});
+}
+
+} // namespace NVLog

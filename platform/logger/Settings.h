@@ -1,0 +1,47 @@
+#pragma once
+
+#include <array>
+#include <climits>
+#include <cstddef>
+
+#pragma GCC visibility push(hidden)
+
+namespace NVLog {
+
+enum class Channel { Log, Trace };
+
+/// What is logged and where to. Trivially destructible, so that threads may log while the process ends.
+struct Settings {
+    enum Sink { Syslog, Stderr, File, None };
+    static constexpr std::size_t MAX_LEVELS = 64;
+
+    Sink sink = Syslog;
+    std::array<char, PATH_MAX> path{}; ///< of the File sink
+    bool log = true;
+    bool trace = false;
+    bool traceInSyslog = false; ///< whether trace lines go there when the chosen sink cannot take them
+    bool allLevels = false;
+    std::size_t levelCount = 0;
+    std::array<int, MAX_LEVELS> levels{};
+
+    bool keeps(Channel channel, int level) const noexcept {
+        if (!(channel == Channel::Log ? log : trace)) return false;
+        if (allLevels) return true;
+        for (std::size_t i = 0; i < levelCount; ++i) {
+            if (levels[i] == level) return true;
+        }
+        return false;
+    }
+};
+
+/// Reads the three variables' texts; null and empty ones mean the defaults. Entries of a list that cannot be used
+/// are passed over, and a list without any usable entry means the default: a typing error must not hide failures.
+/// More than MAX_LEVELS levels keep all.
+Settings parseSettings(const char* sink, const char* levels, const char* channels) noexcept;
+
+/// This process's settings, read from the environment by the first caller.
+const Settings& currentSettings() noexcept;
+
+} // namespace NVLog
+
+#pragma GCC visibility pop

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <string_view>
+
+#pragma GCC visibility push(hidden)
+
+namespace NVLog {
+
+/// Writes a line, which brings its line feed along, with one write. False when not all of it was taken: a full disk
+/// or pipe is not waited for. A line cut short that way is ended before the next one is written. No signal comes of
+/// a pipe without reader or of a file size limit.
+bool writeLine(int descriptor, std::string_view line) noexcept;
+
+} // namespace NVLog
+
+#pragma GCC visibility pop
