@@ -1,0 +1,96 @@
+#include "vk/Product.h"
+
+#include "product/UniqueIdentifier.h"
+#include "product/Widen.h"
+#include "vk/HostSource.h"
+#include "vk/Root.h"
+
+#include <string_view>
+#include <sys/utsname.h>
+#if __has_include("vk/HostFacts.h")
+#include "vk/HostFacts.h"
+#include "vk/Instrumentation.h"
+#define VK_HAS_INSTRUMENTATION
+#endif
+
+namespace VK {
+
+namespace {
+
+struct Facts {
+    std::string architecture;
+    std::string rootDirectory;
+    std::string uid;
+};
+
+/// A file's text up to the first blank or line end.
+std::string readWord(const std::string& path) {
+    const std::string text = Root::host().read(path).text;
+    constexpr std::string_view END(" \t\r\n\0", 5);
+    return text.substr(0, text.find_first_of(END));
+}
+
+std::string readArchitecture() {
+    if (HostSource::current().kind == HostSource::Snapshot) {
+        if (const std::string word = readWord("/proc/sys/kernel/arch"); !word.empty()) return word;
+    }
+    utsname names{};
+    return uname(&names) == 0 ? names.machine : "";
+}
+
+std::string readMachineId() {
+    const std::string id = readWord("/etc/machine-id");
+    return id == "uninitialized" ? "" : id; // what it holds while the host boots for the first time
+}
+
+std::string readSystemUuid() {
+    // A simulated computer's UUID is not this host's.
+    if (HostSource::current().kind == HostSource::Simulated) return {};
+    std::string uuid;
+#ifdef VK_HAS_INSTRUMENTATION
+    Instrumentation computer;
+    computer.selectNode(NodeLexicon::ComputerSystemNode);
+    computer.getProperty(NodeLexicon::UUIDProperty, uuid);
+#endif
+    return uuid;
+}
+
+std::string withFinalSlash(std::string path) {
+    if (path.empty() || path.back() != '/') path += '/';
+    return path;
+}
+
+std::string readUid() {
+    const std::string machineId = readMachineId();
+    return uniqueIdentifier(!machineId.empty() ? machineId : readSystemUuid());
+}
+
+Facts readFacts() {
+#ifdef VK_HAS_INSTRUMENTATION
+    const ProductOverrides& given = productOverrides();
+    return {given.architecture ? *given.architecture : readArchitecture(),
+            withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
+            given.uid ? *given.uid : readUid()};
+#else
+    return {readArchitecture(), withFinalSlash(VK_ROOT_DIRECTORY), readUid()};
+#endif
+}
+
+const Facts& facts() {
+    static const Facts read = readFacts();
+    return read;
+}
+
+} // namespace
+
+std::wstring Product::getArchitecture() {
+    return widen(facts().architecture);
+}
+std::wstring Product::getRootDirectory() {
+    return widen(facts().rootDirectory);
+}
+std::wstring Product::getUid() {
+    return widen(facts().uid);
+}
+
+} // namespace VK

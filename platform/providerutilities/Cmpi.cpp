@@ -1,0 +1,41 @@
+#include "providerutilities/Cmpi.h"
+
+#include "nvlog/NVLogger.h"
+
+namespace VK::Cmpi {
+
+bool hasValue(const CMPIData& data, const CMPIStatus& status) {
+    return succeeded(status) && (data.state & (CMPI_nullValue | CMPI_notFound | CMPI_badValue)) == 0;
+}
+
+const char* textOf(const CMPIString* string) {
+    if (!hasSlot(string, &CMPIStringFT::getCharPtr)) return nullptr;
+    CMPIStatus status = freshStatus();
+    const char* const text = string->ft->getCharPtr(string, &status);
+    return succeeded(status) ? text : nullptr;
+}
+
+const char* textOf(const CMPIData& data) {
+    switch (data.type) {
+    case CMPI_string:
+        return textOf(data.value.string);
+    case CMPI_chars:
+        return data.value.chars;
+    default:
+        return nullptr;
+    }
+}
+
+const CMPIValue* asChars(const char* text) {
+    return reinterpret_cast<const CMPIValue*>(text);
+}
+
+bool refused(const char* function, int line, const std::string& what, const char* name, const CMPIStatus& status) {
+    const std::string text = "The broker refused " + what + " " + (name != nullptr ? name : "(null)") +
+                             ", return code " + std::to_string(static_cast<int>(status.rc));
+    NVLog::NVLogger::logLevelMessage(function, "ProviderUtilities", line, "Norvane.ProviderUtilities", 6000, nullptr, 0,
+                                     0, text);
+    return false;
+}
+
+} // namespace VK::Cmpi

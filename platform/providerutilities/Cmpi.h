@@ -1,0 +1,54 @@
+#pragma once
+
+#include <cmpidt.h>
+#include <cmpift.h>
+
+#include <optional>
+#include <string>
+
+#pragma GCC visibility push(hidden)
+
+/// What every use of a broker needs: statuses, slots that may be missing, texts. Slots are called by themselves,
+/// because the macros differ between the standard's versions.
+namespace VK::Cmpi {
+
+/// A status to hand to a slot; not every broker writes it.
+constexpr CMPIStatus freshStatus() {
+    return {CMPI_RC_OK, nullptr};
+}
+
+constexpr bool succeeded(const CMPIStatus& status) {
+    return status.rc == CMPI_RC_OK;
+}
+
+/// Whether an object is there and its broker offers the operation: hasSlot(path, &CMPIObjectPathFT::getKey). The
+/// tables' version numbers are not to be trusted.
+template <typename Object, typename Slot, typename Table>
+bool hasSlot(const Object* object, Slot Table::*slot) {
+    return object != nullptr && object->ft != nullptr && object->ft->*slot != nullptr;
+}
+
+/// The same for the broker's own factories and services.
+template <typename Slot>
+bool hasService(const CMPIBroker* broker, Slot CMPIBrokerEncFT::*slot) {
+    return broker != nullptr && broker->eft != nullptr && broker->eft->*slot != nullptr;
+}
+
+/// Whether an answer holds a value.
+bool hasValue(const CMPIData& data, const CMPIStatus& status);
+
+/// A string's text, valid as long as the string; null when it has none.
+const char* textOf(const CMPIString* string);
+
+/// A value's text when it is a text; null otherwise.
+const char* textOf(const CMPIData& data);
+
+/// How a text is handed to a slot with the type CMPI_chars: as itself, not as a value that points to it.
+const CMPIValue* asChars(const char* text);
+
+/// Logs at level 6000 that the broker refused something, and is false.
+bool refused(const char* function, int line, const std::string& what, const char* name, const CMPIStatus& status);
+
+} // namespace VK::Cmpi
+
+#pragma GCC visibility pop

@@ -1,0 +1,99 @@
+#include "vk/ProviderUtilities.h"
+
+#include "providerutilities/Cmpi.h"
+
+#include <strings.h>
+
+namespace VK {
+
+namespace {
+
+CMPIData absent() {
+    CMPIData data{};
+    data.state = CMPI_nullValue | CMPI_notFound;
+    return data;
+}
+
+/// For brokers that compare key names by case, and for those that count keys which nobody set.
+CMPIData findKey(const CMPIObjectPath* path, const char* name) {
+    if (!Cmpi::hasSlot(path, &CMPIObjectPathFT::getKeyAt)) return absent();
+    const unsigned int count = ProviderUtilities::getKeyCount(path);
+    for (unsigned int i = 0; i < count; ++i) {
+        CMPIStatus status = Cmpi::freshStatus();
+        CMPIString* keyName = nullptr;
+        const CMPIData key = path->ft->getKeyAt(path, i, &keyName, &status);
+        const char* const text = Cmpi::textOf(keyName);
+        if (Cmpi::hasValue(key, status) && text != nullptr && strcasecmp(text, name) == 0) return key;
+    }
+    return absent();
+}
+
+CMPIData getKey(const CMPIObjectPath* path, const char* name) {
+    if (name == nullptr) return absent();
+    if (Cmpi::hasSlot(path, &CMPIObjectPathFT::getKey)) {
+        CMPIStatus status = Cmpi::freshStatus();
+        const CMPIData key = path->ft->getKey(path, name, &status);
+        if (Cmpi::hasValue(key, status)) return key;
+    }
+    return findKey(path, name);
+}
+
+bool addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, CMPIType type) {
+    CMPIStatus status{CMPI_RC_ERR_INVALID_PARAMETER, nullptr};
+    if (name != nullptr && Cmpi::hasSlot(path, &CMPIObjectPathFT::addKey))
+        status = path->ft->addKey(path, name, value, type);
+    return Cmpi::succeeded(status) || Cmpi::refused("setKeyProperty", __LINE__, "the key", name, status);
+}
+
+} // namespace
+
+std::string ProviderUtilities::getNamespace(const CMPIObjectPath* objectPath) {
+    if (!Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getNameSpace)) return {};
+    CMPIStatus status = Cmpi::freshStatus();
+    const CMPIString* const nameSpace = objectPath->ft->getNameSpace(objectPath, &status);
+    const char* const text = Cmpi::succeeded(status) ? Cmpi::textOf(nameSpace) : nullptr;
+    return text != nullptr ? text : "";
+}
+
+CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, const char* className,
+                                                    std::string nameSpace) {
+    if (className == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newObjectPath)) return nullptr;
+    CMPIStatus status = Cmpi::freshStatus();
+    CMPIObjectPath* const path = broker->eft->newObjectPath(broker, nameSpace.c_str(), className, &status);
+    return Cmpi::succeeded(status) ? path : nullptr;
+}
+
+unsigned int ProviderUtilities::getKeyCount(const CMPIObjectPath* objectPath) {
+    if (!Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getKeyCount)) return 0;
+    CMPIStatus status = Cmpi::freshStatus();
+    const CMPICount count = objectPath->ft->getKeyCount(objectPath, &status);
+    return Cmpi::succeeded(status) ? count : 0;
+}
+
+bool ProviderUtilities::getKeyProperty(const CMPIObjectPath* objectPath, const char* name, std::string& value) {
+    const CMPIData key = getKey(objectPath, name);
+    const char* const text = (key.state & CMPI_nullValue) == 0 ? Cmpi::textOf(key) : nullptr;
+    if (text == nullptr) return false;
+    value = text;
+    return true;
+}
+
+bool ProviderUtilities::getKeyProperty(const CMPIObjectPath* objectPath, const char* name, CMPIObjectPath** value) {
+    const CMPIData key = getKey(objectPath, name);
+    if ((key.state & CMPI_nullValue) != 0 || key.type != CMPI_ref || key.value.ref == nullptr || value == nullptr)
+        return false;
+    *value = key.value.ref;
+    return true;
+}
+
+bool ProviderUtilities::setKeyProperty(CMPIObjectPath* objectPath, const char* name, const std::string& value) {
+    return addKey(objectPath, name, Cmpi::asChars(value.c_str()), CMPI_chars);
+}
+
+bool ProviderUtilities::setKeyProperty(CMPIObjectPath* objectPath, const char* name, CMPIObjectPath* value) {
+    CMPIValue reference{};
+    reference.ref = value;
+    return addKey(value != nullptr ? objectPath : nullptr, name, &reference, CMPI_ref);
+}
+
+} // namespace VK
