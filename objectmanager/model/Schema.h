@@ -1,9 +1,12 @@
 #pragma once
 
+#include "objectmanager/model/Names.h"
+
 #include <cmpidt.h>
 
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace om {
@@ -13,7 +16,7 @@ struct PropertyDeclaration {
     std::string name;
     CMPIType type = CMPI_null; ///< with CMPI_ARRAY for arrays
     bool key = false;
-    std::string referenceClass; ///< for CMPI_ref only
+    std::string referenceClass = {}; ///< for CMPI_ref only
 };
 
 struct ParameterDeclaration : PropertyDeclaration {
@@ -35,11 +38,27 @@ struct ClassDeclaration {
     std::vector<MethodDeclaration> methods;
 };
 
+/// A class with all that it inherits, for look-ups by name.
+struct ResolvedClass {
+    template <class T>
+    using Table = std::unordered_map<std::string_view, const T*, NameHash, NameEqual>;
+
+    const ClassDeclaration* declaration = nullptr;
+    Table<PropertyDeclaration> properties;
+    Table<MethodDeclaration> methods;
+    std::vector<const PropertyDeclaration*> keys;
+
+    const PropertyDeclaration* findProperty(std::string_view name) const;
+    const MethodDeclaration* findMethod(std::string_view name) const;
+};
+
 /// The classes that the object manager knows. Every name compares without regard to case; look-ups of properties and
 /// methods go up the line of inheritance, nearest class first.
 class Schema {
 public:
     explicit Schema(std::vector<ClassDeclaration> classes);
+    Schema(const Schema&) = delete;
+    Schema& operator=(const Schema&) = delete;
 
     /// The classes built in, those served by the default provider and their ancestry.
     static const Schema& builtin();
@@ -47,13 +66,17 @@ public:
     const std::vector<ClassDeclaration>& classes() const { return classes_; }
     /// The class, property or method of that name, or null.
     const ClassDeclaration* find(std::string_view className) const;
+    const ResolvedClass* resolve(std::string_view className) const;
     const PropertyDeclaration* findProperty(std::string_view className, std::string_view property) const;
     const MethodDeclaration* findMethod(std::string_view className, std::string_view method) const;
     /// Whether `className` is `ancestor` or derives from it; false for unknown classes.
     bool isA(std::string_view className, std::string_view ancestor) const;
 
 private:
-    std::vector<ClassDeclaration> classes_;
+    void inherit(ResolvedClass& resolved) const;
+
+    std::vector<ClassDeclaration> classes_; ///< never changed again: the tables point into it
+    std::unordered_map<std::string_view, ResolvedClass, NameHash, NameEqual> index_;
 };
 
 } // namespace om

@@ -48,6 +48,11 @@ struct Instance {
     std::vector<NamedValue> properties;
 };
 
+/// Deep and exact: spellings, order and types count.
+bool operator==(const Value& a, const Value& b);
+bool operator==(const ObjectPath& a, const ObjectPath& b);
+bool operator==(const Instance& a, const Instance& b);
+
 /// What one operation answered.
 struct Answer {
     CMPIrc code = CMPI_RC_OK;

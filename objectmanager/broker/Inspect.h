@@ -1,0 +1,12 @@
+#pragma once
+
+#include <string>
+
+namespace om {
+
+/// The type name of a CMPI object of any kind, told by its function table, and a text of its content. Both throw
+/// Failure INVALID_HANDLE for what is none of ours.
+const char* typeNameOf(const void* object);
+std::string describeObject(const void* object);
+
+} // namespace om

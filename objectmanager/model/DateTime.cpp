@@ -1,0 +1,195 @@
+#include "objectmanager/model/DateTime.h"
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+
+namespace om {
+
+namespace {
+
+constexpr std::size_t TextLength = 25;
+constexpr std::size_t PointAt = 14;
+constexpr std::size_t MicrosecondsAt = 15;
+constexpr std::size_t SignAt = 21;
+constexpr std::int64_t Million = 1'000'000;
+constexpr std::int64_t SecondsPerDay = 86'400;
+
+struct Field {
+    std::size_t at;
+    std::size_t length;
+    unsigned least;
+    unsigned most;
+};
+
+constexpr Field Year{0, 4, 0, 9999};
+constexpr Field Month{4, 2, 1, 12};
+constexpr Field Day{6, 2, 1, 31};
+constexpr Field Days{0, 8, 0, 99'999'999};
+constexpr Field Hour{8, 2, 0, 23};
+constexpr Field Minute{10, 2, 0, 59};
+constexpr Field Second{12, 2, 0, 59};
+constexpr Field Fraction{MicrosecondsAt, 6, 0, 999'999};
+constexpr Field Offset{22, 3, 0, 999};
+
+bool isDigit(char c) {
+    return c >= '0' && c <= '9';
+}
+
+std::string_view part(std::string_view text, Field field) {
+    return text.substr(field.at, field.length);
+}
+
+unsigned number(std::string_view text, Field field) {
+    unsigned result = 0;
+    for (const char c : part(text, field)) result = result * 10 + static_cast<unsigned>(c - '0');
+    return result;
+}
+
+bool hasDigits(std::string_view text, Field field) {
+    const std::string_view digits = part(text, field);
+    return std::all_of(digits.begin(), digits.end(), isDigit);
+}
+
+bool isUnknown(std::string_view text, Field field) {
+    return part(text, field).find_first_not_of('*') == std::string_view::npos;
+}
+
+/// A known field in its range, or one that is unknown; after an unknown one no field may be known again.
+bool isField(std::string_view text, Field field, bool& unknown) {
+    if (isUnknown(text, field)) {
+        unknown = true;
+        return true;
+    }
+    if (unknown || !hasDigits(text, field)) return false;
+    const unsigned value = number(text, field);
+    return value >= field.least && value <= field.most;
+}
+
+bool isFraction(std::string_view text, bool unknown) {
+    const std::string_view digits = part(text, Fraction);
+    const std::size_t known = std::min(digits.find('*'), digits.size());
+    return std::all_of(digits.begin(), digits.begin() + static_cast<std::ptrdiff_t>(known), isDigit) &&
+           digits.find_first_not_of('*', known) == std::string_view::npos && (!unknown || known == 0);
+}
+
+bool isLeapYear(unsigned year) {
+    return (year % 4 == 0 && year % 100 != 0) || year % 400 == 0;
+}
+
+unsigned daysOf(unsigned year, unsigned month) {
+    constexpr unsigned Lengths[] = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+    return month == 2 && isLeapYear(year) ? 29 : Lengths[month - 1];
+}
+
+bool dayExists(std::string_view text) {
+    if (isUnknown(text, Day)) return true;
+    return number(text, Day) <= daysOf(number(text, Year), number(text, Month));
+}
+
+/// Days since 1970-01-01 in the Gregorian calendar. Years are counted from March, so that a leap day ends one.
+std::int64_t daysFromDate(std::int64_t year, unsigned month, unsigned day) {
+    year -= month <= 2 ? 1 : 0;
+    const std::int64_t era = (year >= 0 ? year : year - 399) / 400;
+    const std::int64_t yearOfEra = year - era * 400;
+    const std::int64_t dayOfYear = (153 * (month + (month > 2 ? -3 : 9)) + 2) / 5 + day - 1;
+    const std::int64_t dayOfEra = yearOfEra * 365 + yearOfEra / 4 - yearOfEra / 100 + dayOfYear;
+    return era * 146'097 + dayOfEra - 719'468;
+}
+
+struct Date {
+    std::int64_t year;
+    int month;
+    int day;
+};
+
+Date dateFromDays(std::int64_t days) {
+    days += 719'468;
+    const std::int64_t era = (days >= 0 ? days : days - 146'096) / 146'097;
+    const std::int64_t dayOfEra = days - era * 146'097;
+    const std::int64_t yearOfEra = (dayOfEra - dayOfEra / 1460 + dayOfEra / 36'524 - dayOfEra / 146'096) / 365;
+    const std::int64_t dayOfYear = dayOfEra - (365 * yearOfEra + yearOfEra / 4 - yearOfEra / 100);
+    const std::int64_t shifted = (5 * dayOfYear + 2) / 153;
+    const int day = static_cast<int>(dayOfYear - (153 * shifted + 2) / 5 + 1);
+    const int month = static_cast<int>(shifted < 10 ? shifted + 3 : shifted - 9);
+    return {yearOfEra + era * 400 + (month <= 2 ? 1 : 0), month, day};
+}
+
+std::string print(std::int64_t days, std::int64_t secondOfDay, std::int64_t fraction) {
+    char time[32];
+    std::snprintf(time, sizeof time, "%02d%02d%02d.%06d", static_cast<int>(secondOfDay / 3600),
+                  static_cast<int>(secondOfDay / 60 % 60), static_cast<int>(secondOfDay % 60),
+                  static_cast<int>(fraction));
+    char date[32];
+    std::snprintf(date, sizeof date, "%08d", static_cast<int>(days));
+    return std::string(date) + time;
+}
+
+std::int64_t floorDivide(std::int64_t a, std::int64_t b) {
+    return a / b - (a % b < 0 ? 1 : 0);
+}
+
+} // namespace
+
+bool isInterval(std::string_view dateTime) {
+    return dateTime.size() == TextLength && dateTime[SignAt] == ':';
+}
+
+bool isDateTime(std::string_view text) {
+    if (text.size() != TextLength || text[PointAt] != '.') return false;
+    bool unknown = false;
+    const bool interval = isInterval(text);
+    if (interval ? !isField(text, Days, unknown)
+                 : !isField(text, Year, unknown) || !isField(text, Month, unknown) || !isField(text, Day, unknown) ||
+                       !dayExists(text)) {
+        return false;
+    }
+    if (!isField(text, Hour, unknown) || !isField(text, Minute, unknown) || !isField(text, Second, unknown) ||
+        !isFraction(text, unknown)) {
+        return false;
+    }
+    if (interval) return part(text, Offset) == "000";
+    return (text[SignAt] == '+' || text[SignAt] == '-') && hasDigits(text, Offset);
+}
+
+std::optional<std::int64_t> microseconds(std::string_view dateTime) {
+    if (!isDateTime(dateTime) || dateTime.find('*') != std::string_view::npos) return std::nullopt;
+    const auto value = [dateTime](Field field) { return static_cast<std::int64_t>(number(dateTime, field)); };
+    const std::int64_t time = (value(Hour) * 60 + value(Minute)) * 60 + value(Second);
+    std::int64_t seconds = 0;
+    if (isInterval(dateTime)) {
+        seconds = value(Days) * SecondsPerDay + time;
+    } else {
+        const std::int64_t offset = value(Offset) * (dateTime[SignAt] == '-' ? -60 : 60);
+        seconds =
+            daysFromDate(value(Year), number(dateTime, Month), number(dateTime, Day)) * SecondsPerDay + time - offset;
+    }
+    return seconds * Million + value(Fraction);
+}
+
+std::optional<std::string> formatInstant(std::int64_t microseconds) {
+    const std::int64_t seconds = floorDivide(microseconds, Million);
+    const std::int64_t days = floorDivide(seconds, SecondsPerDay);
+    const Date date = dateFromDays(days);
+    if (date.year < 0 || date.year > 9999) return std::nullopt;
+    const std::int64_t packed = (date.year * 100 + date.month) * 100 + date.day;
+    return print(packed, seconds - days * SecondsPerDay, microseconds - seconds * Million) + "+000";
+}
+
+std::optional<std::string> formatInterval(std::uint64_t microseconds) {
+    constexpr auto PerSecond = static_cast<std::uint64_t>(Million);
+    constexpr auto PerDay = static_cast<std::uint64_t>(SecondsPerDay) * PerSecond;
+    const std::uint64_t days = microseconds / PerDay;
+    if (days > Days.most) return std::nullopt;
+    return print(static_cast<std::int64_t>(days), static_cast<std::int64_t>(microseconds % PerDay / PerSecond),
+                 static_cast<std::int64_t>(microseconds % PerSecond)) +
+           ":000";
+}
+
+std::string formatNow() {
+    const auto now = std::chrono::system_clock::now().time_since_epoch();
+    const auto count = std::chrono::duration_cast<std::chrono::microseconds>(now).count();
+    return formatInstant(count).value_or("19700101000000.000000+000");
+}
+
+} // namespace om

@@ -1,0 +1,68 @@
+#include "objectmanager/model/Schema.h"
+
+namespace om {
+
+namespace {
+
+template <class T>
+const T* lookUp(const ResolvedClass::Table<T>& table, std::string_view name) {
+    const auto found = table.find(name);
+    return found == table.end() ? nullptr : found->second;
+}
+
+} // namespace
+
+const PropertyDeclaration* ResolvedClass::findProperty(std::string_view name) const {
+    return lookUp(properties, name);
+}
+
+const MethodDeclaration* ResolvedClass::findMethod(std::string_view name) const {
+    return lookUp(methods, name);
+}
+
+Schema::Schema(std::vector<ClassDeclaration> classes) : classes_(std::move(classes)) {
+    for (const ClassDeclaration& declared : classes_) index_[declared.name].declaration = &declared;
+    for (auto& [name, resolved] : index_) inherit(resolved);
+}
+
+void Schema::inherit(ResolvedClass& resolved) const {
+    // The count bounds the walk, should a class be its own ancestor.
+    std::size_t left = classes_.size();
+    for (const ClassDeclaration* c = resolved.declaration; c != nullptr && left > 0; c = find(c->superclass), --left) {
+        for (const PropertyDeclaration& property : c->properties) {
+            const bool nearest = resolved.properties.emplace(property.name, &property).second;
+            if (nearest && property.key) resolved.keys.push_back(&property);
+        }
+        for (const MethodDeclaration& method : c->methods) resolved.methods.emplace(method.name, &method);
+    }
+}
+
+const ResolvedClass* Schema::resolve(std::string_view className) const {
+    const auto found = index_.find(className);
+    return found == index_.end() ? nullptr : &found->second;
+}
+
+const ClassDeclaration* Schema::find(std::string_view className) const {
+    const ResolvedClass* resolved = resolve(className);
+    return resolved == nullptr ? nullptr : resolved->declaration;
+}
+
+const PropertyDeclaration* Schema::findProperty(std::string_view className, std::string_view property) const {
+    const ResolvedClass* resolved = resolve(className);
+    return resolved == nullptr ? nullptr : resolved->findProperty(property);
+}
+
+const MethodDeclaration* Schema::findMethod(std::string_view className, std::string_view method) const {
+    const ResolvedClass* resolved = resolve(className);
+    return resolved == nullptr ? nullptr : resolved->findMethod(method);
+}
+
+bool Schema::isA(std::string_view className, std::string_view ancestor) const {
+    std::size_t left = classes_.size();
+    for (const ClassDeclaration* c = find(className); c != nullptr && left > 0; c = find(c->superclass), --left) {
+        if (sameName(c->name, ancestor)) return true;
+    }
+    return false;
+}
+
+} // namespace om
