@@ -2,12 +2,27 @@
 #ifndef _CMPIDT_H_
 #define _CMPIDT_H_
 
+#include "cmpios.h"
 #include "cmpipl.h"
 
+/* Version numbers: what a table's ftVersion says, major times 100. Those below 100 are older than the standard. */
+#define CMPIVersion051 51
+#define CMPIVersion060 60
+#define CMPIVersion070 70
+#define CMPIVersion080 80
+#define CMPIVersion085 85
+#define CMPIVersion086 86
+#define CMPIVersion087 87
+#define CMPIVersion090 90
 #define CMPIVersion100 100
 #define CMPIVersion200 200
+#define CMPIVersion210 210
 
-/* A build may ask for an older interface with -DCMPI_VERSION=100. Each level implies the ones below it. */
+/*
+ * The level that a translation unit is compiled for. -DCMPI_VERSION=100 asks for the older interface; otherwise it is
+ * 200. CMPI_VER_nnn is defined when that level's features are there, and each level implies the ones below it. At level
+ * 100 every table ends where its level 200 additions would begin.
+ */
 #if !defined(CMPI_VERSION) || CMPI_VERSION == 200
 #define CMPI_VER_200 1
 #elif CMPI_VERSION != 100
@@ -20,6 +35,7 @@
 #define CMPI_VER_85 1
 #define CMPI_VER_80 1
 
+/* The number that the provider stubs put into their tables. CMPI_VER_ALL makes it the highest at any level. */
 #if defined(CMPI_VER_200) || defined(CMPI_VER_ALL)
 #define CMPICurrentVersion CMPIVersion200
 #else
@@ -30,6 +46,9 @@
 extern "C" {
 #endif
 
+/*
+ * Objects: two words, a private handle and the table of the object's functions. cmpift.h defines them and their tables.
+ */
 typedef struct _CMPIBroker CMPIBroker;
 typedef struct _CMPIContext CMPIContext;
 typedef struct _CMPIResult CMPIResult;
@@ -44,17 +63,18 @@ typedef struct _CMPISelectExp CMPISelectExp;
 typedef struct _CMPISelectCond CMPISelectCond;
 typedef struct _CMPISubCond CMPISubCond;
 typedef struct _CMPIPredicate CMPIPredicate;
-typedef struct _CMPIError CMPIError;
+
+/* The parts of a provider, one for each kind of request it serves. */
 typedef struct _CMPIInstanceMI CMPIInstanceMI;
 typedef struct _CMPIAssociationMI CMPIAssociationMI;
 typedef struct _CMPIMethodMI CMPIMethodMI;
 typedef struct _CMPIPropertyMI CMPIPropertyMI;
 typedef struct _CMPIIndicationMI CMPIIndicationMI;
 
+/* Function tables. */
 typedef struct _CMPIBrokerFT CMPIBrokerFT;
 typedef struct _CMPIBrokerEncFT CMPIBrokerEncFT;
 typedef struct _CMPIBrokerExtFT CMPIBrokerExtFT;
-typedef struct _CMPIBrokerMemFT CMPIBrokerMemFT;
 typedef struct _CMPIContextFT CMPIContextFT;
 typedef struct _CMPIResultFT CMPIResultFT;
 typedef struct _CMPIObjectPathFT CMPIObjectPathFT;
@@ -68,13 +88,19 @@ typedef struct _CMPISelectExpFT CMPISelectExpFT;
 typedef struct _CMPISelectCondFT CMPISelectCondFT;
 typedef struct _CMPISubCondFT CMPISubCondFT;
 typedef struct _CMPIPredicateFT CMPIPredicateFT;
-typedef struct _CMPIErrorFT CMPIErrorFT;
 typedef struct _CMPIInstanceMIFT CMPIInstanceMIFT;
 typedef struct _CMPIAssociationMIFT CMPIAssociationMIFT;
 typedef struct _CMPIMethodMIFT CMPIMethodMIFT;
 typedef struct _CMPIPropertyMIFT CMPIPropertyMIFT;
 typedef struct _CMPIIndicationMIFT CMPIIndicationMIFT;
 
+#ifdef CMPI_VER_200
+typedef struct _CMPIError CMPIError;
+typedef struct _CMPIErrorFT CMPIErrorFT;
+typedef struct _CMPIBrokerMemFT CMPIBrokerMemFT;
+#endif
+
+/* CIM's intrinsic types. The 64-bit ones are long long, also where long is as wide. */
 typedef unsigned char CMPIBoolean;
 typedef unsigned short CMPIChar16;
 typedef unsigned char CMPIUint8;
@@ -87,18 +113,27 @@ typedef int CMPISint32;
 typedef long long CMPISint64;
 typedef float CMPIReal32;
 typedef double CMPIReal64;
-typedef unsigned int CMPICount;
-typedef unsigned short CMPIType;
-typedef unsigned short CMPIValueState;
-typedef unsigned int CMPIFlags;
-typedef void* CMPIMsgFileHandle;
-typedef void CMPIGcStat;
 
+typedef int CMPIVersion;               /* a version number, see above */
+typedef unsigned int CMPICount;        /* a number of items, or an index from 0 */
+typedef unsigned short CMPIType;       /* CMPI_uint8 ... */
+typedef unsigned short CMPIValueState; /* CMPI_goodValue or the bits below it */
+typedef unsigned int CMPIFlags;        /* CMPI_FLAG_... bits */
+typedef void* CMPIMsgFileHandle;       /* an open message file; null: none */
+typedef void CMPIGcStat;               /* a mark in the broker's list of objects to free */
+
+/* Functions that a provider hands to the broker's thread services. */
+typedef CMPI_THREAD_RETURN(CMPI_THREAD_CDECL* CMPIThreadFunc)(void*);
+typedef void (*CMPIThreadOnceFunc)(void);
+typedef void (*CMPIThreadKeyCleanupFunc)(void*);
+
+/* Any bytes, for context entries of type CMPI_ptr. */
 typedef struct _CMPIValuePtr {
     void* ptr;
-    CMPICount length;
+    CMPICount length; /* in bytes */
 } CMPIValuePtr;
 
+/* One value; the type code that travels with it says which member counts. */
 typedef union _CMPIValue {
     CMPIUint64 uint64;
     CMPIUint32 uint32;
@@ -130,6 +165,7 @@ typedef union _CMPIValue {
     CMPIReal64 Double;
 } CMPIValue;
 
+/* A value with its type, and whether it is null, a key or absent. */
 typedef struct _CMPIData {
     CMPIType type;
     CMPIValueState state;
@@ -139,6 +175,11 @@ typedef struct _CMPIData {
 /* Reads one property for an expression that is evaluated without an instance. */
 typedef CMPIData CMPIAccessor(const char* propertyName, void* parm);
 
+/*
+ * Type codes. Small numbers are intrinsic types, multiples of 0x100 from 0x1000 on are objects, and CMPI_ARRAY makes an
+ * array of either. The group masks (upper case) share their number with the first member of the group, and CMPI_SINT
+ * contains the bit of CMPI_UINT: compare (type & (CMPI_UINT | CMPI_SINT)) with one of the two.
+ */
 #define CMPI_null 0x0000
 #define CMPI_SIMPLE 0x0002
 #define CMPI_boolean 0x0002
@@ -157,6 +198,7 @@ typedef CMPIData CMPIAccessor(const char* propertyName, void* parm);
 #define CMPI_sint32 0x00E0
 #define CMPI_sint64 0x00F0
 #define CMPI_INTEGER 0x00C0
+
 #define CMPI_ENC 0x1000
 #define CMPI_instance 0x1000
 #define CMPI_ref 0x1100
@@ -165,10 +207,11 @@ typedef CMPIData CMPIAccessor(const char* propertyName, void* parm);
 #define CMPI_filter 0x1400
 #define CMPI_enumeration 0x1500
 #define CMPI_string 0x1600
-#define CMPI_chars 0x1700
+#define CMPI_chars 0x1700 /* passed in, the value pointer is the text itself; getters give a CMPI_string */
 #define CMPI_dateTime 0x1800
 #define CMPI_ptr 0x1900
-#define CMPI_charsptr 0x1A00
+#define CMPI_charsptr 0x1A00 /* passed in, the value pointer is the address of a char* */
+
 #define CMPI_ARRAY 0x2000
 #define CMPI_SIMPLEA 0x2002
 #define CMPI_booleanA 0x2002
@@ -194,10 +237,14 @@ typedef CMPIData CMPIAccessor(const char* propertyName, void* parm);
 #define CMPI_instanceA 0x3000
 #define CMPI_refA 0x3100
 #define CMPI_charsptrA 0x3A00
+
+/* Keys of which only the general kind is known, as in a path that came as text. */
 #define CMPI_keyInteger 0x00F0
 #define CMPI_keyString 0x1600
 #define CMPI_keyBoolean 0x0002
 #define CMPI_keyRef 0x1100
+
+/* Operands of query predicates only. */
 #define CMPI_charString 0x1600
 #define CMPI_integerString 0x16F0
 #define CMPI_realString 0x160C
@@ -207,6 +254,7 @@ typedef CMPIData CMPIAccessor(const char* propertyName, void* parm);
 #define CMPI_classNameString 0x1700
 #define CMPI_nameString 0x1E00
 
+/* Second names of type codes. */
 #ifndef CMPI_NO_SYNONYM_SUPPORT
 #define CMPI_Byte CMPI_sint8
 #define CMPI_Short CMPI_sint16
@@ -222,13 +270,14 @@ typedef CMPIData CMPIAccessor(const char* propertyName, void* parm);
 #define CMPI_DoubleA CMPI_real64A
 #endif
 
-#define CMPI_goodValue 0x0000 /* no bit set: a valid, non-NULL, non-key value */
-#define CMPI_nullValue 0x0100 /* value is NULL */
-#define CMPI_keyValue 0x0200  /* value is a key binding (may be combined with others) */
-#define CMPI_notFound 0x0400  /* named item does not exist (2.1: deprecated, use the return code) */
-#define CMPI_badValue 0x8000  /* value is in error */
+/* State bits of a CMPIData. */
+#define CMPI_goodValue 0x0000 /* none of them: a value that is neither null nor a key */
+#define CMPI_nullValue 0x0100
+#define CMPI_keyValue 0x0200 /* a key binding; may stand with others */
+#define CMPI_notFound 0x0400 /* no item of that name */
+#define CMPI_badValue 0x8000 /* the value cannot be used */
 
-/* CMPIrc */
+/* Return codes. 0 to 18, 27 and 29 have the numbers of the CIM status codes. */
 typedef enum _CMPIrc {
     CMPI_RC_OK = 0,                                /* success */
     CMPI_RC_ERR_FAILED = 1,                        /* unspecific failure */
@@ -249,34 +298,41 @@ typedef enum _CMPIrc {
     CMPI_RC_ERR_METHOD_NOT_AVAILABLE = 16,         /* method known, not offered */
     CMPI_RC_ERR_METHOD_NOT_FOUND = 17,             /* method unknown */
     CMPI_RC_NO_MORE_ELEMENTS = 18,                 /* the end of an enumeration */
-    CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED = 27,
-    CMPI_RC_ERR_QUERY_FEATURE_NOT_SUPPORTED = 29,
-    CMPI_RC_DO_NOT_UNLOAD = 50,         /* from cleanup only: ask again later */
-    CMPI_RC_NEVER_UNLOAD = 51,          /* from cleanup only: keep until shutdown */
-    CMPI_RC_ERR_INVALID_HANDLE = 60,    /* object handle unusable */
-    CMPI_RC_ERR_INVALID_DATA_TYPE = 61, /* type code unusable here */
-    CMPI_RC_ERR_NOT_IN_CODEPAGE = 62,
-    CMPI_RC_ERROR_SYSTEM = 100, /* operating-system error (unused) */
-    CMPI_RC_ERROR = 200         /* operating-system error (unused) */
+    CMPI_RC_ERR_SERVER_LIMITS_EXCEEDED = 27,       /* more than the server can do now */
+    CMPI_RC_ERR_QUERY_FEATURE_NOT_SUPPORTED = 29,  /* query asks for what the language processor lacks */
+    CMPI_RC_DO_NOT_UNLOAD = 50,                    /* from cleanup only: ask again later */
+    CMPI_RC_NEVER_UNLOAD = 51,                     /* from cleanup only: keep until shutdown */
+    CMPI_RC_ERR_INVALID_HANDLE = 60,               /* object handle unusable */
+    CMPI_RC_ERR_INVALID_DATA_TYPE = 61,            /* type code unusable here */
+    CMPI_RC_ERR_NOT_IN_CODEPAGE = 62,              /* text has characters that the code page lacks */
+    CMPI_RC_ERROR_SYSTEM = 100,                    /* reserved for errors of the operating system, as is the next */
+    CMPI_RC_ERROR = 200
 } CMPIrc;
 
+/* How a call ended. The text is the broker's; whoever gets it reads it before the request ends. */
 typedef struct _CMPIStatus {
     CMPIrc rc;
-    CMPIString* msg;
+    CMPIString* msg; /* null: no text */
 } CMPIStatus;
 
+/* Bits of the context entry CMPIInvocationFlags. */
 #define CMPI_FLAG_LocalOnly 1
 #define CMPI_FLAG_DeepInheritance 2
 #define CMPI_FLAG_IncludeQualifiers 4
 #define CMPI_FLAG_IncludeClassOrigin 8
 
-#define CMPIInitNameSpace "CMPIInitNameSpace"
-#define CMPIInvocationFlags "CMPIInvocationFlags"
-#define CMPIPrincipal "CMPIPrincipal"
-#define CMPIRole "CMPIRole"
-#define CMPIAcceptLanguage "CMPIAcceptLanguage"
-#define CMPIContentLanguage "CMPIContentLanguage"
+/* Names of context entries. */
+#define CMPIInitNameSpace "CMPIInitNameSpace"     /* CMPI_string: a namespace that the provider is loaded for */
+#define CMPIInvocationFlags "CMPIInvocationFlags" /* CMPI_uint32: CMPI_FLAG_... bits */
+#define CMPIPrincipal "CMPIPrincipal"             /* CMPI_string: the user who asks */
+#define CMPIRole "CMPIRole"                       /* CMPI_string: that user's role; empty: unknown */
+#define CMPIAcceptLanguage "CMPIAcceptLanguage"   /* CMPI_string: languages wanted, as HTTP writes them */
+#define CMPIContentLanguage "CMPIContentLanguage" /* CMPI_string: language of the data */
 
+/*
+ * What a broker can do. A capability contains the bits of those it builds on: test (caps & MASK) == MASK. The first
+ * group is older than the standard; its bits overlap with the later ones.
+ */
 #define CMPI_MB_Class_0 0x00000001
 #define CMPI_MB_Class_1 0x00000003
 #define CMPI_MB_Class_2 0x00000007
@@ -286,10 +342,7 @@ typedef struct _CMPIStatus {
 #define CMPI_MB_Supports_QueryNormalization 0x00000800
 #define CMPI_MB_Supports_Qualifier 0x00001000
 #define CMPI_MB_Supports_Schema 0x00003000
-#ifdef CMPI_VER_200
-#define CMPI_MB_Supports_MemEnhancements 0x00004000
-#define CMPI_MB_Supports_Extended_Error 0x00008000
-#endif
+
 #define CMPI_MB_BasicRead 0x00000001
 #define CMPI_MB_BasicWrite 0x00000003
 #define CMPI_MB_InstanceManipulation 0x00000007
@@ -299,8 +352,16 @@ typedef struct _CMPIStatus {
 #define CMPI_MB_Indications 0x00000081
 #define CMPI_MB_BasicQualifierSupport 0x00000047
 #define CMPI_MB_OSEncapsulationSupport 0x00000100
+#ifdef CMPI_VER_200
+#define CMPI_MB_Supports_MemEnhancements 0x00004000 /* without it the broker's mft is null */
+#define CMPI_MB_Supports_Extended_Error 0x00008000
+#endif
+#define CMPI_MB_Logging 0x00010000
+#define CMPI_MB_Tracing 0x00020000
+#define CMPI_MB_PropertyFiltering 0x00040001
+#define CMPI_MB_CodepageConversion 0x00080000
 
-/* CMPIPredOp */
+/* Operators of query predicates. */
 typedef enum _CMPIPredOp {
     CMPI_PredOp_Equals = 1,
     CMPI_PredOp_NotEquals = 2,
@@ -320,7 +381,7 @@ typedef enum _CMPIPredOp {
 #endif
 } CMPIPredOp;
 
-/* CMPISeverity */
+/* Severities for the log. */
 typedef enum _CMPISeverity {
     CMPI_SEV_ERROR = 1,
     CMPI_SEV_INFO = 2,
@@ -328,14 +389,14 @@ typedef enum _CMPISeverity {
     CMPI_DEV_DEBUG = 4
 } CMPISeverity;
 
-/* CMPILevel */
+/* Levels for the trace. */
 typedef enum _CMPILevel { CMPI_LEV_INFO = 1, CMPI_LEV_WARNING = 2, CMPI_LEV_VERBOSE = 3 } CMPILevel;
 
-/* CMPISelectCondType */
+/* Normal forms of a query's condition: an OR of ANDs, or an AND of ORs. */
 typedef enum _CMPISelectCondType { CMPI_COND_DOC = 0, CMPI_COND_COD = 1 } CMPISelectCondType;
 
 #ifdef CMPI_VER_200
-/* CMPIErrorType */
+/* The attributes of a CMPIError. Their enumerators have no prefix: keep clear of these words. */
 typedef enum _CMPIErrorType {
     UnknownErrorType = 0,
     OtherErrorType = 1,
@@ -351,7 +412,6 @@ typedef enum _CMPIErrorType {
     UnsupportedOperationError = 10
 } CMPIErrorType;
 
-/* CMPIErrorSeverity */
 typedef enum _CMPIErrorSeverity {
     ErrorSevUnknown = 0,
     ErrorSevLow = 2,
@@ -360,10 +420,8 @@ typedef enum _CMPIErrorSeverity {
     ErrorSevFatal = 5
 } CMPIErrorSeverity;
 
-/* CMPIErrorSrcFormat */
 typedef enum _CMPIErrorSrcFormat { CMPIErrSrcUnknown = 0, CMPIErrSrcOther = 1, CIMObjectHandle = 2 } CMPIErrorSrcFormat;
 
-/* CMPIErrorProbableCause */
 typedef enum _CMPIErrorProbableCause {
     ErrorProbCauseUnknown = 0,
     ErrorProbCauseOther = 1,
