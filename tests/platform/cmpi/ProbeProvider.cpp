@@ -1,0 +1,2 @@
+// The same provider in C++: the stubs' symbols and tables are no different.
+#include "ProbeProvider.c"
