@@ -1,0 +1,16 @@
+#pragma once
+
+#include "objectmanager/model/Schema.h"
+#include "objectmanager/model/Values.h"
+#include "objectmanager/vkcim/Report.h"
+
+#include <string>
+
+/// Answers as JSON: one object on one line, without the line's end.
+namespace vkcim {
+
+/// `nameSpace` is the request's: references that lie in another one carry it.
+std::string jsonText(const om::Answer& answer, const std::string& nameSpace, const om::Schema& schema);
+std::string jsonText(const Report& report, const std::string& nameSpace, const om::Schema& schema);
+
+} // namespace vkcim

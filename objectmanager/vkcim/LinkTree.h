@@ -1,0 +1,15 @@
+#pragma once
+
+#include "objectmanager/vkcim/Report.h"
+
+#include <string>
+#include <vector>
+
+namespace vkcim {
+
+/// The links as trees, one line each: what stands above everything first, each thing below it indented and with the
+/// association's name. What hangs below a thing is drawn where it comes up first, and only there; so a circle of
+/// links ends as well. Things and links keep the order in which they are given.
+std::vector<std::string> drawLinks(const std::vector<Link>& links);
+
+} // namespace vkcim

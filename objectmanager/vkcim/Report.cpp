@@ -1,0 +1,84 @@
+#include "objectmanager/vkcim/Report.h"
+
+#include "objectmanager/model/Names.h"
+#include "objectmanager/vkcim/PathText.h"
+
+#include <sys/utsname.h>
+
+namespace vkcim {
+namespace {
+
+/// Which reference of an association is drawn above the other.
+struct Direction {
+    const char* association;
+    const char* above;
+    const char* below;
+};
+
+constexpr Direction directions[] = {{"VESKA_ComputerSystemPackage", "Antecedent", "Dependent"},
+                                    {"VESKA_ComputerCapabilities", "ManagedElement", "Capabilities"},
+                                    {"VESKA_TimeServiceAffectsElement", "AffectingElement", "AffectedElement"}};
+
+std::string hostName() {
+    utsname names{};
+    return uname(&names) == 0 ? names.nodename : "";
+}
+
+std::string referenceText(const om::Instance& instance, const char* name, const std::string& nameSpace,
+                          const om::Schema& schema) {
+    for (const om::NamedValue& property : instance.properties) {
+        if (!om::sameName(property.first, name)) continue;
+        const auto* path = std::get_if<std::shared_ptr<const om::ObjectPath>>(&property.second.data);
+        if (path && *path) return qualifiedPathText(**path, nameSpace, schema);
+    }
+    return {};
+}
+
+} // namespace
+
+const std::vector<std::string> reportClasses = {"VESKA_ComputerSystem", "VESKA_PhysicalPackage",
+                                                "VESKA_EnabledLogicalElementCapabilities", "VESKA_TimeService",
+                                                "VESKA_CIMServiceConfig"};
+const std::vector<std::string> reportAssociations = {"VESKA_ComputerSystemPackage", "VESKA_ComputerCapabilities",
+                                                     "VESKA_TimeServiceAffectsElement"};
+
+Report makeReport(const std::string& nameSpace, const std::optional<std::vector<std::string>>& properties,
+                  const std::function<om::Answer(const om::Request&)>& run,
+                  const std::function<std::vector<std::string>()>& notes) {
+    const auto ask = [&](const std::vector<std::string>& classNames) {
+        Report::Answers answers;
+        for (const std::string& name : classNames) {
+            om::Request request;
+            request.operation = om::Operation::EnumInstances;
+            request.path.nameSpace = nameSpace;
+            request.path.className = name;
+            request.propertyList = properties;
+            answers.emplace_back(name, run(request));
+        }
+        return answers;
+    };
+    Report report;
+    report.host = hostName();
+    report.classes = ask(reportClasses);
+    report.associations = ask(reportAssociations);
+    report.notes = notes();
+    return report;
+}
+
+std::vector<Link> links(const Report::Answers& associations, const std::string& nameSpace, const om::Schema& schema) {
+    std::vector<Link> found;
+    for (const auto& [name, answer] : associations) {
+        for (const Direction& direction : directions) {
+            if (!om::sameName(direction.association, name)) continue;
+            for (const auto& result : answer.results) {
+                const auto* instance = std::get_if<om::Instance>(&result);
+                if (!instance) continue;
+                found.push_back({referenceText(*instance, direction.above, nameSpace, schema),
+                                 referenceText(*instance, direction.below, nameSpace, schema), name});
+            }
+        }
+    }
+    return found;
+}
+
+} // namespace vkcim

@@ -1,0 +1,41 @@
+#pragma once
+
+#include "objectmanager/broker/ObjectManager.h"
+
+#include <functional>
+#include <optional>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace vkcim {
+
+/// What `report` asks: the instance classes and the associations, in the order of their class identifiers.
+extern const std::vector<std::string> reportClasses;
+extern const std::vector<std::string> reportAssociations;
+
+struct Report {
+    using Answers = std::vector<std::pair<std::string, om::Answer>>;
+
+    std::string host;
+    Answers classes;
+    Answers associations;
+    std::vector<std::string> notes;
+};
+
+/// Asks every class and association for its instances. `run` runs one request; `notes` is asked last.
+Report makeReport(const std::string& nameSpace, const std::optional<std::vector<std::string>>& properties,
+                  const std::function<om::Answer(const om::Request&)>& run,
+                  const std::function<std::vector<std::string>()>& notes);
+
+/// One association as the report draws it: what stands above and what below.
+struct Link {
+    std::string above;
+    std::string below;
+    std::string association;
+};
+
+/// The associations among what was answered, each end as its path's text.
+std::vector<Link> links(const Report::Answers& associations, const std::string& nameSpace, const om::Schema& schema);
+
+} // namespace vkcim

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "objectmanager/broker/ObjectManager.h"
+#include "objectmanager/vkcim/Arguments.h"
+
+#include <istream>
+
+namespace vkcim {
+
+/// The request that the arguments stand for; not for `report`. A path given as `-` is the first line of `input`.
+/// Throws std::runtime_error with a message for the user when a text cannot be read.
+om::Request makeRequest(const Arguments& arguments, const om::Schema& schema, std::istream& input);
+
+} // namespace vkcim

@@ -1,0 +1,21 @@
+#pragma once
+
+#include "objectmanager/vkcim/Arguments.h"
+
+#include <iosfwd>
+
+namespace vkcim {
+
+/// Where a run reads and writes.
+struct Streams {
+    std::istream& input;
+    std::ostream& output;
+    std::ostream& error;
+    bool colours = false; ///< whether the output may be coloured
+};
+
+/// Does what the arguments say and returns the exit status: 0 status OK, 1 another status (or the output cannot be
+/// written), 2 a path or value that cannot be read, 3 a library that cannot be used.
+int run(const Arguments& arguments, const Streams& streams);
+
+} // namespace vkcim

@@ -1,0 +1,52 @@
+#include "objectmanager/vkcim/Suggestion.h"
+
+#include "objectmanager/vkcim/Characters.h"
+
+#include <algorithm>
+#include <numeric>
+#include <vector>
+
+namespace vkcim {
+namespace {
+
+constexpr std::size_t longest = 256;
+
+/// The letters to insert, delete or replace to come from one to the other.
+std::size_t distance(std::string_view from, std::string_view to) {
+    std::vector<std::size_t> row(to.size() + 1);
+    std::iota(row.begin(), row.end(), std::size_t{0});
+    for (std::size_t i = 0; i < from.size(); ++i) {
+        std::size_t diagonal = row[0]++;
+        for (std::size_t j = 0; j < to.size(); ++j) {
+            const std::size_t replaced = diagonal + (om::lower(from[i]) == om::lower(to[j]) ? 0 : 1);
+            diagonal = row[j + 1];
+            row[j + 1] = std::min({replaced, row[j] + 1, diagonal + 1});
+        }
+    }
+    return row.back();
+}
+
+std::string_view withoutPrefix(std::string_view name) {
+    const std::size_t underscore = name.find('_');
+    return underscore == std::string_view::npos ? name : name.substr(underscore + 1);
+}
+
+} // namespace
+
+std::optional<std::string> nearestClass(std::string_view className, const om::Schema& schema) {
+    if (className.size() > longest || schema.find(className)) return std::nullopt;
+    std::optional<std::string> nearest;
+    std::size_t best = className.size() / 4 + 1;
+    for (const om::ClassDeclaration& known : schema.classes()) {
+        // The name alone, without the schema's prefix, is a common way to get it wrong.
+        const bool bare = om::sameName(className, withoutPrefix(known.name));
+        const std::size_t away = bare ? 1 : distance(className, known.name);
+        if (away < best || (away == best && !nearest)) {
+            best = away;
+            nearest = known.name;
+        }
+    }
+    return nearest;
+}
+
+} // namespace vkcim
