@@ -29,13 +29,28 @@ std::vector<std::string> splitNames(const std::string& text) {
     return names;
 }
 
+/// `--option=` is the option with an empty text; CLI11 would take the next word for it.
+std::vector<std::string> splitEmpty(const std::vector<std::string>& words) {
+    std::vector<std::string> split;
+    bool options = true;
+    for (const std::string& word : words) {
+        options = options && word != "--";
+        const bool empty = options && word.rfind("--", 0) == 0 && word.find('=') == word.size() - 1;
+        split.push_back(empty ? word.substr(0, word.size() - 1) : word);
+        if (empty) split.emplace_back();
+    }
+    return split;
+}
+
 class CommandLine {
 public:
     CommandLine() : app("Asks a CMPI provider library and prints what it answers.", "vkcim") {
-        app.set_version_flag("--version", "vkcim " VKCIM_VERSION);
+        app.set_version_flag("--version", "vkcim " VKCIM_VERSION, "Print the version and exit");
         app.set_help_flag("--help", "Print this and exit");
         app.require_subcommand(1, 1);
         app.fallthrough();
+        app.get_formatter()->label("SUBCOMMAND", "COMMAND");
+        app.get_formatter()->label("REQUIRED", "");
         app.footer("PATH is a class name or CLASS.KEY=\"TEXT\",KEY=NUMBER; - reads it from standard input.\n"
                    "VALUE is TYPE:TEXT, null:TYPE, or TEXT alone with the type that the schema declares.\n"
                    "'vkcim COMMAND --help' shows an example. Exit status: 0 done, 1 the provider answered an\n"
@@ -44,9 +59,10 @@ public:
         for (const Command& command : commands) addCommand(command);
     }
 
-    Parsed parse(const std::vector<std::string>& words) {
+    Parsed parse(const std::vector<std::string>& given) {
         try {
-            // Taken from the back.
+            const std::vector<std::string> words = splitEmpty(given);
+            // CLI11 takes them from the back.
             app.parse(std::vector<std::string>(words.rbegin(), words.rend()));
             finish();
             return {std::move(arguments), 0, {}, {}};
@@ -55,7 +71,7 @@ public:
             app.exit(success, output, output);
             return {std::nullopt, 0, output.str(), {}};
         } catch (const CLI::Error& error) {
-            return {std::nullopt, unusable, {}, std::string("vkcim: ") + error.what() + "\nTry 'vkcim --help'.\n"};
+            return {std::nullopt, unusable, {}, "vkcim: " + explain(error) + "\nTry 'vkcim --help'.\n"};
         }
     }
 
@@ -69,7 +85,7 @@ private:
         app.add_option("--format", formatName, "Output format: text, mof or json")
             ->capture_default_str()
             ->type_name("FORMAT")
-            ->check(CLI::IsMember(&formats));
+            ->check(CLI::IsMember(&formats).description(""));
         app.add_option("--assoc-class", arguments.assocClass, "For the association commands: the association's class")
             ->type_name("C");
         app.add_option("--result-class", arguments.resultClass, "For the association commands: the results' class")
@@ -82,22 +98,37 @@ private:
         repeat = app.add_option("--repeat", arguments.repeat, "Run the operation N times in each thread")
                      ->capture_default_str()
                      ->type_name("N")
-                     ->check(CLI::Range(std::size_t{1}, mostRuns));
+                     ->check(CLI::Range(std::size_t{1}, mostRuns).description(""));
         threads = app.add_option("--threads", arguments.threads, "Run in T threads at once")
                       ->capture_default_str()
                       ->type_name("T")
-                      ->check(CLI::Range(std::size_t{1}, mostThreads));
+                      ->check(CLI::Range(std::size_t{1}, mostThreads).description(""));
         app.add_flag("--timing", arguments.timing, "Print how long the runs took, as JSON on standard error");
+    }
+
+    std::string explain(const CLI::Error& error) const {
+        if (!app.get_subcommands().empty() ||
+            error.get_exit_code() != static_cast<int>(CLI::ExitCodes::RequiredError)) {
+            return error.what();
+        }
+        const std::vector<std::string> unknown = app.remaining();
+        return unknown.empty() ? "a command is missing" : "there is no command or option '" + unknown.front() + "'";
     }
 
     void addCommand(const Command& command) {
         CLI::App* sub = app.add_subcommand(command.name, command.about);
+        sub->group("Commands");
         sub->footer(std::string("Example:\n  ") + command.example + "\nOptions of every command: vkcim --help");
-        const char* subject = command.takes == Takes::Class ? "CLASS" : command.takes == Takes::Path ? "PATH" : "TEXT";
-        if (command.takes != Takes::Nothing) sub->add_option(subject, arguments.subject)->required()->type_name("");
-        if (command.method) sub->add_option("METHOD", arguments.method)->required()->type_name("");
+        const auto add = [&](const char* name, auto& text, bool required, const char* about) {
+            sub->add_option(name, text, about)->required(required)->type_name("");
+        };
+        if (command.takes == Takes::Class) add("CLASS", arguments.subject, true, "Name of a class");
+        if (command.takes == Takes::Path) add("PATH", arguments.subject, true, "Path; - reads it from standard input");
+        if (command.takes == Takes::Query) add("TEXT", arguments.subject, true, "The query");
+        if (command.method) add("METHOD", arguments.method, true, "Name of the method");
         if (command.assignments) {
-            sub->add_option("NAME=VALUE", arguments.assignments)->required(command.needsAssignments)->type_name("");
+            add("NAME=VALUE", arguments.assignments, command.needsAssignments,
+                "Names and values, as many as there are");
         }
     }
 
