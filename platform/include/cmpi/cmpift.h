@@ -6,11 +6,12 @@
  *   before touching them.
  * - A CMPIStatus* rc or a ...Out pointer may be null: the answer is then not wanted. Otherwise *rc is always written.
  * - A failing function answers null, 0 or CMPI_null, according to its type.
- * - What a broker's function returns is the broker's and lives until the request ends. What clone returns is the
- *   caller's, lives until release and may be kept between requests.
+ * - What a broker's function returns is the broker's and lives until the request ends. What clone returns is a copy of
+ *   the caller's own, which lives until release and may be kept between requests. Releasing what a new... function made
+ *   only ends it early; releasing what the provider was called with does nothing.
  * - Objects that a provider is called with are the broker's and last for that call; clone what is to be kept.
- * - A value is passed as a pointer to a CMPIValue or to a plain variable of the type named beside it; of type
- * CMPI_chars the pointer is the text itself. A null pointer means null. Values are copied.
+ * - A value is passed as a pointer to a CMPIValue or to a plain variable of the type named beside it; with CMPI_chars
+ *   the pointer is the text itself. A null pointer means null. Values are copied.
  * - Names of properties, keys, arguments and classes match without regard to case. Indexes start at 0.
  * - A property list is an array of names that ends with a null pointer; no list means all properties.
  * - Nothing may be thrown through a slot.
@@ -32,7 +33,7 @@ struct timespec;
  * in a CMPIString it points to the text, which macros compiled into old providers read directly.
  */
 
-/* Facts about the request: flags, user, languages. */
+/* What is known of the request: flags, user, languages. */
 struct _CMPIContext {
     void* hdl;
     CMPIContextFT* ft;
@@ -102,7 +103,7 @@ struct _CMPIPredicate {
 };
 
 #ifdef CMPI_VER_200
-/* More about a failure than a status can say. */
+/* What a status cannot say of a failure. */
 struct _CMPIError {
     void* hdl;
     CMPIErrorFT* ft;
@@ -162,9 +163,11 @@ struct _CMPIBrokerFT {
     CMPIContext* (*prepareAttachThread)(const CMPIBroker* broker, const CMPIContext* ctx);
     CMPIStatus (*attachThread)(const CMPIBroker* broker, const CMPIContext* ctx);
     CMPIStatus (*detachThread)(const CMPIBroker* broker, const CMPIContext* ctx);
+
     /* Hand an event of namespace ns to whoever subscribed, if anybody did. */
     CMPIStatus (*deliverIndication)(const CMPIBroker* broker, const CMPIContext* ctx, const char* ns,
                                     const CMPIInstance* indication);
+
     /* Instances. Paths name a class to enumerate, create and query, and an instance otherwise. */
     CMPIEnumeration* (*enumerateInstanceNames)(const CMPIBroker* broker, const CMPIContext* ctx,
                                                const CMPIObjectPath* path, CMPIStatus* rc);
@@ -179,6 +182,7 @@ struct _CMPIBrokerFT {
                                   const char* query, const char* lang, CMPIStatus* rc);
     CMPIEnumeration* (*enumerateInstances)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                                            const char** propList, CMPIStatus* rc);
+
     /* What stands in association with the object at path. A null filter lets everything pass. */
     CMPIEnumeration* (*associators)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                                     const char* assocClass, const char* resultClass, const char* role,
@@ -190,9 +194,11 @@ struct _CMPIBrokerFT {
                                    const char* resultClass, const char* role, const char** propList, CMPIStatus* rc);
     CMPIEnumeration* (*referenceNames)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                                        const char* resultClass, const char* role, CMPIStatus* rc);
+
     /* Call a method of the object at path; it answers its return value and fills out, which comes empty. */
     CMPIData (*invokeMethod)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                              const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus* rc);
+
     /* One property of the instance at path. */
     CMPIStatus (*setProperty)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                               const char* name, const CMPIValue* value, CMPIType type);
@@ -214,25 +220,31 @@ struct _CMPIBrokerEncFT {
     CMPIString* (*newString)(const CMPIBroker* broker, const char* text, CMPIStatus* rc);
     CMPIArray* (*newArray)(const CMPIBroker* broker, CMPICount size, CMPIType type, CMPIStatus* rc);
     CMPIDateTime* (*newDateTime)(const CMPIBroker* broker, CMPIStatus* rc);
+
     /* From microseconds since 1970 in UTC, or of length; from the 25 characters of a CIM datetime. */
     CMPIDateTime* (*newDateTimeFromBinary)(const CMPIBroker* broker, CMPIUint64 usec, CMPIBoolean isInterval,
                                            CMPIStatus* rc);
     CMPIDateTime* (*newDateTimeFromChars)(const CMPIBroker* broker, const char* text, CMPIStatus* rc);
+
     /* Parses a query. The projection is an array of the selected names, or null where everything is selected. */
     CMPISelectExp* (*newSelectExp)(const CMPIBroker* broker, const char* query, const char* lang,
                                    CMPIArray** projectionOut, CMPIStatus* rc);
+
     /* True where the class of path is cls or derives from it. */
     CMPIBoolean (*classPathIsA)(const CMPIBroker* broker, const CMPIObjectPath* path, const char* cls, CMPIStatus* rc);
+
     /* For debugging, of any object: a text, and its type by name ("CMPIInstance"). */
     CMPIString* (*toString)(const CMPIBroker* broker, const void* object, CMPIStatus* rc);
     CMPIBoolean (*isOfType)(const CMPIBroker* broker, const void* object, const char* typeName, CMPIStatus* rc);
     CMPIString* (*getType)(const CMPIBroker* broker, const void* object, CMPIStatus* rc);
+
     /*
      * The message of that id, or else the default text, with $0 ... $9 replaced by the inserts: up to ten pairs of a
      * type code and a value, as the CMFmt macros make them.
      */
     CMPIString* (*getMessage)(const CMPIBroker* broker, const char* msgId, const char* defaultText, CMPIStatus* rc,
                               CMPICount pairs, ...);
+
     /* Write to the broker's log and trace: the text, or where that is null the string. CMPISeverity, CMPILevel. */
     CMPIStatus (*logMessage)(const CMPIBroker* broker, int severity, const char* id, const char* text,
                              const CMPIString* stringObj);
@@ -243,6 +255,7 @@ struct _CMPIBrokerEncFT {
     CMPIError* (*newCMPIError)(const CMPIBroker* broker, const char* owner, const char* msgId, const char* text,
                                CMPIErrorSeverity severity, CMPIErrorProbableCause cause, CMPIrc cimStatus,
                                CMPIStatus* rc);
+
     /* A file of translations; its handle is null where there is none, which getMessage2 and close take as well. */
     CMPIStatus (*openMessageFile)(const CMPIBroker* broker, const char* file, CMPIMsgFileHandle* handleOut);
     CMPIStatus (*closeMessageFile)(const CMPIBroker* broker, CMPIMsgFileHandle handle);
@@ -254,6 +267,7 @@ struct _CMPIBrokerEncFT {
 /* Services of the operating system. Those that answer an int answer 0 or an errno value. */
 struct _CMPIBrokerExtFT {
     int ftVersion;
+
     /* The file name of a library ("X": "libX.so"), on the heap: the caller frees it. */
     char* (*resolveFileName)(const char* libName);
 
@@ -354,6 +368,7 @@ struct _CMPIObjectPathFT {
     CMPIData (*getKeyAt)(const CMPIObjectPath* path, CMPICount index, CMPIString** nameOut, CMPIStatus* rc);
     CMPICount (*getKeyCount)(const CMPIObjectPath* path, CMPIStatus* rc);
 
+    /* Take the namespace, or host and namespace, over from source. */
     CMPIStatus (*setNameSpaceFromObjectPath)(CMPIObjectPath* path, const CMPIObjectPath* source);
     CMPIStatus (*setHostAndNameSpaceFromObjectPath)(CMPIObjectPath* path, const CMPIObjectPath* source);
 
@@ -366,6 +381,7 @@ struct _CMPIObjectPathFT {
     CMPIData (*getParameterQualifier)(const CMPIObjectPath* path, const char* method, const char* parameter,
                                       const char* qualifier, CMPIStatus* rc);
 
+    /* A readable form; the broker decides which. */
     CMPIString* (*toString)(const CMPIObjectPath* path, CMPIStatus* rc);
 };
 
@@ -381,8 +397,11 @@ struct _CMPIInstanceFT {
 
     /* The path made of namespace, class and key properties. */
     CMPIObjectPath* (*getObjectPath)(const CMPIInstance* inst, CMPIStatus* rc);
+
     /* From now on setProperty ignores what is not in propList. No list: ignores nothing. */
     CMPIStatus (*setPropertyFilter)(CMPIInstance* inst, const char** propList, const char** keyList);
+
+    /* Replaces the path. Whether key properties follow is up to the broker: set both. */
     CMPIStatus (*setObjectPath)(CMPIInstance* inst, const CMPIObjectPath* path);
 #ifdef CMPI_VER_200
     /* As setProperty, and says which class brought the property in. */
@@ -601,9 +620,11 @@ struct _CMPIIndicationMIFT {
     CMPIStatus (*cleanup)(CMPIIndicationMI* mi, const CMPIContext* ctx, CMPIBoolean terminating);
     CMPIStatus (*authorizeFilter)(CMPIIndicationMI* mi, const CMPIContext* ctx, const CMPISelectExp* filter,
                                   const char* className, const CMPIObjectPath* classPath, const char* owner);
-    /* Whether the broker is to poll. The number of its parameters has changed over time: better not called. */
+
+    /* Whether the broker is to poll. The number of its parameters differs between versions: better not called. */
     CMPIStatus (*mustPoll)(CMPIIndicationMI* mi, const CMPIContext* ctx, const CMPISelectExp* filter,
                            const char* className, const CMPIObjectPath* classPath);
+
     /* The flags are true for the first activation of a filter and for its last deactivation. */
     CMPIStatus (*activateFilter)(CMPIIndicationMI* mi, const CMPIContext* ctx, const CMPISelectExp* filter,
                                  const char* className, const CMPIObjectPath* classPath, CMPIBoolean firstActivation);
