@@ -1,0 +1,30 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace VK {
+
+/// What a simulated host's file says of the product instead of the real host.
+struct ProductOverrides {
+    std::optional<std::string> architecture;
+    std::optional<std::string> uid;
+    std::optional<std::string> rootDirectory;
+    std::optional<bool> kvm;
+};
+
+/// The overrides of the simulated host's file as it stood when first asked for; all absent when the process's host is
+/// not a simulated one (vk/HostSource.h), or its file cannot be read.
+const ProductOverrides& productOverrides();
+
+/// Whether the host is a KVM virtual machine; found out once per process. A simulated host's file may say so. This
+/// machine: CPUID says KVMKVMKVM (x86), or the firmware's system product name starts with KVM, or its system
+/// manufacturer with QEMU. A snapshot: the firmware's names alone.
+bool hostIsKVM();
+
+/// For people: one line for each thing that the host could not tell, and why: it lacks the source, or we may not see
+/// it. Nothing is thrown but std::bad_alloc.
+std::vector<std::string> hostNotes();
+
+} // namespace VK

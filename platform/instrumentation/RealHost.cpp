@@ -1,0 +1,88 @@
+#include "instrumentation/RealHost.h"
+
+#include "instrumentation/HostNodes.h"
+#include "instrumentation/HostState.h"
+#include "instrumentation/Log.h"
+#include "vk/NodeLexicon.h"
+
+#include <algorithm>
+#include <cerrno>
+
+namespace VK {
+namespace Inside {
+
+namespace {
+
+void logProblems(const HardwareFacts& facts) {
+    for (const std::string& problem : facts.problems) logLine(FAILURE, "readOnce", __LINE__, problem);
+    if (facts.tablesError != 0)
+        logLine(facts.tablesError == ENOENT ? DETAIL : NOTICE, "readOnce", __LINE__,
+                "no SMBIOS tables: " + errorText(facts.tablesError));
+}
+
+} // namespace
+
+void RealHost::readOnce() {
+    std::call_once(once, [this] {
+        std::vector<Node> all;
+        if (const Root::Names top = root.list("/"); !top) {
+            rootProblem = root.getDirectory() + ": " + errorText(top.error);
+            logLine(FAILURE, "readOnce", __LINE__, rootProblem);
+        } else {
+            facts = readHardware(root);
+            logProblems(facts);
+            all = hostNodes(facts);
+        }
+        nodes = std::make_shared<const NodeTree>(std::move(all));
+    });
+}
+
+std::shared_ptr<const NodeTree> RealHost::tree() {
+    readOnce();
+    return nodes;
+}
+
+const HardwareFacts& RealHost::hardware() {
+    readOnce();
+    return facts;
+}
+
+const std::string& RealHost::problem() {
+    readOnce();
+    return rootProblem;
+}
+
+std::optional<Value> RealHost::read(const Node& node, unsigned int property) {
+    const auto found = node.properties.find(property);
+    if (found != node.properties.end()) return found->second;
+    return node.type == NodeLexicon::ComputerSystemNode ? changingProperty(root, property) : std::nullopt;
+}
+
+bool RealHost::write(const Node& node, unsigned int property, const Value&) {
+    logLine(FAILURE, "setProperty", __LINE__,
+            "property " + std::to_string(property) + " of " + node.path + " cannot be written");
+    return false;
+}
+
+std::optional<bool> RealHost::isReadOnly(const Node& node, unsigned int property) {
+    if (node.type != NodeLexicon::ComputerSystemNode) return true;
+    switch (property) {
+    case NodeLexicon::SystemTimeProperty:
+        return !root.isLive();
+    case NodeLexicon::GmtOffsetProperty:
+    case NodeLexicon::AutomaticDSTAdjustmentProperty:
+        return false;
+    default:
+        return true;
+    }
+}
+
+unsigned int RealHost::status(const Node& node) {
+    constexpr unsigned int UNCORRECTABLE_ERRORS = 22;
+    if (node.type == NodeLexicon::ComputerSystemNode && hasUncorrectableMemoryErrors(root))
+        return std::max(node.status, UNCORRECTABLE_ERRORS); // the worse, the larger
+    return node.status;
+}
+
+} // namespace Inside
+} // namespace VK

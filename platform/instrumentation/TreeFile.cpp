@@ -1,0 +1,102 @@
+#include "instrumentation/TreeFile.h"
+
+#include "common/FileDescriptor.h"
+#include "instrumentation/AtomicFile.h"
+#include "instrumentation/Log.h"
+
+#include <cerrno>
+#include <chrono>
+#include <cstdlib>
+#include <fcntl.h>
+#include <memory>
+#include <sys/file.h>
+#include <thread>
+
+namespace VK {
+namespace Inside {
+
+namespace {
+
+constexpr std::chrono::seconds LONGEST_WAIT{10};
+constexpr std::chrono::milliseconds BETWEEN_TRIES{5};
+
+TreeFileContents unusable(int error) {
+    TreeFileContents contents;
+    contents.error = error;
+    contents.problem = errorText(error);
+    return contents;
+}
+
+/// Up to `limit` bytes; 0 or the errno value.
+int readBytes(int fd, std::size_t limit, std::string& text) {
+    while (text.size() < limit) {
+        const std::size_t before = text.size();
+        text.resize(std::min(limit, before + 65536));
+        const ssize_t count = ::read(fd, text.data() + before, text.size() - before);
+        text.resize(before + (count > 0 ? static_cast<std::size_t>(count) : 0));
+        if (count == 0) break;
+        if (count < 0 && errno != EINTR) return errno;
+    }
+    return 0;
+}
+
+/// The lock, or none after the longest wait; then errno tells why.
+FileDescriptor lockFile(const std::string& file) {
+    FileDescriptor lock(::open((file + ".lock").c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
+    if (!lock) return lock;
+    const auto end = std::chrono::steady_clock::now() + LONGEST_WAIT;
+    while (flock(lock.get(), LOCK_EX | LOCK_NB) != 0) {
+        if (errno != EWOULDBLOCK && errno != EINTR) return FileDescriptor();
+        if (std::chrono::steady_clock::now() >= end) {
+            errno = EWOULDBLOCK;
+            return FileDescriptor();
+        }
+        std::this_thread::sleep_for(BETWEEN_TRIES);
+    }
+    return lock;
+}
+
+std::string withoutLinks(const std::string& file) {
+    const std::unique_ptr<char, decltype(&std::free)> real(realpath(file.c_str(), nullptr), &std::free);
+    return real ? real.get() : file;
+}
+
+} // namespace
+
+TreeFileContents readTreeFile(const std::string& file, std::size_t limit) {
+    const FileDescriptor fd(::open(file.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
+    if (!fd) return unusable(errno);
+    TreeFileContents contents;
+    if (fstat(fd.get(), &contents.status) != 0) return unusable(errno);
+    if (!S_ISREG(contents.status.st_mode)) {
+        contents.problem = "not a regular file";
+    } else if (contents.status.st_size > static_cast<off_t>(limit)) {
+        contents.problem = "larger than " + std::to_string(limit) + " bytes";
+    } else if (const int error = readBytes(fd.get(), limit, contents.text); error != 0) {
+        return unusable(error);
+    }
+    return contents;
+}
+
+std::string replaceTreeFile(const std::string& file, std::size_t limit, const TreeChange& change) {
+    const std::string real = withoutLinks(file);
+    const FileDescriptor lock = lockFile(real);
+    if (!lock) return "cannot lock " + real + ".lock: " + errorText(errno);
+    const TreeFileContents now = readTreeFile(real, limit);
+    if (!now.problem.empty()) return now.problem;
+    std::string problem;
+    const std::string text = change(now.text, problem);
+    if (!problem.empty()) return problem;
+    if (text == now.text) return {};
+    if (text.size() > limit) return "it would be larger than " + std::to_string(limit) + " bytes";
+    const std::size_t slash = real.rfind('/') + 1;
+    const FileDescriptor folder(
+        ::open(slash == 0 ? "." : real.substr(0, slash).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (!folder) return errorText(errno);
+    const FileOwner owner{now.status.st_mode & 07777, now.status.st_uid, now.status.st_gid};
+    const int error = replaceFile(folder.get(), real.substr(slash), text, owner);
+    return error == 0 ? std::string() : "cannot replace it: " + errorText(error);
+}
+
+} // namespace Inside
+} // namespace VK
