@@ -1,0 +1,17 @@
+#pragma once
+
+#include "vk/Instrumentation.h"
+
+#include <string>
+
+namespace VK::BaseServerProvider {
+
+/// The name of the computer node that the cursor stands on; throws InstrumentationException with `failure` when it
+/// cannot be read.
+std::string requiredComputerName(const Instrumentation& node, const char* failure);
+
+/// Stands on the first computer node of exactly this name, or on nothing. A computer without a name met before throws
+/// InstrumentationException.
+void selectComputer(Instrumentation& cursor, const std::string& name);
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,200 @@
+#include "Linux/ComputerSystem.h"
+
+#include "vk/Product.h"
+#include "vk/make_string.h"
+
+namespace VK::BaseServerProvider {
+
+static const std::string loggerComputerSystem("Norvane.BaseServerProvider");
+static const TraceSource source{loggerComputerSystem, "ComputerSystem"};
+
+namespace {
+
+enum class Health { Unknown, Normal, PredictiveFailure, Degraded };
+
+Health healthOf(unsigned int nodeStatus) {
+    if (nodeStatus == 1) return Health::Normal;
+    if (nodeStatus == 20) return Health::PredictiveFailure;
+    if (nodeStatus >= 21 && nodeStatus <= 26) return Health::Degraded;
+    return Health::Unknown;
+}
+
+} // namespace
+
+const TraceSource& ComputerSystem::traceSource() {
+    return source;
+}
+
+ComputerSystem::ComputerSystem() {
+    const TraceScope scope(source);
+}
+
+ComputerSystem::~ComputerSystem() {
+    const DestructorTraceScope scope(source);
+}
+
+bool ComputerSystem::passes(const Filter& filter) const {
+    std::string name;
+    return filter.type != FilterType::Name || !node().getProperty(NodeLexicon::NameProperty, name) ||
+           name == filter.reference;
+}
+
+bool ComputerSystem::getName(std::string& name) const {
+    const TraceScope scope(source);
+    return node().getProperty(NodeLexicon::NameProperty, name);
+}
+
+bool ComputerSystem::getElementName(std::string& name) const {
+    const TraceScope scope(source);
+    return node().getProperty(NodeLexicon::NameProperty, name);
+}
+
+bool ComputerSystem::getUUID(std::string& uuid) const {
+    const TraceScope scope(source);
+    return node().getProperty(NodeLexicon::UUIDProperty, uuid);
+}
+
+bool ComputerSystem::getPrimaryOwnerContact(std::string& contact) const {
+    const TraceScope scope(source);
+    return node().getProperty(NodeLexicon::PrimaryOwnerContactProperty, contact);
+}
+
+bool ComputerSystem::getPrimaryOwnerName(std::string& name) const {
+    const TraceScope scope(source);
+    return node().getProperty(NodeLexicon::PrimaryOwnerNameProperty, name);
+}
+
+bool ComputerSystem::getDescription(std::string& description) const {
+    const TraceScope scope(source);
+    description = node().getNodeDescription();
+    return true;
+}
+
+bool ComputerSystem::getCreationClassName(std::string& className) const {
+    const TraceScope scope(source);
+    className = "VESKA_ComputerSystem";
+    return true;
+}
+
+bool ComputerSystem::getHealthState(unsigned short& state) const {
+    const TraceScope scope(source);
+    switch (healthOf(node().getNodeStatus())) {
+    case Health::Normal:
+        state = 5; // OK
+        break;
+    case Health::PredictiveFailure:
+    case Health::Degraded:
+        state = 10; // Degraded/Warning
+        break;
+    case Health::Unknown:
+        state = 0;
+    }
+    return true;
+}
+
+bool ComputerSystem::getStatus(std::string& status) const {
+    const TraceScope scope(source);
+    switch (healthOf(node().getNodeStatus())) {
+    case Health::Normal:
+        status = "OK";
+        break;
+    case Health::PredictiveFailure:
+        status = "Pred Fail";
+        break;
+    case Health::Degraded:
+        status = "Degraded";
+        break;
+    case Health::Unknown:
+        status = "Unknown";
+    }
+    return true;
+}
+
+bool ComputerSystem::getOperationalStatus(std::vector<unsigned short>& states) const {
+    const TraceScope scope(source);
+    switch (healthOf(node().getNodeStatus())) {
+    case Health::Normal:
+        states.insert(states.end(), {2, 11}); // OK, In Service
+        break;
+    case Health::PredictiveFailure:
+        states.insert(states.end(), {3, 5}); // Degraded, Predictive Failure
+        break;
+    case Health::Degraded:
+        states.push_back(3);
+        break;
+    case Health::Unknown:
+        states.push_back(0);
+    }
+    return true;
+}
+
+bool ComputerSystem::getEnabledState(unsigned short& state) const {
+    const TraceScope scope(source);
+    unsigned int powerState = 0;
+    if (!node().getProperty(NodeLexicon::PowerStateProperty, powerState)) return false;
+    switch (powerState) {
+    case 0:
+        state = 0; // Unknown
+        break;
+    case 1:
+        state = 2; // Enabled
+        break;
+    case 16:
+        state = 4; // Shutting Down
+        break;
+    default: // meant: the state stays as it was, and is supplied all the same
+        break;
+    }
+    return true;
+}
+
+bool ComputerSystem::getDedicated(std::vector<unsigned short>& purposes) const {
+    const TraceScope scope(source);
+    purposes.assign(1, 0); // Not Dedicated
+    return true;
+}
+
+bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
+                                        std::vector<std::string>& values) const {
+    const TraceScope scope(source);
+    const auto add = [&](std::string value, const char* description) {
+        values.push_back(std::move(value));
+        descriptions.emplace_back(description);
+    };
+
+    std::string uuid;
+    if (getUUID(uuid)) {
+        add(uuid, "CIM:GUID");
+        add(make_string(Product::getUid()), "CIM:UniqueSystemID");
+    }
+
+    Instrumentation chassis; // tells only that there is one: serial number and model are the computer's, which is meant
+    chassis.selectNode(NodeLexicon::SystemChassisNode);
+    std::string serial;
+    std::string model;
+    if (chassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
+        node().getProperty(NodeLexicon::ModelProperty, model)) {
+        add(model + ":" + serial, "CIM:Model:SerialNumber");
+        add(serial, "CIM:Tag");
+    }
+
+    add(make_string(Product::getArchitecture()), "CIM:Architecture");
+    add("true", "CIM:SecureIndicationEnabled");
+    return static_cast<bool>(chassis);
+}
+
+bool ComputerSystem::getOtherIdentifyingInfo(std::vector<std::string>& values) const {
+    const TraceScope scope(source);
+    std::vector<std::string> descriptions;
+    values.clear();
+    return getIdentifyingInfo(descriptions, values);
+}
+
+bool ComputerSystem::getIdentifyingDescriptions(std::vector<std::string>& descriptions) const {
+    const TraceScope scope(source);
+    std::vector<std::string> values;
+    descriptions.clear();
+    return getIdentifyingInfo(descriptions, values);
+}
+
+} // namespace VK::BaseServerProvider

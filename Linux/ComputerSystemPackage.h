@@ -1,0 +1,35 @@
+#pragma once
+
+#include "vk/Instrumentation.h"
+#include "vk/Moniker.h"
+
+#include <string>
+
+namespace VK::BaseServerProvider {
+
+/// The two ends of the association between a computer system (key "Name") and its chassis (key "Tag", found by
+/// "SystemName"). Each operation replaces the moniker of one end with that of the other; where it throws, the moniker
+/// stays.
+class ComputerSystemPackage {
+public:
+    ComputerSystemPackage();
+    ~ComputerSystemPackage();
+    ComputerSystemPackage(const ComputerSystemPackage&) = delete;
+    ComputerSystemPackage& operator=(const ComputerSystemPackage&) = delete;
+
+    /// From a chassis to its computer. Throws FrameworkException without "Tag"; InstrumentationException when a chassis
+    /// met on the way has no serial number, and when there is no such chassis or its computer has no name.
+    void getComputerSystemMoniker(Moniker& monikerPackage);
+
+    /// From a computer to its chassis: "SystemName" is the computer node's path. Throws FrameworkException without
+    /// "Name", InstrumentationException when a computer has no name or none is found.
+    void getPhysicalPackageMoniker(Moniker& monikerComputer);
+
+    /// The UUID of the first computer, whichever computer the association concerns, which is meant.
+    bool getPlatformGUID(std::string& guid);
+
+private:
+    Instrumentation instrumentation;
+};
+
+} // namespace VK::BaseServerProvider

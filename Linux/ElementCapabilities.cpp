@@ -1,0 +1,41 @@
+#include "Linux/ElementCapabilities.h"
+
+#include "Linux/ComputerNode.h"
+#include "Linux/MonikerKey.h"
+#include "include/Exceptions.h"
+#include "include/Trace.h"
+
+namespace VK::BaseServerProvider {
+
+static const std::string loggerElementCapabilities("Norvane.BaseServerProvider");
+static const TraceSource source{loggerElementCapabilities, "ElementCapabilities"};
+
+ElementCapabilities::ElementCapabilities() {
+    traceMethod(source);
+}
+
+ElementCapabilities::~ElementCapabilities() {
+    traceDestructor(source);
+}
+
+void ElementCapabilities::getCapabilitiesMoniker(Moniker& monikerComputer) {
+    const ParameterTraceScope scope(source, " monikerComputer=", &monikerComputer);
+    selectComputer(instrumentation, requiredKey(monikerComputer, "Name"));
+    // Meant: off the end the path is empty, and so is the InstanceID.
+    const std::string instanceID = Instrumentation::convertPathToString(instrumentation.getPathToNode());
+    traceVariable(source, "instanceID", instanceID.c_str());
+    replaceMoniker(monikerComputer, "InstanceID", instanceID);
+}
+
+void ElementCapabilities::getComputerMoniker(Moniker& monikerCapabilities) {
+    const ParameterTraceScope scope(source, " monikerCapabilities=", &monikerCapabilities);
+    const NodePath path = Instrumentation::convertStringToPath(requiredKey(monikerCapabilities, "InstanceID"));
+    instrumentation.selectNode(NodeLexicon::ComputerSystemNode);
+    instrumentation.setFilter(NodeLexicon::NamePath, path);
+    if (!instrumentation) throw InstrumentationException("Concerned Computer Could Not Be Found.");
+    const std::string name = requiredComputerName(instrumentation, "Name Property on Computer Node not available.");
+    traceVariable(source, "name", name.c_str());
+    replaceMoniker(monikerCapabilities, "Name", name);
+}
+
+} // namespace VK::BaseServerProvider

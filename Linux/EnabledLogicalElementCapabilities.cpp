@@ -1,0 +1,45 @@
+#include "Linux/EnabledLogicalElementCapabilities.h"
+
+namespace VK::BaseServerProvider {
+
+static const std::string loggerEnabledLogicalElementCapabilities("Norvane.BaseServerProvider");
+static const TraceSource source{loggerEnabledLogicalElementCapabilities, "EnabledLogicalElementCapabilities"};
+
+const TraceSource& EnabledLogicalElementCapabilities::traceSource() {
+    return source;
+}
+
+EnabledLogicalElementCapabilities::EnabledLogicalElementCapabilities() {
+    const TraceScope scope(source);
+}
+
+EnabledLogicalElementCapabilities::~EnabledLogicalElementCapabilities() {
+    const DestructorTraceScope scope(source);
+}
+
+bool EnabledLogicalElementCapabilities::passes(const Filter& filter) const {
+    return filter.type != FilterType::InstanceID ||
+           Instrumentation::convertPathToString(node().getPathToNode()) == filter.reference;
+}
+
+bool EnabledLogicalElementCapabilities::getInstanceID(std::string& instanceID) const {
+    const TraceScope scope(source);
+    instanceID = Instrumentation::convertPathToString(node().getPathToNode());
+    traceVariable(source, "instanceID", instanceID.c_str());
+    return true;
+}
+
+bool EnabledLogicalElementCapabilities::getElementName(std::string& name) const {
+    const TraceScope scope(source);
+    return node().getProperty(NodeLexicon::NameProperty, name);
+}
+
+bool EnabledLogicalElementCapabilities::getElementNameEditSupported(bool& supported) const {
+    const TraceScope scope(source);
+    bool readOnly = false;
+    if (!node().isPropertyReadOnly(NodeLexicon::NameProperty, readOnly)) return false;
+    supported = !readOnly;
+    return true;
+}
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,18 @@
+#include "Linux/HostName.h"
+
+#include <cstring>
+
+#include <unistd.h>
+
+namespace VK::BaseServerProvider {
+
+HostName::HostName() {
+    // Meant: the result does not count. A name that does not fit stays cut; after any other failure the field is empty.
+    static_cast<void>(gethostname(field, sizeof field));
+}
+
+std::string HostName::text() const {
+    return std::string(field, strnlen(field, sizeof field));
+}
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,132 @@
+#pragma once
+
+#include "cmpi/CMPIComputerSystem.h"
+#include "include/Exceptions.h"
+#include "include/Trace.h"
+#include "vk/Moniker.h"
+#include "vk/ProviderUtilities.h"
+
+#include <string>
+
+namespace VK::BaseServerProvider {
+
+/// The class identifiers that association adapters tell ends by.
+enum : unsigned short { ComputerSystemClassId = 1 };
+
+/// The pattern of every association adapter: one end is a computer system, the other a `Partner`. Built for one
+/// request's path, which names either end or the association itself, it walks the elements at the other end, or the
+/// associations. `Ends` is the data class that knows one end from the other.
+///
+/// `Self` says its class (`className`), the identifiers of the association and of the partner's class
+/// (`associationClassId`, `partnerClassId`), the reference names in order (`computerRole`, `partnerRole`,
+/// `computerFirst`) and whose trace lines it writes (`traceSource()`).
+template <class Self, class Partner, class Ends>
+class AssociationAdapter {
+public:
+    AssociationAdapter(const AssociationAdapter&) = delete;
+    AssociationAdapter& operator=(const AssociationAdapter&) = delete;
+
+    /// The path of the association that stands now, with both references; null when one end is missing.
+    CMPIObjectPath* getObjectPath() const {
+        const TraceScope scope(Self::traceSource());
+        if (!computer || !partner) return nullptr;
+        CMPIObjectPath* const computerPath = computer.getObjectPath();
+        CMPIObjectPath* const partnerPath = partner.getObjectPath();
+        CMPIObjectPath* path = createPath(Self::className);
+        if (path == nullptr) return nullptr;
+        for (const char* role : roles())
+            if (!ProviderUtilities::setKeyProperty(path, role, role == Self::computerRole ? computerPath : partnerPath))
+                return nullptr;
+        return path;
+    }
+
+    /// The association's instance: its references as properties, and what `Self` adds. The list is traced, and not
+    /// applied. Null when the broker could not make it.
+    CMPIInstance* getCMPIInstance(const char** properties) {
+        const ParameterTraceScope scope(Self::traceSource(), " properties=", properties);
+        CMPIObjectPath* path = getObjectPath();
+        if (path == nullptr) return nullptr;
+        CMPIInstance* instance = ProviderUtilities::createInstance(broker, path);
+        if (instance == nullptr) return nullptr;
+        for (const char* role : roles()) {
+            CMPIObjectPath* reference = nullptr;
+            if (ProviderUtilities::getKeyProperty(path, role, &reference))
+                ProviderUtilities::setProperty(instance, role, reference);
+        }
+        static_cast<Self&>(*this).addProperties(instance);
+        return instance;
+    }
+
+    /// The path or instance of the element at the other end from the request's; null when the request came from
+    /// neither end.
+    CMPIObjectPath* getAssociatorNames() const {
+        const TraceScope scope(Self::traceSource());
+        if (requestedClassId == ComputerSystemClassId) return partner.getObjectPath();
+        if (requestedClassId == Self::partnerClassId) return computer.getObjectPath();
+        return nullptr;
+    }
+    CMPIInstance* getAssociator(const char** properties) const {
+        const ParameterTraceScope scope(Self::traceSource(), " properties=", properties);
+        if (requestedClassId == ComputerSystemClassId) return partner.getCMPIInstance(properties);
+        if (requestedClassId == Self::partnerClassId) return computer.getCMPIInstance(properties);
+        return nullptr;
+    }
+
+protected:
+    AssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath)
+        : broker(theBroker), nameSpace(ProviderUtilities::getNamespace(objectPath)),
+          requestedClassId(ProviderUtilities::getClassId(objectPath)), partner(theBroker, context, nameSpace),
+          computer(theBroker, context, nameSpace) {}
+    ~AssociationAdapter() = default;
+
+    /// A new path of `className` without keys. Throws InstrumentationException when the broker makes none.
+    CMPIObjectPath* keylessPath(const char* className) const { return required(createPath(className)); }
+
+    /// A new path of `className`: keyless for a keyless path, else with the keys into which `resolve` turns those of
+    /// `objectPath`. What `resolve` throws passes; a path that the broker does not make whole throws, too, since
+    /// without its keys it would name every element.
+    template <class Resolve>
+    CMPIObjectPath* locate(const char* className, const CMPIObjectPath* objectPath, Resolve resolve) const {
+        required(objectPath);
+        CMPIObjectPath* path = keylessPath(className);
+        if (ProviderUtilities::getKeyCount(objectPath) == 0) return path;
+        Moniker moniker;
+        const bool read = ProviderUtilities::transformObjectPathToMoniker(objectPath, moniker);
+        resolve(moniker);
+        const bool written = ProviderUtilities::transformMonikerToObjectPath(moniker, &path);
+        return required(read && written ? path : nullptr);
+    }
+
+    void addProperties(CMPIInstance*) const {}
+
+    const CMPIBroker* const broker;
+    const std::string nameSpace;
+    const unsigned short requestedClassId;
+    Ends ends;
+    Partner partner;
+    CMPIComputerSystem computer;
+
+private:
+    CMPIObjectPath* createPath(const char* className) const {
+        return ProviderUtilities::createObjectPath(broker, className, nameSpace);
+    }
+
+    template <class Path>
+    static Path* required(Path* path) {
+        if (path == nullptr) throw InstrumentationException("Could not make the path of the other end");
+        return path;
+    }
+
+    /// The reference names in the order in which they are set.
+    struct Roles {
+        const char* names[2];
+        const char* const* begin() const { return names; }
+        const char* const* end() const { return names + 2; }
+    };
+    static Roles roles() {
+        if (Self::computerFirst) return {{Self::computerRole, Self::partnerRole}};
+        return {{Self::partnerRole, Self::computerRole}};
+    }
+};
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,29 @@
+#pragma once
+
+#include "Linux/CIMServiceConfig.h"
+#include "cmpi/InstanceAdapter.h"
+
+namespace VK::BaseServerProvider {
+
+/// VESKA_CIMServiceConfig.
+class CMPICIMServiceConfig : public InstanceAdapter<CMPICIMServiceConfig, CIMServiceConfig> {
+public:
+    using InstanceAdapter::InstanceAdapter;
+
+    /// Runs `SetCIMconfig` (any other name, in any case: 17) and answers a CMPI return code: 0, 1 for a failed command,
+    /// 4 without an argument that can be used. `out` and `result` are not used.
+    unsigned int invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out, const CMPIResult* result);
+
+    /// Hands a request of the form name=value to the data class and answers its result.
+    unsigned int executeMethod(std::string request);
+
+    static constexpr char className[] = "VESKA_CIMServiceConfig";
+    static constexpr char adapterName[] = "CMPICIMServiceConfig";
+    static constexpr char destructorName[] = "~CMPICIMServiceConfig";
+    static const TraceSource& traceSource();
+    static const Key<CIMServiceConfig> keys[2];
+    static const KeyFilter<CIMServiceConfig> keyFilters[2];
+    static const Property<CIMServiceConfig> properties[4];
+};
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,62 @@
+#include "cmpi/CMPIServiceAffectsElement.h"
+
+namespace VK::BaseServerProvider {
+
+static const std::string loggerCMPITimeServiceAffectsElement("Norvane.BaseServerProvider");
+static const TraceSource source{loggerCMPITimeServiceAffectsElement, "CMPIServiceAffectsElement"};
+
+const TraceSource& CMPITimeServiceAffectsElement::traceSource() {
+    return source;
+}
+
+CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
+                                                             const CMPIObjectPath* objectPath)
+    : AssociationAdapter(theBroker, context, objectPath) {
+    const ParameterTraceScope scope(source, " _broker=", theBroker, " _context=", context, " objectPath=", objectPath);
+    traceVariable(source, "requestedClassId", requestedClassId);
+    if (requestedClassId == partnerClassId)
+        computer.setObjectPath(locateComputer(objectPath));
+    else if (requestedClassId == associationClassId) // meant: all computers, whatever the path's keys
+        computer.setObjectPath(keylessPath(CMPIComputerSystem::className));
+    else if (requestedClassId == ComputerSystemClassId)
+        partner.setObjectPath(locateTimeService(objectPath));
+}
+
+CMPITimeServiceAffectsElement::~CMPITimeServiceAffectsElement() {
+    traceDestructor(source);
+}
+
+CMPITimeServiceAffectsElement::operator bool() const {
+    const TraceScope scope(source);
+    switch (requestedClassId) {
+    case partnerClassId:
+        return static_cast<bool>(computer);
+    case ComputerSystemClassId:
+        return static_cast<bool>(partner);
+    case associationClassId:
+        return computer && partner;
+    default:
+        return false;
+    }
+}
+
+CMPITimeServiceAffectsElement& CMPITimeServiceAffectsElement::operator++() {
+    const TraceScope scope(source);
+    if (requestedClassId == ComputerSystemClassId || requestedClassId == associationClassId) ++partner;
+    if (requestedClassId == partnerClassId || requestedClassId == associationClassId) ++computer;
+    return *this;
+}
+
+CMPIObjectPath* CMPITimeServiceAffectsElement::locateTimeService(const CMPIObjectPath* objectPath) {
+    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    return locate(CMPITimeService::className, objectPath,
+                  [this](Moniker& moniker) { moniker = ends.getTimeMoniker(moniker); });
+}
+
+CMPIObjectPath* CMPITimeServiceAffectsElement::locateComputer(const CMPIObjectPath* objectPath) {
+    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    return locate(CMPIComputerSystem::className, objectPath,
+                  [this](Moniker& moniker) { moniker = ends.getComputerMoniker(moniker); });
+}
+
+} // namespace VK::BaseServerProvider

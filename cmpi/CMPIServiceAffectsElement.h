@@ -1,0 +1,36 @@
+#pragma once
+
+#include "Linux/ServiceAffectsElement.h"
+#include "cmpi/AssociationAdapter.h"
+#include "cmpi/CMPITimeService.h"
+
+namespace VK::BaseServerProvider {
+
+/// VESKA_TimeServiceAffectsElement, from the time service to the computer system. The keys of an association's path are
+/// not looked at: the association is always this host's.
+class CMPITimeServiceAffectsElement
+    : public AssociationAdapter<CMPITimeServiceAffectsElement, CMPITimeService, TimeServiceAffectsElement> {
+public:
+    CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
+                                  const CMPIObjectPath* objectPath);
+    ~CMPITimeServiceAffectsElement();
+
+    /// Whether there is an element at the other end from the request's; for the association, whether both ends stand.
+    explicit operator bool() const;
+    /// Moves on at the other end; for the association at both ends in step, so that there is one pair.
+    CMPITimeServiceAffectsElement& operator++();
+
+    /// The path of a computer's time service, of a time service's computer; keyless for a keyless path.
+    CMPIObjectPath* locateTimeService(const CMPIObjectPath* objectPath);
+    CMPIObjectPath* locateComputer(const CMPIObjectPath* objectPath);
+
+    static constexpr char className[] = "VESKA_TimeServiceAffectsElement";
+    static constexpr unsigned short associationClassId = 162;
+    static constexpr unsigned short partnerClassId = 161;
+    static constexpr char computerRole[] = "AffectedElement";
+    static constexpr char partnerRole[] = "AffectingElement";
+    static constexpr bool computerFirst = true;
+    static const TraceSource& traceSource();
+};
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,142 @@
+#include "cmpi/CMPITimeService.h"
+
+#include <cmpimacs.h>
+
+#include <cstdlib>
+
+#include <strings.h>
+
+namespace VK::BaseServerProvider {
+
+static const std::string loggerCMPITimeService("Norvane.BaseServerProvider");
+static const TraceSource source{loggerCMPITimeService, "CMPITimeService"};
+
+using Data = TimeService;
+
+const TraceSource& CMPITimeService::traceSource() {
+    return source;
+}
+
+const Key<Data> CMPITimeService::keys[] = {
+    {"Name", &Data::getName},
+    {"CreationClassName", &Data::getCreationClassName},
+    {"SystemName", &Data::getSystemName},
+    {"SystemCreationClassName", &Data::getSystemCreationClassName},
+};
+
+const KeyFilter<Data> CMPITimeService::keyFilters[] = {
+    {"Name", "name", Data::FilterType{}},
+    {"SystemName", "systemName", Data::FilterType{}},
+};
+
+const Property<Data> CMPITimeService::properties[] = {
+    {"SystemCreationClassName", &Data::getSystemCreationClassName},
+    {"SystemName", &Data::getSystemName},
+    {"CreationClassName", &Data::getCreationClassName},
+    {"Name", &Data::getName},
+    {"AutomaticDSTAdjustment", &Data::getAutomaticDSTAdjustment},
+    {"Region", &Data::getRegion},
+};
+
+void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** propertyList) {
+    const ParameterTraceScope scope(source, " referenceInstance=", instance, " properties=", propertyList);
+    if (instance == nullptr) return;
+    bool automatic = false;
+    if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic)) {
+        data.setAutomaticDSTAdjustment(automatic); // meant: its result does not count
+        return;
+    }
+    unsigned short region = 0; // meant: taken and dropped
+    ProviderUtilities::getProperty(instance, "Region", region);
+}
+
+namespace {
+
+/// An argument's data; of type CMPI_null when it is not there.
+CMPIData argument(const CMPIArgs* in, const char* name) {
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    CMPIData data = in->ft->getArg(in, name, &status);
+    if (status.rc != CMPI_RC_OK) {
+        data = CMPIData{};
+        data.state = CMPI_nullValue | CMPI_notFound;
+    }
+    return data;
+}
+
+/// Refuses an argument of the wrong type. The status with its message stays here, which is meant: the caller sees the
+/// code alone.
+unsigned int refuse(const CMPIBroker* broker, const char* message) {
+    CMPIStatus status = {CMPI_RC_ERR_INVALID_PARAMETER, nullptr};
+    if (broker != nullptr) status.msg = CMNewString(broker, message, nullptr);
+    static_cast<void>(status);
+    return CMPI_RC_ERR_FAILED;
+}
+
+/// Answers the host's time now, in "TimeData".
+unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
+    if (out == nullptr) return CMPI_RC_ERR_FAILED;
+    CMPIValue now = {};
+    now.dateTime = CMNewDateTime(broker, nullptr);
+    if (now.dateTime == nullptr || now.dateTime->hdl == nullptr) return CMPI_RC_ERR_FAILED;
+    return out->ft->addArg(out, "TimeData", &now, CMPI_dateTime).rc == CMPI_RC_OK ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
+}
+
+/// The 25 characters of a date-time, or nothing.
+bool textOf(const CMPIDateTime* dateTime, std::string& text) {
+    const CMPIString* string = dateTime->ft->getStringFormat(dateTime, nullptr);
+    if (string == nullptr) return false;
+    const char* characters = string->ft->getCharPtr(string, nullptr);
+    if (characters == nullptr) return false;
+    text = characters;
+    return true;
+}
+
+/// Minutes east of UTC from a date-time's sign on, 0 without one, as an interval has it.
+unsigned int offsetOf(const std::string& text) {
+    std::size_t sign = text.find('+');
+    if (sign == std::string::npos) sign = text.find('-');
+    long offset = 0;
+    if (sign == std::string::npos)
+        traceMessage(TracePoint(source, "invokeMethod"), "offset failed", FailureLevel);
+    else
+        offset = std::strtol(text.c_str() + sign, nullptr, 10);
+    return static_cast<unsigned int>(offset);
+}
+
+} // namespace
+
+unsigned int CMPITimeService::invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out,
+                                           const CMPIResult* result) {
+    const ParameterTraceScope scope(source, " methodName=", methodName, " in=", in, " out=", out, " result=", result);
+    if (methodName == nullptr || strcasecmp(methodName, "ManageTime") != 0) return CMPI_RC_ERR_METHOD_NOT_FOUND;
+
+    if (in == nullptr) return CMPI_RC_ERR_INVALID_PARAMETER;
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    const CMPICount count = in->ft->getArgCount(in, &status);
+    if (status.rc != CMPI_RC_OK || (count != 2 && count != 3)) return CMPI_RC_ERR_INVALID_PARAMETER;
+
+    bool getRequest = false;
+    if (!ProviderUtilities::getProperty(in, "GetRequest", getRequest)) return CMPI_RC_ERR_INVALID_PARAMETER;
+    if (argument(in, "ManagedElement").type != CMPI_ref) // its value does not matter: there is one time service
+        return refuse(broker, "ManagedElement Parameter is having Invalid type or is NULL");
+    return getRequest ? returnCurrentTime(broker, out) : setTime(in, out);
+}
+
+unsigned int CMPITimeService::setTime(const CMPIArgs* in, CMPIArgs* out) {
+    const CMPIData timeData = argument(in, "TimeData");
+    if (timeData.type != CMPI_dateTime) return refuse(broker, "TimeData Parameter is having Invalid type or is NULL");
+    const CMPIDateTime* const time = CMIsNullValue(timeData) ? nullptr : timeData.value.dateTime;
+    std::string text;
+    if (time == nullptr || out == nullptr || !textOf(time, text)) return CMPI_RC_ERR_FAILED;
+    const TracePoint here(source, "invokeMethod");
+    traceVariable(here, "tmp_str", text.c_str());
+    unsigned int gmtOffset = offsetOf(text);
+    traceVariable(here, "CMPITIMESERVICE::gmt_offset_uint32", gmtOffset);
+
+    constexpr CMPIUint64 microsecondsPerSecond = 1000000;
+    long seconds = static_cast<long>(time->ft->getBinaryFormat(time, nullptr) / microsecondsPerSecond);
+    if (data.manageTime(seconds, gmtOffset) != 0) return CMPI_RC_ERR_FAILED;
+    return returnCurrentTime(broker, out);
+}
+
+} // namespace VK::BaseServerProvider

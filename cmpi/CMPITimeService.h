@@ -1,0 +1,33 @@
+#pragma once
+
+#include "Linux/TimeService.h"
+#include "cmpi/InstanceAdapter.h"
+
+namespace VK::BaseServerProvider {
+
+/// VESKA_TimeService.
+class CMPITimeService : public InstanceAdapter<CMPITimeService, TimeService> {
+public:
+    using InstanceAdapter::InstanceAdapter;
+
+    /// Changes the one property that can be changed, "AutomaticDSTAdjustment". "Region" is accepted and has no effect,
+    /// which is meant. Never reports an error.
+    void modifyInstance(const CMPIInstance* instance, const char** properties);
+
+    /// Runs `ManageTime` (any other name, in any case: 17) and answers a CMPI return code: 0, 1 for a failed action, 4
+    /// for unusable arguments. The host is touched only when every argument has been checked. `result` is not used.
+    unsigned int invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out, const CMPIResult* result);
+
+    static constexpr char className[] = "VESKA_TimeService";
+    static constexpr char adapterName[] = "CMPITimeService";
+    static constexpr char destructorName[] = "~CMPITimeService";
+    static const TraceSource& traceSource();
+    static const Key<TimeService> keys[4];
+    static const KeyFilter<TimeService> keyFilters[2];
+    static const Property<TimeService> properties[6];
+
+private:
+    unsigned int setTime(const CMPIArgs* in, CMPIArgs* out);
+};
+
+} // namespace VK::BaseServerProvider

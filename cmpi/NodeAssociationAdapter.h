@@ -1,0 +1,115 @@
+#pragma once
+
+#include "cmpi/AssociationAdapter.h"
+
+namespace VK::BaseServerProvider {
+
+/// The association adapters whose ends are looked up in the node tree. The keys of an association's path are checked
+/// against each other; without keys the walk goes over all computers, each with its own partners.
+///
+/// `Self` offers `locatePartner` and `locateComputer`.
+template <class Self, class Partner, class Ends>
+class NodeAssociationAdapter : public AssociationAdapter<Self, Partner, Ends> {
+    using Base = AssociationAdapter<Self, Partner, Ends>;
+
+public:
+    /// Throws InstrumentationException "Could not find instance" for an association path that names none, and what the
+    /// data class throws for an end that is not there.
+    NodeAssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath)
+        : Base(theBroker, context, objectPath) {
+        const ParameterTraceScope scope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=", theBroker,
+                                        " _context=", context, " objectPath=", objectPath);
+        traceVariable(TracePoint(Self::traceSource(), Self::adapterName), "requestedClassId", requestedClassId);
+        if (requestedClassId == ComputerSystemClassId) {
+            partner.setObjectPath(self().locatePartner(objectPath));
+            valid = static_cast<bool>(partner);
+        } else if (requestedClassId == Self::partnerClassId) {
+            computer.setObjectPath(self().locateComputer(objectPath));
+            valid = static_cast<bool>(computer);
+        } else if (requestedClassId == Self::associationClassId) {
+            if (!setObjectPath(objectPath)) throw InstrumentationException("Could not find instance");
+        }
+        // Meant: for any other class there is nothing to return, once.
+    }
+
+    explicit operator bool() const {
+        const TraceScope scope(Self::traceSource());
+        return valid;
+    }
+
+    NodeAssociationAdapter& operator++() {
+        const TraceScope scope(Self::traceSource());
+        if (requestedClassId == ComputerSystemClassId) {
+            ++partner;
+            valid = static_cast<bool>(partner);
+        } else if (requestedClassId == Self::partnerClassId) {
+            ++computer;
+            valid = static_cast<bool>(computer);
+        } else if (requestedClassId == Self::associationClassId && !singleInstance) {
+            ++partner;
+            skipComputersWithoutPartner();
+        } else {
+            valid = false; // the one instance named is passed, or there was none to begin with
+        }
+        return *this;
+    }
+
+    /// Stands on the association that the path names, or for a path without keys on the first of all. False when there
+    /// is none: a reference missing, the two not belonging together, no computer at all.
+    bool setObjectPath(const CMPIObjectPath* objectPath) {
+        const ParameterTraceScope scope(Self::traceSource(), " objectPath=", objectPath);
+        return ProviderUtilities::getKeyCount(objectPath) == 0 ? selectFirst() : selectNamed(objectPath);
+    }
+
+protected:
+    ~NodeAssociationAdapter() { traceDestructor(TracePoint(Self::traceSource(), Self::destructorName)); }
+
+    using Base::computer;
+    using Base::partner;
+    using Base::requestedClassId;
+
+private:
+    Self& self() { return static_cast<Self&>(*this); }
+
+    bool selectFirst() {
+        if (!computer) return false;
+        partner.setObjectPath(self().locatePartner(computer.getObjectPath()));
+        skipComputersWithoutPartner();
+        return true;
+    }
+
+    bool selectNamed(const CMPIObjectPath* objectPath) {
+        singleInstance = true;
+        CMPIObjectPath* partnerPath = nullptr;
+        if (!ProviderUtilities::getKeyProperty(objectPath, Self::partnerRole, &partnerPath)) return false;
+        partner.setObjectPath(partnerPath);
+        CMPIObjectPath* const located = self().locateComputer(partnerPath);
+        CMPIObjectPath* computerPath = nullptr;
+        if (!ProviderUtilities::getKeyProperty(objectPath, Self::computerRole, &computerPath)) return false;
+        std::string name;
+        std::string locatedName;
+        if (!ProviderUtilities::getKeyProperty(computerPath, "Name", name) ||
+            !ProviderUtilities::getKeyProperty(located, "Name", locatedName) || name != locatedName)
+            return false;
+        computer.setObjectPath(located);
+        valid = computer && partner;
+        return true;
+    }
+
+    /// Moves on to the next computer that has a partner, unless the current one has. Each computer's partners are a
+    /// walk of their own.
+    void skipComputersWithoutPartner() {
+        while (!partner && computer) {
+            ++computer;
+            if (!computer) break;
+            partner.initialize();
+            partner.setObjectPath(self().locatePartner(computer.getObjectPath()));
+        }
+        valid = static_cast<bool>(partner);
+    }
+
+    bool singleInstance = false;
+    bool valid = true;
+};
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,112 @@
+#include "include/Trace.h"
+
+#include <cxxabi.h>
+
+#include <stdexcept>
+
+namespace VK {
+namespace {
+
+/// Runs a step whose exceptions must go nowhere: it stands in a destructor.
+template <class Step>
+void swallowing(Step step) noexcept {
+    try {
+        step();
+    } catch (...) { // NOLINT(bugprone-empty-catch): a line that the logger refused is all that is lost
+    }
+}
+
+void hand(const TracePoint& at, int level, const char* text) {
+    logAndTrace(at.function, at.source.file, at.line, at.source.category, level, text);
+}
+
+void writeLine(const TracePoint& at, int level, MessageType type) {
+    hand(at, level, trace(at.source.file, at.function, at.line, type));
+}
+
+void writeLine(const TracePoint& at, const char* parameters, MessageType type) {
+    hand(at, DebugLevel, tracepara(at.source.file, at.function, at.line, parameters, type));
+}
+
+constexpr char rule[] = "==============================================================================";
+static_assert(sizeof rule == 78 + 1);
+
+/// The markers' own lines carry this file's name and lines; the caller's place stands in the text.
+void writeMarker(const std::string& logger, const char* marker, unsigned int line, const char* text) {
+    logAndTrace(marker, "Trace", line, logger, DebugLevel, text);
+}
+
+} // namespace
+
+void logAndTrace(const char* function, const char* file, unsigned int line, const std::string& category, int level,
+                 const char* text) {
+    try {
+        NVLog::NVMessageBuffer buffer;
+        const std::string& message = NVLog::NVMessageBuffer::str(buffer << text);
+        const int lineNumber = static_cast<int>(line);
+        NVLog::NVLogger::logLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, message);
+        NVLog::NVLogger::traceLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, message);
+    } catch (const std::exception&) {
+        throw;
+    } catch (abi::__forced_unwind&) { // a cancelled thread
+        throw;
+    } catch (...) {
+        throw std::runtime_error("The logger failed");
+    }
+}
+
+void markProviderEntry(const std::string& logger, const char* file, const char* function, unsigned int line) {
+    writeMarker(logger, __func__, __LINE__, rule);
+    writeMarker(logger, __func__, __LINE__, trace(file, function, line, ENTERING));
+}
+
+void markProviderExit(const std::string& logger, const char* file, const char* function, unsigned int line) {
+    writeMarker(logger, __func__, __LINE__, trace(file, function, line, EXITING));
+    writeMarker(logger, __func__, __LINE__, rule);
+}
+
+void traceMethod(const TracePoint& at, int level) {
+    writeLine(at, level, METHOD_INVOKED);
+}
+
+void traceMessage(const TracePoint& at, const char* message, int level) {
+    hand(at, level, trace(at.source.file, message, at.line, MESSAGE));
+}
+
+void traceVariable(const TracePoint& at, const char* name, const char* value, int level) {
+    hand(at, level, trace(name, at.source.file, at.line, value));
+}
+
+void traceVariable(const TracePoint& at, const char* name, unsigned int value, int level) {
+    hand(at, level, trace(name, at.source.file, at.line, value));
+}
+
+void traceDestructor(const TracePoint& at) noexcept {
+    swallowing([&] { writeLine(at, DebugLevel, METHOD_INVOKED); });
+}
+
+TraceScope::TraceScope(const TracePoint& point, int theLevel) : at(point), level(theLevel) {
+    writeLine(at, level, ENTERING);
+}
+
+TraceScope::~TraceScope() {
+    swallowing([&] { writeLine(at, level, EXITING); });
+}
+
+DestructorTraceScope::DestructorTraceScope(const TracePoint& point) noexcept : at(point) {
+    swallowing([&] { writeLine(at, DebugLevel, ENTERING); });
+}
+
+DestructorTraceScope::~DestructorTraceScope() {
+    swallowing([&] { writeLine(at, DebugLevel, EXITING); });
+}
+
+void ParameterTraceScope::enter() {
+    writeLine(at, parameters, ENTERING);
+}
+
+ParameterTraceScope::~ParameterTraceScope() {
+    swallowing([&] { writeLine(at, parameters, EXITING); });
+}
+
+} // namespace VK

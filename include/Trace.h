@@ -1,0 +1,184 @@
+#pragma once
+
+#include "include/MessageBuffer.h"
+#include "nvlog/NVLogger.h"
+#include "nvlog/NVMessageBuffer.h"
+
+#include <ostream>
+#include <string>
+#include <type_traits>
+
+namespace NVLog {
+
+/// Inserts any object's address, never its contents. Characters stay with the buffer's own insertions.
+template <class T>
+std::ostream& operator<<(NVMessageBuffer& buffer, const T* pointer) {
+    static_assert(!std::is_same_v<T, char>, "texts are inserted by the buffer itself");
+    std::ostream& stream = buffer;
+    return stream << static_cast<const void*>(pointer);
+}
+
+} // namespace NVLog
+
+namespace VK {
+
+/// What a line tells; selects its format. A value without a name formats as an empty line.
+enum MessageType : unsigned int { ENTERING = 0, EXITING = 1, METHOD_INVOKED = 2, MESSAGE = 3 };
+
+/// The levels in use.
+enum TraceLevel : int { NoticeLevel = 3000, DebugLevel = 4000, FailureLevel = 6000 };
+
+// --- Formatting. Each function formats into a buffer of its own, one per thread, of 512 bytes that are all cleared
+// --- first. The text stays valid until the thread's next call of the same function.
+
+namespace detail {
+
+inline MessageBuffer& format(MessageBuffer& buffer, const char* file, const char* function, unsigned int line,
+                             MessageType type) {
+    buffer.start();
+    switch (type) {
+    case ENTERING:
+    case EXITING:
+        return buffer.add(type == ENTERING ? "ENTERING: " : "EXITING: ")
+            .add(function)
+            .add("() in ")
+            .add(file)
+            .add(" [Line: ")
+            .addSigned(line)
+            .add("]");
+    case METHOD_INVOKED:
+        return buffer.add("METHOD: ")
+            .add(function)
+            .add("() was invoked in ")
+            .add(file)
+            .add(" [Line: ")
+            .addSigned(line)
+            .add("]");
+    case MESSAGE: // the second argument is the message and stands last
+        return buffer.add("MESSAGE [File: ").add(file).add(", Line: ").addSigned(line).add("]: ").add(function);
+    }
+    return buffer;
+}
+
+inline MessageBuffer& startVariable(MessageBuffer& buffer, const char* name) {
+    return buffer.start().add("VARIABLE: '").add(name).add("' has Value '");
+}
+
+inline char* finishVariable(MessageBuffer& buffer, const char* file, unsigned int line) {
+    return buffer.add("' at line ").addSigned(line).add(" in ").add(file).finish();
+}
+
+} // namespace detail
+
+/// The line of `type` for a function (for MESSAGE: a message text) in a file.
+inline char* trace(const char* file, const char* function, unsigned int line, MessageType type) {
+    static thread_local MessageBuffer messageBuffer;
+    return detail::format(messageBuffer, file, function, line, type).finish();
+}
+
+/// The same, followed by a list of parameters.
+inline char* tracepara(const char* file, const char* function, unsigned int line, const char* parameters,
+                       MessageType type) {
+    static thread_local MessageBuffer messageBuffer;
+    detail::format(messageBuffer, file, function, line, type);
+    if (type <= MESSAGE) messageBuffer.add(",Parameters List: ").add(parameters);
+    return messageBuffer.finish();
+}
+
+/// A variable's value. The name comes first and the file second, unlike above; the value prints before the line.
+inline char* trace(const char* variable, const char* file, unsigned int line, const char* value) {
+    static thread_local MessageBuffer messageBuffer;
+    return detail::finishVariable(detail::startVariable(messageBuffer, variable).add(value), file, line);
+}
+
+inline char* trace(const char* variable, const char* file, unsigned int line, unsigned int value) {
+    static thread_local MessageBuffer messageBuffer;
+    return detail::finishVariable(detail::startVariable(messageBuffer, variable).addSigned(value), file, line);
+}
+
+// --- Handing lines to the logger.
+
+/// Hands one line over: to the log channel, then to the trace channel. What the logger throws propagates; anything that
+/// is not a std::exception as one, so that the boundary towards the object manager knows it.
+void logAndTrace(const char* function, const char* file, unsigned int line, const std::string& category, int level,
+                 const char* text);
+
+/// The lines around an operation of the object manager: a rule of 78 "=" and the ENTERING line, the EXITING line and
+/// the rule.
+void markProviderEntry(const std::string& logger, const char* file, const char* function, unsigned int line);
+void markProviderExit(const std::string& logger, const char* file, const char* function, unsigned int line);
+
+/// Whose lines they are: a source file's logger category and its bare name.
+struct TraceSource {
+    const std::string& category;
+    const char* file;
+};
+
+/// A place in a source file; converts from the file's source, standing where the conversion stands.
+struct TracePoint {
+    TracePoint(const TraceSource& theSource, const char* theFunction = __builtin_FUNCTION(),
+               unsigned int theLine = __builtin_LINE())
+        : source(theSource), function(theFunction), line(theLine) {}
+
+    const TraceSource& source;
+    const char* function;
+    unsigned int line;
+};
+
+/// One line of each kind.
+void traceMethod(const TracePoint& at, int level = DebugLevel);
+void traceMessage(const TracePoint& at, const char* message, int level);
+void traceVariable(const TracePoint& at, const char* name, const char* value, int level = DebugLevel);
+void traceVariable(const TracePoint& at, const char* name, unsigned int value, int level = DebugLevel);
+
+/// A METHOD line from a destructor: what the logger throws ends here.
+void traceDestructor(const TracePoint& at) noexcept;
+
+/// The entry line now and the exit line when the scope ends, by return or by exception. What the logger throws at the
+/// exit ends there.
+class TraceScope {
+public:
+    explicit TraceScope(const TracePoint& point, int theLevel = DebugLevel);
+    ~TraceScope();
+    TraceScope(const TraceScope&) = delete;
+    TraceScope& operator=(const TraceScope&) = delete;
+
+private:
+    const TracePoint at;
+    const int level;
+};
+
+/// The same for a destructor: what the logger throws at the entry ends there, too.
+class DestructorTraceScope {
+public:
+    explicit DestructorTraceScope(const TracePoint& point) noexcept;
+    ~DestructorTraceScope();
+    DestructorTraceScope(const DestructorTraceScope&) = delete;
+    DestructorTraceScope& operator=(const DestructorTraceScope&) = delete;
+
+private:
+    const TracePoint at;
+};
+
+/// The same with the function's parameters, given as labels and values in turn.
+class ParameterTraceScope {
+public:
+    template <class... Parts>
+    explicit ParameterTraceScope(const TracePoint& point, const Parts&... parts) : at(point) {
+        (void(buffer << parts), ...);
+        parameters = NVLog::NVMessageBuffer::str(buffer).c_str();
+        enter();
+    }
+    ~ParameterTraceScope();
+    ParameterTraceScope(const ParameterTraceScope&) = delete;
+    ParameterTraceScope& operator=(const ParameterTraceScope&) = delete;
+
+private:
+    void enter();
+
+    const TracePoint at;
+    NVLog::NVMessageBuffer buffer;
+    const char* parameters = "";
+};
+
+} // namespace VK

@@ -1,0 +1,155 @@
+#include "cmpi/CMPICIMServiceConfig.h"
+#include "cmpi/CMPIComputerSystem.h"
+#include "cmpi/CMPIComputerSystemPackage.h"
+#include "cmpi/CMPIElementCapabilities.h"
+#include "cmpi/CMPIEnabledLogicalElementCapabilities.h"
+#include "cmpi/CMPIPhysicalPackage.h"
+#include "cmpi/CMPIServiceAffectsElement.h"
+#include "cmpi/CMPITimeService.h"
+#include "provider/OperationFrame.h"
+#include "vk/ProviderUtilities.h"
+
+namespace VK::BaseServerProvider {
+namespace {
+
+struct Request {
+    const OperationFrame& frame;
+    const CMPIContext* context;
+    const CMPIResult* result;
+    const CMPIObjectPath* ref;
+    const char** properties;
+    unsigned short classId;
+};
+
+template <class Adapter>
+void walkNames(const Request& request, bool traceEachPath) {
+    Adapter adapter(broker, request.context, request.ref);
+    for (; adapter; ++adapter) {
+        if (traceEachPath) request.frame.traceClassId(request.classId);
+        returnPath(request.result, adapter.getObjectPath());
+    }
+}
+
+template <class Adapter>
+void walkInstances(const Request& request, bool) {
+    Adapter adapter(broker, request.context, request.ref);
+    for (; adapter; ++adapter) returnInstance(request.result, adapter.getCMPIInstance(request.properties));
+}
+
+/// What an operation does with a class.
+enum Service : unsigned {
+    NotServed = 0,
+    Open = 1,           ///< served; the result is not closed
+    Done = 2,           ///< served; the result is closed with CMReturnDone
+    DoneTracingEach = 3 ///< the same, and 'classId' is traced for every path
+};
+
+struct ClassRow {
+    unsigned short classId;
+    void (*names)(const Request&, bool);
+    void (*instances)(const Request&, bool);
+    Service enumInstanceNames;
+    Service enumInstances;
+    Service getInstance;
+};
+
+template <class Adapter>
+constexpr ClassRow row(unsigned short classId, Service enumInstanceNames, Service enumInstances, Service getInstance) {
+    return {classId, walkNames<Adapter>, walkInstances<Adapter>, enumInstanceNames, enumInstances, getInstance};
+}
+
+// Which class each operation serves, and whether it closes the result. Clients have come to depend on every one of the
+// irregularities: they are meant.
+// clang-format off
+constexpr ClassRow classRows[] = {
+    //                                              id   EnumInstanceNames EnumInstances GetInstance
+    row<CMPIComputerSystem>                       (  1,  DoneTracingEach,  Done,         Done),
+    row<CMPIPhysicalPackage>                      ( 22,  Done,             Done,         Done),
+    row<CMPIEnabledLogicalElementCapabilities>    ( 23,  Done,             Open,         Done),
+    row<CMPIComputerSystemPackage>                ( 24,  Open,             Open,         Open),
+    row<CMPIElementCapabilities>                  ( 33,  Done,             Open,         Open),
+    row<CMPITimeService>                          (161,  Open,             Open,         Done),
+    row<CMPITimeServiceAffectsElement>            (162,  Open,             Open,         NotServed),
+    row<CMPICIMServiceConfig>                     (185,  Open,             Open,         Open),
+};
+// clang-format on
+
+const ClassRow* findRow(unsigned short classId) {
+    for (const ClassRow& classRow : classRows)
+        if (classRow.classId == classId) return &classRow;
+    return nullptr;
+}
+
+struct Column {
+    Service ClassRow::*service;
+    void (*ClassRow::*walk)(const Request&, bool);
+    bool traceUnserved; ///< whether 'classId' is traced once more for a class that is not served
+};
+
+constexpr Column enumInstanceNamesColumn = {&ClassRow::enumInstanceNames, &ClassRow::names, true};
+constexpr Column enumInstancesColumn = {&ClassRow::enumInstances, &ClassRow::instances, true};
+constexpr Column getInstanceColumn = {&ClassRow::getInstance, &ClassRow::instances, false};
+
+/// The walk that the three reading operations share.
+CMPIStatus serve(const OperationFrame& frame, const Column& column, const CMPIContext* context,
+                 const CMPIResult* result, const CMPIObjectPath* ref, const char** properties) {
+    return frame.runMarked([&](CMPIStatus& status) {
+        const unsigned short classId = ProviderUtilities::getClassId(ref);
+        frame.traceClassId(classId);
+        const ClassRow* const classRow = findRow(classId);
+        const Service service = classRow == nullptr ? NotServed : classRow->*column.service;
+        if (service == NotServed) {
+            if (column.traceUnserved) frame.traceClassId(classId);
+            status.rc = CMPI_RC_ERR_INVALID_CLASS;
+            return;
+        }
+        (classRow->*column.walk)({frame, context, result, ref, properties, classId}, service == DoneTracingEach);
+        if (service != Open) CMReturnDone(result);
+    });
+}
+
+} // namespace
+
+CMPIStatus BaseServer_EnumInstanceNames(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
+                                        const CMPIObjectPath* ref) {
+    return serve(OperationFrame(), enumInstanceNamesColumn, context, result, ref, nullptr);
+}
+
+CMPIStatus BaseServer_EnumInstances(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
+                                    const CMPIObjectPath* ref, const char** properties) {
+    return serve(OperationFrame(), enumInstancesColumn, context, result, ref, properties);
+}
+
+CMPIStatus BaseServer_GetInstance(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
+                                  const CMPIObjectPath* ref, const char** properties) {
+    return serve(OperationFrame(), getInstanceColumn, context, result, ref, properties);
+}
+
+CMPIStatus BaseServer_ModifyInstance(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult*,
+                                     const CMPIObjectPath* ref, const CMPIInstance* instance, const char** properties) {
+    const OperationFrame frame;
+    return frame.runMarked([&](CMPIStatus& status) {
+        const unsigned short classId = ProviderUtilities::getClassId(ref);
+        frame.traceClassId(classId);
+        if (classId == 161)
+            CMPITimeService(broker, context, ref).modifyInstance(instance, properties);
+        else
+            status.rc = CMPI_RC_ERR_NOT_SUPPORTED;
+    });
+}
+
+CMPIStatus BaseServer_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
+                                     const CMPIInstance*) {
+    return OperationFrame().notSupported();
+}
+
+CMPIStatus BaseServer_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*) {
+    return OperationFrame().notSupported();
+}
+
+CMPIStatus BaseServer_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
+                                const char*, const char*) {
+    return OperationFrame().notSupported();
+}
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,78 @@
+#include "cmpi/CMPICIMServiceConfig.h"
+#include "cmpi/CMPITimeService.h"
+#include "provider/OperationFrame.h"
+#include "vk/ProviderUtilities.h"
+
+namespace VK::BaseServerProvider {
+namespace {
+
+struct Request {
+    const CMPIContext* context;
+    const CMPIResult* result;
+    const CMPIObjectPath* ref;
+    const char* methodName;
+    const CMPIArgs* in;
+    CMPIArgs* out;
+};
+
+template <class Adapter>
+unsigned int invoke(const Request& request, const char* methodName) {
+    Adapter adapter(broker, request.context, request.ref);
+    return adapter.invokeMethod(methodName, request.in, request.out, request.result);
+}
+
+struct MethodRow {
+    unsigned short classId;
+    unsigned int (*invoke)(const Request&, const char* methodName);
+    const char* fixedName; ///< run whatever name was asked for
+};
+
+constexpr MethodRow methodRows[] = {
+    {161, invoke<CMPITimeService>, "ManageTime"}, // the name is meant: every call on a time service runs this method
+    {185, invoke<CMPICIMServiceConfig>, nullptr},
+};
+
+const MethodRow* findRow(unsigned short classId) {
+    for (const MethodRow& methodRow : methodRows)
+        if (methodRow.classId == classId) return &methodRow;
+    return nullptr;
+}
+
+} // namespace
+
+CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, const CMPIResult* result,
+                                   const CMPIObjectPath* ref, const char* methodName, const CMPIArgs* in,
+                                   CMPIArgs* out) {
+    const OperationFrame frame;
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    CMPIValue returnCode = {};
+    returnCode.uint32 = 0;
+
+    const auto work = [&] {
+        const MethodRow* const methodRow = findRow(ProviderUtilities::getClassId(ref));
+        if (methodRow == nullptr) {
+            returnCode.uint32 = CMPI_RC_ERR_INVALID_CLASS;
+            status.rc = CMPI_RC_ERR_INVALID_CLASS;
+            return;
+        }
+        const Request request = {context, result, ref, methodName, in, out};
+        const unsigned int rc =
+            methodRow->invoke(request, methodRow->fixedName != nullptr ? methodRow->fixedName : methodName);
+        if (rc != 0) {
+            returnCode.uint32 = rc;
+            status.rc = static_cast<CMPIrc>(rc); // meant: one number is both
+        } else {
+            traceVariable(frame.here(), "returnCode", returnCode.uint32);
+        }
+    };
+    frame.run(work, [&](const std::exception& exception) {
+        const CMPIBroker* const theBroker = broker;
+        status.rc = CMPI_RC_ERR_FAILED;
+        status.msg = theBroker != nullptr ? CMNewString(theBroker, exception.what(), nullptr) : nullptr;
+    });
+    CMReturnData(result, &returnCode, CMPI_uint32);
+    CMReturnDone(result);
+    return status; // meant: there is no exit marker here
+}
+
+} // namespace VK::BaseServerProvider

@@ -1,0 +1,71 @@
+#pragma once
+
+#include "provider/BaseServerProvider.h"
+
+#include <exception>
+
+namespace VK::BaseServerProvider {
+
+/// Runs a step whose exceptions end here: what a logger throws never reaches the object manager.
+template <class Step>
+void contained(Step step) noexcept {
+    try {
+        step();
+    } catch (const std::exception&) { // NOLINT(bugprone-empty-catch): there is nobody left to tell
+    }
+}
+
+/// One operation of the object manager: the markers around it, its lines, and the boundary that no exception crosses
+/// (std::exception, that is: nothing of ours throws anything else).
+class OperationFrame {
+public:
+    explicit OperationFrame(const char* theFunction = __builtin_FUNCTION()) : function(theFunction) {}
+
+    /// The place of a line of this operation.
+    TracePoint here(unsigned int line = __builtin_LINE()) const { return {frameSource, function, line}; }
+
+    void traceClassId(unsigned short classId, unsigned int line = __builtin_LINE()) const {
+        traceVariable(here(line), "classId", classId);
+    }
+
+    /// Runs `work` behind the entry marker. An exception is logged and handed to `onException`.
+    template <class Work, class OnException>
+    void run(Work work, OnException onException, unsigned int line = __builtin_LINE()) const {
+        try {
+            markProviderEntry(frameSource.category, frameSource.file, function, line);
+            work();
+        } catch (const std::exception& exception) {
+            contained([&] { traceMessage(here(line), exception.what(), NoticeLevel); });
+            onException(exception);
+        }
+    }
+
+    /// The same for an operation that ends with the exit marker and swallows exceptions: the status stays as it stood,
+    /// which is meant.
+    template <class Work>
+    CMPIStatus runMarked(Work work, unsigned int line = __builtin_LINE()) const {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        run([&] { work(status); }, [](const std::exception&) {}, line);
+        contained([&] { markProviderExit(frameSource.category, frameSource.file, function, line); });
+        return status;
+    }
+
+    /// An operation that is not offered: one METHOD line, no markers.
+    CMPIStatus notSupported(unsigned int line = __builtin_LINE()) const {
+        contained([&] { traceMethod(here(line)); });
+        return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+    }
+
+private:
+    const char* const function;
+};
+
+/// Hand an adapter's answer to the object manager; a null, which stands for nothing, is not handed over.
+inline void returnPath(const CMPIResult* result, CMPIObjectPath* path) {
+    if (path != nullptr) CMReturnObjectPath(result, path);
+}
+inline void returnInstance(const CMPIResult* result, CMPIInstance* instance) {
+    if (instance != nullptr) CMReturnInstance(result, instance);
+}
+
+} // namespace VK::BaseServerProvider
