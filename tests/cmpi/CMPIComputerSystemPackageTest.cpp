@@ -1,0 +1,140 @@
+#include "support/Associations.h"
+#include "support/Provider.h"
+#include "support/SimulatedHost.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using testing::Contains;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+constexpr char className[] = "VESKA_ComputerSystemPackage";
+
+om::ObjectPath computerPath(const std::string& name) {
+    return test::path("VESKA_ComputerSystem", {{"Name", name}});
+}
+
+om::ObjectPath chassisPath(const std::string& tag) {
+    return test::path("VESKA_PhysicalPackage", {{"Tag", tag}});
+}
+
+om::ObjectPath association(const std::string& tag, const std::string& name) {
+    return test::associationPath(className, {{"Antecedent", chassisPath(tag)}, {"Dependent", computerPath(name)}});
+}
+
+test::Node without(test::Node node, unsigned property) {
+    node.properties.erase(property);
+    return node;
+}
+
+std::vector<std::string> namedEnds() {
+    const om::Answer names = test::names(className);
+    EXPECT_EQ(test::ends(test::pathsOfInstances(test::instances(className))), test::ends(test::paths(names)));
+    EXPECT_FALSE(names.done); // meant: neither enumeration of this class is closed
+    EXPECT_EQ(names.code, CMPI_RC_OK);
+    return test::ends(test::paths(names));
+}
+
+TEST(CMPIComputerSystemPackage, PairsOneChassisWithItsComputer) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
+    EXPECT_THAT(namedEnds(), ElementsAre("Antecedent=A -> Dependent=a"));
+}
+
+TEST(CMPIComputerSystemPackage, PairsEveryChassisWithItsOwnComputer) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::chassis(0, 1, "B"), test::computer(1, "b"),
+                    test::chassis(1, 0, "C")});
+    EXPECT_THAT(namedEnds(), ElementsAre("Antecedent=A -> Dependent=a", "Antecedent=B -> Dependent=a",
+                                         "Antecedent=C -> Dependent=b"));
+}
+
+TEST(CMPIComputerSystemPackage, PassesOverComputersWithoutChassis) {
+    test::simulate({test::computer(0, "a"), test::computer(1, "b"), test::chassis(1, 0, "B"), test::computer(2, "c"),
+                    test::computer(3, "d"), test::chassis(3, 0, "D")});
+    EXPECT_THAT(namedEnds(), ElementsAre("Antecedent=B -> Dependent=b", "Antecedent=D -> Dependent=d"));
+    test::simulate({test::computer(0, "a")});
+    EXPECT_THAT(namedEnds(), IsEmpty());
+}
+
+TEST(CMPIComputerSystemPackage, IsNotFoundOnAHostWithoutComputer) {
+    test::simulate({test::chassis(0, 0, "A")});
+    test::takeLog();
+    EXPECT_THAT(namedEnds(), IsEmpty());
+    EXPECT_THAT(test::takeLog(), Contains(HasSubstr("]: Could not find instance")));
+}
+
+TEST(CMPIComputerSystemPackage, PairsAChassisWithoutSerialNumberByItsClassAlone) {
+    test::simulate({test::computer(0, "a"), without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
+    EXPECT_THAT(namedEnds(),
+                ElementsAre("Antecedent=VESKA_PhysicalPackage -> Dependent=a", "Antecedent=B -> Dependent=a"));
+}
+
+TEST(CMPIComputerSystemPackage, CarriesThePlatformGUIDOfTheFirstComputerEverywhere) {
+    test::simulate({test::computer(0, "a"), test::computer(1, "b"), test::chassis(1, 0, "B")});
+    const om::Instance instance = test::instancesOf(test::instances(className))[0];
+    ASSERT_THAT(test::namesOf(instance.properties), ElementsAre("Antecedent", "Dependent", "PlatformGUID"));
+    EXPECT_EQ(test::text(instance.properties[2].second), "4c4c4544-0043-3010-8052-000000000000");
+}
+
+TEST(CMPIComputerSystemPackage, HasNoPlatformGUIDWithoutAUUID) {
+    test::simulate({without(test::computer(0, "a"), 64), test::chassis(0, 0, "A")});
+    EXPECT_THAT(test::namesOf(test::instancesOf(test::instances(className))[0].properties),
+                ElementsAre("Antecedent", "Dependent"));
+}
+
+TEST(CMPIComputerSystemPackage, GivesExactlyTheInstanceThatIsNamed) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::chassis(0, 1, "B")});
+    EXPECT_THAT(test::ends(test::pathsOfInstances(test::get(association("B", "a")))),
+                ElementsAre("Antecedent=B -> Dependent=a"));
+    EXPECT_THAT(test::get(association("B", "b")).results, IsEmpty());
+    EXPECT_THAT(test::get(association("C", "a")).results, IsEmpty());
+}
+
+TEST(CMPIComputerSystemPackage, LeadsFromAComputerToAllItsChassisAndBack) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::chassis(0, 1, "B"), test::computer(1, "b"),
+                    test::chassis(1, 0, "C")});
+    std::vector<std::string> tags;
+    for (const om::ObjectPath& path : test::paths(test::associatorNames(computerPath("a"), className))) {
+        tags.push_back(test::text(path.keys.back().second));
+        const std::vector<om::ObjectPath> back = test::paths(test::associatorNames(path, className));
+        ASSERT_EQ(back.size(), 1U);
+        EXPECT_EQ(test::text(*test::find(back[0].keys, "Name")), "a");
+    }
+    EXPECT_THAT(tags, ElementsAre("A", "B"));
+}
+
+TEST(CMPIComputerSystemPackage, ReachesOnlyTheClassAtTheOtherEndInAnyLetterCase) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
+    const auto count = [](const om::ObjectPath& source, const char* resultClass) {
+        return test::associatorNames(source, className, resultClass).results.size();
+    };
+    for (const char* chassisClass : {"VESKA_PhysicalPackage", "CIM_PhysicalPackage", "cim_physicalpackage", ""}) {
+        EXPECT_EQ(count(computerPath("a"), chassisClass), 1U) << chassisClass;
+    }
+    for (const char* computerClass : {"VESKA_ComputerSystem", "CIM_ComputerSystem", "CIM_COMPUTERSYSTEM", ""}) {
+        EXPECT_EQ(count(chassisPath("A"), computerClass), 1U) << computerClass;
+    }
+    // Meant: bases further up are not reached, nor is the class at this end.
+    EXPECT_EQ(count(computerPath("a"), "CIM_PhysicalElement"), 0U);
+    EXPECT_EQ(count(computerPath("a"), "CIM_ComputerSystem"), 0U);
+    EXPECT_EQ(count(chassisPath("A"), "CIM_PhysicalPackage"), 0U);
+}
+
+TEST(CMPIComputerSystemPackage, FailsOnAChassisWithoutSerialNumberBeforeTheOneAskedFor) {
+    test::simulate({test::computer(0, "a"), without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
+    test::takeLog();
+    const om::Answer answer = test::associatorNames(chassisPath("B"), className);
+    EXPECT_THAT(answer.results, IsEmpty());
+    EXPECT_EQ(answer.code, CMPI_RC_OK);
+    EXPECT_FALSE(answer.done);
+    EXPECT_THAT(test::takeLog(), Contains(HasSubstr("]: Serial Property on Chassis not available.")));
+}
+
+TEST(CMPIComputerSystemPackage, FindsTheChassisBeforeOneWithoutSerialNumber) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), without(test::chassis(0, 1, ""), 50)});
+    EXPECT_EQ(test::associatorNames(chassisPath("A"), className).results.size(), 1U);
+}
+
+} // namespace
