@@ -85,17 +85,17 @@ unsigned int CIMServiceConfig::set(const TracePoint& at, const Setting& setting,
 
 bool CIMServiceConfig::get(const TracePoint& at, const Setting& setting, unsigned int& value) const {
     const std::string command = commandDirectory() + setting.getCommand;
-    traceVariable(at, "cimconfig command :", command.c_str(), NoticeLevel);
+    traceVariable(at, "cimconfig command :", command.c_str());
     CommandStream stream(command.c_str(), "r");
     if (!stream) return false;
     char line[256] = {};
     stream.readLine(line, sizeof line);
-    traceVariable(at, "output from cimconfig command :", line, NoticeLevel);
+    traceVariable(at, "output from cimconfig command :", line);
     const std::string text = line;
     // Meant: without a ":" the position behind it wraps to 0, and the whole line is read.
     const std::string number = text.substr(text.find(':') + 1);
     value = static_cast<unsigned int>(std::strtol(number.c_str(), nullptr, 10));
-    traceVariable(at, setting.outputKey, value, NoticeLevel);
+    traceVariable(at, setting.outputKey, value);
     return true;
 }
 
@@ -120,7 +120,7 @@ bool CIMServiceConfig::getAttemptParameter(unsigned int& attemptsOut) const {
 }
 
 unsigned int CIMServiceConfig::executeCIMServiceConfig(std::string& request) {
-    const TraceScope scope(source, FailureLevel); // the level is meant
+    const TraceScope scope(source, FailureLevel); // meant: the entry stands at the failures' level
     const std::size_t equals = request.find('=');
     if (equals == std::string::npos) return 1;
     const std::string name = request.substr(0, equals);

@@ -74,7 +74,7 @@ unsigned int refuse(const CMPIBroker* broker, const char* message) {
 
 /// Answers the host's time now, in "TimeData".
 unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
-    if (out == nullptr) return CMPI_RC_ERR_FAILED;
+    if (broker == nullptr || out == nullptr) return CMPI_RC_ERR_FAILED;
     CMPIValue now = {};
     now.dateTime = CMNewDateTime(broker, nullptr);
     if (now.dateTime == nullptr || now.dateTime->hdl == nullptr) return CMPI_RC_ERR_FAILED;

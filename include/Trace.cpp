@@ -85,12 +85,12 @@ void traceDestructor(const TracePoint& at) noexcept {
     swallowing([&] { writeLine(at, DebugLevel, METHOD_INVOKED); });
 }
 
-TraceScope::TraceScope(const TracePoint& point, int theLevel) : at(point), level(theLevel) {
-    writeLine(at, level, ENTERING);
+TraceScope::TraceScope(const TracePoint& point, int entryLevel) : at(point) {
+    writeLine(at, entryLevel, ENTERING);
 }
 
 TraceScope::~TraceScope() {
-    swallowing([&] { writeLine(at, level, EXITING); });
+    swallowing([&] { writeLine(at, DebugLevel, EXITING); });
 }
 
 DestructorTraceScope::DestructorTraceScope(const TracePoint& point) noexcept : at(point) {

@@ -138,14 +138,13 @@ void traceDestructor(const TracePoint& at) noexcept;
 /// exit ends there.
 class TraceScope {
 public:
-    explicit TraceScope(const TracePoint& point, int theLevel = DebugLevel);
+    explicit TraceScope(const TracePoint& point, int entryLevel = DebugLevel);
     ~TraceScope();
     TraceScope(const TraceScope&) = delete;
     TraceScope& operator=(const TraceScope&) = delete;
 
 private:
     const TracePoint at;
-    const int level;
 };
 
 /// The same for a destructor: what the logger throws at the entry ends there, too.
