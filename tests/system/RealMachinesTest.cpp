@@ -28,7 +28,7 @@ void PrintTo(const Machine& machine, std::ostream* stream) {
 
 constexpr Machine machines[] = {
     {"workstation-2.6", "workstation-26", "30d3f174-7f5d-11e1-bbda-5f0d3dbc082e", "CZC214446Z", "Hewlett-Packard",
-     "HP Z600 Workstation", 0},
+     "HP Z600 Workstation", 3},
     {"rack-server-2.7", "rack-server-27", "00000000-0000-0000-0000-0cc47a133878", "9000116105", "Supermicro",
      "X9DBL-3F/X9DBL-iF", 3},
     {"rack-server-3.2", "rack-server-32", "00112233-4455-6677-8899-aabbccddeeff", "", "Dell Inc.", "PowerEdge R777sd",
