@@ -1,0 +1,74 @@
+#include "vk/Product.h"
+
+#include "product/UniqueIdentifier.h"
+#include "support/InChild.h"
+#include "support/TemporaryDirectory.h"
+#include "vk/make_string.h"
+
+#include <gmock/gmock.h>
+#include <sys/utsname.h>
+
+using support::inChild;
+using support::TemporaryDirectory;
+using VK::make_string;
+using VK::Product;
+
+namespace {
+
+constexpr const char* MACHINE_ID = "0123456789abcdef0123456789abcdef";
+
+std::string kernelsMachine() {
+    utsname names{};
+    return uname(&names) == 0 ? names.machine : "";
+}
+
+/// Architecture, root directory and identifier in a process whose host is found there; the variable may be null.
+std::string productFrom(const char* variable, const std::string& value) {
+    return inChild([&] {
+        unsetenv("VK_INSTRUMENTATION_ROOT");
+        unsetenv("VK_INSTRUMENTATION_TREE");
+        if (variable != nullptr) setenv(variable, value.c_str(), 1);
+        return make_string(Product::getArchitecture()) + " " + make_string(Product::getRootDirectory()) + " " +
+               make_string(Product::getUid());
+    });
+}
+
+const std::string ROOT_DIRECTORY = std::string(INSTALL_PREFIX) + "/lib/vk/platform/";
+
+} // namespace
+
+TEST(Product, OfThisHostIsToldByTheKernelAndTheMachineId) {
+    std::ifstream file("/etc/machine-id");
+    std::string id;
+    if (!(file >> id) || id == "uninitialized") GTEST_SKIP() << "this host has no machine id";
+    EXPECT_EQ(productFrom(nullptr, ""), kernelsMachine() + " " + ROOT_DIRECTORY + " " + VK::uniqueIdentifier(id));
+}
+
+TEST(Product, OfASnapshotIsToldByItsFilesOnly) {
+    TemporaryDirectory snapshot;
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()), kernelsMachine() + " " + ROOT_DIRECTORY + " ");
+    snapshot.write("etc/machine-id", std::string(MACHINE_ID) + "\n");
+    snapshot.write("proc/sys/kernel/arch", "ppc64le\n");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()),
+              "ppc64le " + ROOT_DIRECTORY + " " + VK::uniqueIdentifier(MACHINE_ID));
+}
+
+TEST(Product, HasNoIdentifierWhereTheMachineIdIsNotSetYet) {
+    for (const char* text : {"", "\n", "uninitialized\n"}) {
+        TemporaryDirectory snapshot;
+        snapshot.write("etc/machine-id", text);
+        EXPECT_THAT(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()), testing::EndsWith("/ ")) << text;
+    }
+}
+
+TEST(Product, IsReadOncePerProcess) {
+    TemporaryDirectory snapshot;
+    snapshot.write("etc/machine-id", MACHINE_ID);
+    const std::string result = inChild([&] {
+        setenv("VK_INSTRUMENTATION_ROOT", snapshot.path().c_str(), 1);
+        const std::wstring first = Product::getUid();
+        snapshot.write("etc/machine-id", "other");
+        return std::string(!first.empty() && Product::getUid() == first ? "same" : "changed");
+    });
+    EXPECT_EQ(result, "same");
+}

@@ -1,0 +1,124 @@
+#include "vk/ProviderUtilities.h"
+
+#include "platform/providerutilities/FakeBroker.h"
+
+#include <gtest/gtest.h>
+
+using VK::ProviderUtilities;
+
+namespace {
+
+constexpr unsigned short UNKNOWN = ProviderUtilities::CLASS_ID_UNKNOWN;
+
+class ClassIds : public testing::Test {
+protected:
+    unsigned short idOf(const std::string& name) {
+        const unsigned short id = ProviderUtilities::getClassId(name.c_str());
+        EXPECT_EQ(ProviderUtilities::getClassId(fake.makePath("root/cimv2", name)), id);
+        return id;
+    }
+
+    FakeBroker fake;
+};
+
+class ClassRelations : public testing::Test {
+protected:
+    ClassRelations() {
+        fake.base = {{"CIM_ElementCapabilities", ""},
+                     {"VESKA_ComputerCapabilities", "CIM_ElementCapabilities"},
+                     {"VESKA_Special", "VESKA_ComputerCapabilities"},
+                     {"CIM_System", ""}};
+    }
+    bool related(const char* one, const char* other) {
+        return ProviderUtilities::areClassesRelated(fake.get(), "root/cimv2", one, other);
+    }
+
+    FakeBroker fake;
+};
+
+} // namespace
+
+TEST_F(ClassIds, AreThoseOfTheEightClasses) {
+    EXPECT_EQ(idOf("VESKA_ComputerSystem"), 1);
+    EXPECT_EQ(idOf("VESKA_PhysicalPackage"), 22);
+    EXPECT_EQ(idOf("VESKA_EnabledLogicalElementCapabilities"), 23);
+    EXPECT_EQ(idOf("VESKA_ComputerSystemPackage"), 24);
+    EXPECT_EQ(idOf("VESKA_ComputerCapabilities"), 33);
+    EXPECT_EQ(idOf("VESKA_TimeService"), 161);
+    EXPECT_EQ(idOf("VESKA_TimeServiceAffectsElement"), 162);
+    EXPECT_EQ(idOf("VESKA_CIMServiceConfig"), 185);
+}
+
+TEST_F(ClassIds, DoNotDependOnCase) {
+    EXPECT_EQ(idOf("veska_computersystem"), 1);
+    EXPECT_EQ(idOf("VESKA_CIMSERVICECONFIG"), 185);
+}
+
+TEST_F(ClassIds, AreUnknownForEveryOtherName) {
+    for (const char* name : {"", "CIM_ComputerSystem", "CIM_ElementCapabilities", "VESKA_ComputerSystem ",
+                             "VESKA_ComputerSyste", "VESKA_ComputerSystemPackages", "ComputerSystem"})
+        EXPECT_EQ(idOf(name), UNKNOWN) << name;
+}
+
+TEST_F(ClassIds, AreUnknownWithoutAName) {
+    EXPECT_EQ(ProviderUtilities::getClassId(static_cast<const char*>(nullptr)), UNKNOWN);
+    EXPECT_EQ(ProviderUtilities::getClassId(static_cast<const CMPIObjectPath*>(nullptr)), UNKNOWN);
+}
+
+TEST_F(ClassIds, AreUnknownWhereTheBrokerDoesNotTellTheName) {
+    const CMPIObjectPath* const path = fake.makePath("root/cimv2", "VESKA_ComputerSystem");
+    fake.refusals = {{"getClassName", CMPI_RC_ERR_FAILED}};
+    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    fake.refusals = {{"getCharPtr", CMPI_RC_ERR_FAILED}};
+    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    fake.refusals = {};
+    fake.nullAnswers = {"getClassName"};
+    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    fake.nullAnswers = {};
+    fake.writesStatus = false;
+    EXPECT_EQ(ProviderUtilities::getClassId(path), 1);
+    fake.pathTable.getClassName = nullptr;
+    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    const CMPIObjectPath withoutTable{nullptr, nullptr};
+    EXPECT_EQ(ProviderUtilities::getClassId(&withoutTable), UNKNOWN);
+}
+
+TEST_F(ClassRelations, HoldOnOneLineOfInheritanceInBothDirections) {
+    EXPECT_TRUE(related("VESKA_ComputerCapabilities", "VESKA_ComputerCapabilities"));
+    EXPECT_TRUE(related("VESKA_ComputerCapabilities", "CIM_ElementCapabilities"));
+    EXPECT_TRUE(related("CIM_ElementCapabilities", "VESKA_ComputerCapabilities"));
+    EXPECT_TRUE(related("VESKA_Special", "CIM_ElementCapabilities"));
+    EXPECT_TRUE(related("CIM_ElementCapabilities", "VESKA_Special"));
+    EXPECT_FALSE(related("CIM_ElementCapabilities", "CIM_System"));
+    EXPECT_FALSE(related("VESKA_Special", "CIM_System"));
+}
+
+TEST_F(ClassRelations, DoNotHoldForUnknownClasses) {
+    EXPECT_FALSE(related("No_Such", "No_Such"));
+    EXPECT_FALSE(related("No_Such", "CIM_System"));
+    EXPECT_FALSE(related("CIM_System", "No_Such"));
+}
+
+TEST_F(ClassRelations, AreNotAskedForWithoutNames) {
+    for (const char* none : {static_cast<const char*>(nullptr), ""}) {
+        EXPECT_FALSE(related(none, "CIM_System"));
+        EXPECT_FALSE(related("CIM_System", none));
+    }
+    EXPECT_EQ(fake.classQuestions, 0);
+}
+
+TEST_F(ClassRelations, DoNotHoldWhereTheBrokerDoesNotAnswer) {
+    const char* const name = "CIM_System";
+    EXPECT_FALSE(ProviderUtilities::areClassesRelated(nullptr, "root/cimv2", name, name));
+    fake.refusals = {{"classPathIsA", CMPI_RC_ERR_FAILED}};
+    EXPECT_FALSE(related(name, name));
+    fake.refusals = {{"newObjectPath", CMPI_RC_ERR_INVALID_NAMESPACE}};
+    EXPECT_FALSE(related(name, name));
+    fake.refusals = {};
+    fake.nullAnswers = {"newObjectPath"};
+    EXPECT_FALSE(related(name, name));
+    fake.nullAnswers = {};
+    EXPECT_TRUE(related(name, name));
+    fake.encapsulated.classPathIsA = nullptr;
+    EXPECT_FALSE(related(name, name));
+}
