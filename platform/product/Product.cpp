@@ -2,16 +2,13 @@
 
 #include "product/UniqueIdentifier.h"
 #include "product/Widen.h"
+#include "vk/HostFacts.h"
 #include "vk/HostSource.h"
+#include "vk/Instrumentation.h"
 #include "vk/Root.h"
 
 #include <string_view>
 #include <sys/utsname.h>
-#if __has_include("vk/HostFacts.h")
-#include "vk/HostFacts.h"
-#include "vk/Instrumentation.h"
-#define VK_HAS_INSTRUMENTATION
-#endif
 
 namespace VK {
 
@@ -47,11 +44,9 @@ std::string readSystemUuid() {
     // A simulated computer's UUID is not this host's.
     if (HostSource::current().kind == HostSource::Simulated) return {};
     std::string uuid;
-#ifdef VK_HAS_INSTRUMENTATION
     Instrumentation computer;
     computer.selectNode(NodeLexicon::ComputerSystemNode);
     computer.getProperty(NodeLexicon::UUIDProperty, uuid);
-#endif
     return uuid;
 }
 
@@ -66,14 +61,10 @@ std::string readUid() {
 }
 
 Facts readFacts() {
-#ifdef VK_HAS_INSTRUMENTATION
     const ProductOverrides& given = productOverrides();
     return {given.architecture ? *given.architecture : readArchitecture(),
             withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
             given.uid ? *given.uid : readUid()};
-#else
-    return {readArchitecture(), withFinalSlash(VK_ROOT_DIRECTORY), readUid()};
-#endif
 }
 
 const Facts& facts() {

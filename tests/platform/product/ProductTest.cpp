@@ -72,3 +72,22 @@ TEST(Product, IsReadOncePerProcess) {
     });
     EXPECT_EQ(result, "same");
 }
+
+TEST(Product, OfASimulatedHostIsToldByItsFileAndElseByThisHost) {
+    TemporaryDirectory folder;
+    folder.write(
+        "tree.json",
+        R"({"product": {"architecture": "riscv64", "uid": "node7", "rootDirectory": "/opt/vk"}, "nodes": []})");
+    folder.write("part.json", R"({"product": {"uid": ""}, "nodes": []})");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_TREE", folder.path("tree.json")), "riscv64 /opt/vk/ node7");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_TREE", folder.path("part.json")),
+              kernelsMachine() + " " + ROOT_DIRECTORY + " ");
+}
+
+TEST(Product, IsIdentifiedByTheSystemsUuidWithoutAMachineId) {
+    TemporaryDirectory snapshot;
+    snapshot.write("sys/class/dmi/id/product_uuid", "4C4C4544-0042-4A10-8053-B4C04F4D3132\n");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()),
+              kernelsMachine() + " " + ROOT_DIRECTORY + " " +
+                  VK::uniqueIdentifier("4c4c4544-0042-4a10-8053-b4c04f4d3132"));
+}
