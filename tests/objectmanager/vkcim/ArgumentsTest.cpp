@@ -1,0 +1,122 @@
+#include "objectmanager/vkcim/Arguments.h"
+#include "objectmanager/vkcim/Commands.h"
+
+#include <gmock/gmock.h>
+
+namespace vkcim {
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using Words = std::vector<std::string>;
+
+Arguments good(const Words& words) {
+    const Parsed parsed = parseArguments(words);
+    if (!parsed.arguments) throw std::runtime_error(parsed.error + parsed.output);
+    return *parsed.arguments;
+}
+
+TEST(Arguments, HaveDefaults) {
+    const Arguments arguments = good({"names", "A"});
+    EXPECT_EQ(arguments.operation, om::Operation::EnumInstanceNames);
+    EXPECT_EQ(arguments.subject, "A");
+    EXPECT_EQ(arguments.library, "");
+    EXPECT_EQ(arguments.provider, "BaseServerProvider");
+    EXPECT_EQ(arguments.nameSpace, "root/cimv2");
+    EXPECT_EQ(arguments.format, Format::Text);
+    EXPECT_EQ(arguments.repeat, 1u);
+    EXPECT_EQ(arguments.threads, 1u);
+    EXPECT_FALSE(arguments.timing);
+    EXPECT_FALSE(arguments.assocClass || arguments.resultClass || arguments.role || arguments.resultRole);
+    EXPECT_FALSE(arguments.properties);
+}
+
+TEST(Arguments, OptionsStandBeforeOrAfterTheCommand) {
+    for (const Words& words : {Words{"--format", "json", "--namespace=root/x", "--timing", "names", "A"},
+                               Words{"names", "--format", "json", "--namespace=root/x", "A", "--timing"},
+                               Words{"--format=json", "names", "A", "--timing", "--namespace", "root/x"}}) {
+        const Arguments arguments = good(words);
+        EXPECT_EQ(arguments.format, Format::Json);
+        EXPECT_EQ(arguments.nameSpace, "root/x");
+        EXPECT_EQ(arguments.subject, "A");
+        EXPECT_TRUE(arguments.timing);
+    }
+}
+
+TEST(Arguments, AnEmptyPropertyListIsNotAMissingOne) {
+    EXPECT_THAT(good({"--properties", "", "names", "A"}).properties.value(), IsEmpty());
+    EXPECT_THAT(good({"--properties=", "names", "A"}).properties.value(), IsEmpty());
+    EXPECT_THAT(good({"names", "A", "--properties", "X,Y"}).properties.value(), ElementsAre("X", "Y"));
+    EXPECT_EQ(good({"names", "A", "--role="}).role, "");
+}
+
+TEST(Arguments, EveryCommandIsRead) {
+    for (const Command& command : commands) {
+        Words words = {command.name};
+        if (command.takes != Takes::Nothing) words.push_back("subject");
+        if (command.method) words.push_back("method");
+        if (command.assignments) words.insert(words.end(), {"a=1", "b="});
+        const Arguments arguments = good(words);
+        EXPECT_EQ(arguments.operation, command.operation);
+        EXPECT_EQ(arguments.subject, command.takes == Takes::Nothing ? "" : "subject");
+        EXPECT_EQ(arguments.method, command.method ? "method" : "");
+        EXPECT_EQ(arguments.assignments.size(), command.assignments ? 2u : 0u) << command.name;
+    }
+}
+
+TEST(Arguments, WordsThatLookLikeSomethingElseAreTakenAsTheyAre) {
+    EXPECT_EQ(good({"names", "report"}).subject, "report");
+    EXPECT_EQ(good({"get", "-"}).subject, "-");
+    EXPECT_THAT(good({"modify", "A", "x=-5", "y=[1,2]", "z=--timing"}).assignments,
+                ElementsAre("x=-5", "y=[1,2]", "z=--timing"));
+}
+
+TEST(Arguments, HelpAndVersionAreAnswersOfTheirOwn) {
+    for (const Words& words :
+         {Words{"--help"}, Words{"--version"}, Words{"names", "--help"}, Words{"get", "A", "--help"}}) {
+        const Parsed parsed = parseArguments(words);
+        EXPECT_FALSE(parsed.arguments);
+        EXPECT_EQ(parsed.exitStatus, 0);
+        EXPECT_THAT(parsed.error, IsEmpty());
+        EXPECT_THAT(parsed.output, HasSubstr("vkcim"));
+    }
+}
+
+TEST(Arguments, EveryCommandsHelpHasItsExample) {
+    for (const Command& command : commands) {
+        EXPECT_THAT(parseArguments({command.name, "--help"}).output, HasSubstr(command.example));
+    }
+}
+
+TEST(Arguments, UnusableOnesAreRefusedWithStatusTwo) {
+    for (const Words& words : {Words{},
+                               Words{"bogus"},
+                               Words{"--bogus", "names", "A"},
+                               Words{"names"},
+                               Words{"names", "A", "B"},
+                               Words{"names", ""},
+                               Words{"report", "A"},
+                               Words{"modify", "A"},
+                               Words{"create", "A"},
+                               Words{"invoke", "A"},
+                               Words{"--format", "xml", "report"},
+                               Words{"--repeat", "0", "names", "A"},
+                               Words{"--repeat", "x", "names", "A"},
+                               Words{"--threads", "-1", "names", "A"},
+                               Words{"--threads", "2", "report"},
+                               Words{"report", "--repeat", "1"},
+                               Words{"--format", "json", "--format", "mof", "report"},
+                               Words{"--namespace"},
+                               Words{"--properties", "A,,B", "names", "A"},
+                               Words{"--timing=", "names", "A"}}) {
+        const Parsed parsed = parseArguments(words);
+        EXPECT_FALSE(parsed.arguments) << testing::PrintToString(words);
+        EXPECT_EQ(parsed.exitStatus, 2) << testing::PrintToString(words);
+        EXPECT_THAT(parsed.error, HasSubstr("vkcim: ")) << testing::PrintToString(words);
+        EXPECT_THAT(parsed.output, IsEmpty());
+    }
+}
+
+} // namespace
+} // namespace vkcim

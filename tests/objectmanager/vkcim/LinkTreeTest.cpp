@@ -1,0 +1,34 @@
+#include "objectmanager/vkcim/LinkTree.h"
+
+#include <gmock/gmock.h>
+
+namespace vkcim {
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+TEST(LinkTree, WhatStandsAboveEverythingComesFirst) {
+    EXPECT_THAT(drawLinks({{"chassis", "computer", "Package"},
+                           {"computer", "capabilities", "Capabilities"},
+                           {"time", "computer", "Affects"}}),
+                ElementsAre("chassis", "└─ computer  (Package)", "   └─ capabilities  (Capabilities)", "time",
+                            "└─ computer  (Affects)"));
+}
+
+TEST(LinkTree, SeveralThingsBelowOneAreBranches) {
+    EXPECT_THAT(drawLinks({{"a", "b", "L"}, {"a", "c", "L"}, {"b", "d", "L"}}),
+                ElementsAre("a", "├─ b  (L)", "│  └─ d  (L)", "└─ c  (L)"));
+}
+
+TEST(LinkTree, ACircleEnds) {
+    EXPECT_THAT(drawLinks({{"a", "b", "L"}, {"b", "a", "L"}}), ElementsAre("a", "└─ b  (L)", "   └─ a  (L)"));
+    EXPECT_THAT(drawLinks({{"a", "a", "L"}}), ElementsAre("a", "└─ a  (L)"));
+}
+
+TEST(LinkTree, NoLinksDrawNothing) {
+    EXPECT_THAT(drawLinks({}), IsEmpty());
+}
+
+} // namespace
+} // namespace vkcim
