@@ -1,9 +1,25 @@
 #include "objectmanager/vkcim/HostNotes.h"
 
+#include "objectmanager/vkcim/Arguments.h"
+
+#include "vk/HostFacts.h"
+
+#include <dlfcn.h>
+
+#include <memory>
+
 namespace vkcim {
 
-std::vector<std::string> hostNotes(const std::string&) {
-    return {};
+// The library is neither linked nor loaded from here: only the one that the provider brought is asked (RTLD_NOLOAD),
+// so that the notes tell of the same host, and vkcim runs where that library is another one or is missing.
+std::vector<std::string> hostNotes(const std::string& provider) {
+    if (provider != Arguments().provider) return {};
+    const std::unique_ptr<void, int (*)(void*)> library(dlopen("libvkinstrumentation.so.1", RTLD_NOW | RTLD_NOLOAD),
+                                                        &dlclose);
+    if (!library) return {};
+    // VK::hostNotes() as compilers with libstdc++ spell it.
+    void* const found = dlsym(library.get(), "_ZN2VK9hostNotesB5cxx11Ev");
+    return found ? reinterpret_cast<decltype(&VK::hostNotes)>(found)() : std::vector<std::string>();
 }
 
 } // namespace vkcim

@@ -1,8 +1,11 @@
 // The program itself, with a provider that answers what it was asked.
 #include "tests/support/Process.h"
+#include "tests/support/TemporaryDirectory.h"
 
 #include <gmock/gmock.h>
 #include <nlohmann/json.hpp>
+
+#include <filesystem>
 
 namespace {
 
@@ -101,11 +104,12 @@ TEST(Vkcim, ThePropertyListIsHandedOnAndNotApplied) {
 }
 
 TEST(Vkcim, ModifySendsTypedValues) {
-    const json all = answer({"modify", "Echo_Thing", "A=uint16[]:2,11", "B=text", "C=null:uint8", "D=", "E=7"});
-    EXPECT_EQ(all.at("status").at("message"),
-              "A 8336 [2][11]; B 5632 \"text\"; C 128 null; D 5632 \"\"; E 160 7; no list");
-    const json listed = answer({"modify", "Echo_Thing", "A=1", "--properties", "X"});
-    EXPECT_EQ(listed.at("status").at("message"), "A 160 1; X");
+    EXPECT_EQ(
+        vkcim({"modify", "Echo_Thing", "A=uint16[]:2,11", "B=text", "C=null:uint8", "D=", "E=7"}).error,
+        "vkcim: CMPI_RC_ERR_FAILED (1): A 8336 [2][11]; B 5632 \"text\"; C 128 null; D 5632 \"\"; E 160 7; no list\n");
+    EXPECT_EQ(vkcim({"modify", "Echo_Thing", "A=1", "--properties", "X"}).error,
+              "vkcim: CMPI_RC_ERR_FAILED (1): A 160 1; X\n");
+    EXPECT_EQ(answer({"modify", "Echo_Quiet", "A=1"}).at("results"), json::array());
 }
 
 TEST(Vkcim, CreateAnswersThePath) {
@@ -246,6 +250,27 @@ TEST(Vkcim, AReportIsFineWhateverTheClassesAnswer) {
     EXPECT_EQ(report.at("classes").size(), 5u);
     EXPECT_EQ(report.at("associations").at("VESKA_ComputerCapabilities").at("status").at("code"), 5);
     EXPECT_EQ(report.at("notes"), json::array());
+}
+
+TEST(Vkcim, OurOwnProvidersReportNotesWhatTheHostCouldNotTell) {
+    const support::TemporaryDirectory bare;
+    const Outcome outcome = support::runCommand({VKCIM, "--format", "json", "report"}, "",
+                                                {{"VK_INSTRUMENTATION_ROOT", bare.path()}, {"NVLOG_SINK", "none"}});
+    EXPECT_EQ(outcome.status, 0);
+    const json notes = json::parse(outcome.output).at("notes");
+    ASSERT_FALSE(notes.empty());
+    EXPECT_THAT(std::string(notes.at(0)), HasSubstr("SMBIOS"));
+}
+
+TEST(Vkcim, TheDefaultLibraryIsTheOneBesideTheProgram) {
+    const support::TemporaryDirectory copy;
+    std::filesystem::create_directories(copy.path("bin"));
+    std::filesystem::copy_file(VKCIM, copy.path("bin/vkcim"));
+    const Outcome missing = support::runCommand({copy.path("bin/vkcim"), "names", "Echo_Thing"});
+    EXPECT_EQ(missing.status, 3);
+    EXPECT_THAT(missing.error, HasSubstr(copy.path("lib/libvknabaseserverprofileprovider.so.1")));
+    copy.link(ECHO_PROVIDER, "lib/libvknabaseserverprofileprovider.so.1");
+    EXPECT_EQ(support::runCommand({copy.path("bin/vkcim"), "--provider", "Echo", "names", "Echo_Thing"}).status, 0);
 }
 
 TEST(Vkcim, TheLastOutputIsOnTheDiskOrItSaysSo) {
