@@ -81,13 +81,23 @@ unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
     return out->ft->addArg(out, "TimeData", &now, CMPI_dateTime).rc == CMPI_RC_OK ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
 }
 
-/// The 25 characters of a date-time, or nothing.
+/// The 25 characters of a date-time; false where the broker does not tell them.
 bool textOf(const CMPIDateTime* dateTime, std::string& text) {
     const CMPIString* string = dateTime->ft->getStringFormat(dateTime, nullptr);
     if (string == nullptr) return false;
     const char* characters = string->ft->getCharPtr(string, nullptr);
     if (characters == nullptr) return false;
     text = characters;
+    return true;
+}
+
+/// Whole seconds since 1970-01-01 UTC; false where the broker knows none, as for a date-time with asterisks.
+bool secondsOf(const CMPIDateTime* dateTime, long& seconds) {
+    constexpr CMPIUint64 microsecondsPerSecond = 1000000;
+    CMPIStatus status = {CMPI_RC_OK, nullptr}; // some brokers write it only on failure
+    const CMPIUint64 microseconds = dateTime->ft->getBinaryFormat(dateTime, &status);
+    if (status.rc != CMPI_RC_OK) return false;
+    seconds = static_cast<long>(microseconds / microsecondsPerSecond);
     return true;
 }
 
@@ -133,9 +143,8 @@ unsigned int CMPITimeService::setTime(const CMPIArgs* in, CMPIArgs* out) {
     unsigned int gmtOffset = offsetOf(text);
     traceVariable(here, "CMPITIMESERVICE::gmt_offset_uint32", gmtOffset);
 
-    constexpr CMPIUint64 microsecondsPerSecond = 1000000;
-    long seconds = static_cast<long>(time->ft->getBinaryFormat(time, nullptr) / microsecondsPerSecond);
-    if (data.manageTime(seconds, gmtOffset) != 0) return CMPI_RC_ERR_FAILED;
+    long seconds = 0;
+    if (!secondsOf(time, seconds) || data.manageTime(seconds, gmtOffset) != 0) return CMPI_RC_ERR_FAILED;
     return returnCurrentTime(broker, out);
 }
 
