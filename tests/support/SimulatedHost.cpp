@@ -5,6 +5,7 @@
 #include <regex>
 #include <sstream>
 #include <stdexcept>
+#include <unistd.h>
 
 namespace test {
 namespace {
@@ -23,11 +24,15 @@ public:
         setenv("NVLOG_CHANNELS", "log,trace", 0);
     }
     ~ProcessFolder() {
+        if (getpid() != owner) return; // a child of the test, which has no folder of its own
         std::error_code ignored;
         fs::remove_all(path, ignored);
     }
 
     fs::path path;
+
+private:
+    const pid_t owner = getpid();
 };
 
 const ProcessFolder folder;
@@ -86,9 +91,12 @@ Node chassis(unsigned index, unsigned number, const std::string& serial) {
 }
 
 void simulate(const std::vector<Node>& nodes) {
+    simulate(nodes, {{"architecture", "x86_64"}, {"uid", "uid-1"}, {"kvm", false}});
+}
+
+void simulate(const std::vector<Node>& nodes, const nlohmann::json& product) {
     nlohmann::json list = nlohmann::json::array();
     for (const Node& node : nodes) list.push_back(asJson(node));
-    const nlohmann::json product = {{"architecture", "x86_64"}, {"uid", "uid-1"}, {"kvm", false}};
     simulateText(nlohmann::json{{"product", product}, {"nodes", list}}.dump());
 }
 
@@ -104,7 +112,8 @@ nlohmann::json simulatedFile() {
 }
 
 nlohmann::json simulatedProperty(const std::string& path, unsigned property) {
-    for (const nlohmann::json& node : simulatedFile()["nodes"]) {
+    const nlohmann::json file = simulatedFile();
+    for (const nlohmann::json& node : file.at("nodes")) {
         if (node["path"] != path) continue;
         const auto found = node["properties"].find(std::to_string(property));
         return found == node["properties"].end() ? nlohmann::json() : *found;

@@ -35,6 +35,8 @@ Node chassis(unsigned index, unsigned number, const std::string& serial);
 
 /// Makes the process's host this one. `product` is fixed to architecture `x86_64`, uid `uid-1` and no KVM.
 void simulate(const std::vector<Node>& nodes);
+/// The same with these facts of the product, which the libraries read once per process.
+void simulate(const std::vector<Node>& nodes, const nlohmann::json& product);
 /// The same from the text of the file as it stands.
 void simulateText(const std::string& text);
 /// The simulated host's file, parsed.

@@ -1,0 +1,30 @@
+#include "Linux/SingleElement.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+class Sample : public VK::BaseServerProvider::SingleElement {};
+
+TEST(SingleElement, StandsOnOneElementAndIsPastItAfterOneStep) {
+    Sample sample;
+    EXPECT_TRUE(static_cast<bool>(sample));
+    EXPECT_EQ(&++sample, &sample);
+    EXPECT_FALSE(static_cast<bool>(sample));
+    ++sample;
+    EXPECT_FALSE(static_cast<bool>(sample));
+}
+
+TEST(SingleElement, IsWalkedOnceByALoop) {
+    unsigned int seen = 0;
+    for (Sample sample; sample; ++sample) ++seen;
+    EXPECT_EQ(seen, 1U);
+}
+
+TEST(SingleElement, HasNothingToFilter) {
+    Sample sample;
+    sample.setFilter(Sample::FilterType{}, "another");
+    EXPECT_TRUE(static_cast<bool>(sample));
+}
+
+} // namespace

@@ -1,0 +1,252 @@
+#include "Linux/TimeService.h"
+#include "support/FakeCommands.h"
+#include "support/ShellCalls.h"
+#include "support/SimulatedHost.h"
+
+#include <gmock/gmock.h>
+
+#include <unistd.h>
+
+namespace {
+
+using testing::Contains;
+using testing::ContainsRegex;
+using testing::ElementsAre;
+
+using testing::IsEmpty;
+using VK::BaseServerProvider::TimeService;
+
+const std::string ps = "popen r: ps -ef|grep -i \"ntpd\"|grep -v grep";
+const std::string synchronise = "popen r: ntpd -xgq";
+
+std::string hostName() {
+    char name[256] = {};
+    gethostname(name, sizeof name - 1);
+    return name;
+}
+
+/// A simulated host with one computer, on which no NTP daemon runs. The init script is never started by these tests.
+class TimeServiceTest : public testing::Test {
+protected:
+    TimeServiceTest() {
+        test::simulate({test::computer(0, hostName())});
+        test::refuseToStart("/etc/init.d/");
+        commands.add("ps", test::printing({"root 1 0 /sbin/init"}));
+        commands.add("ntpd", test::printing({"ntpd: time set +0.000012s"}));
+        test::takeShellCalls();
+        test::takeLog();
+    }
+    ~TimeServiceTest() override { test::refuseToStart(""); }
+
+    void runDaemon(const std::string& line = "ntp 812 1 /usr/sbin/ntpd -g") {
+        commands.add("ps", test::printing({"root 1 0 /sbin/init", line}));
+    }
+
+    test::FakeCommands commands;
+};
+
+TEST_F(TimeServiceTest, IsNamedAfterTheHost) {
+    const TimeService service;
+    std::string text;
+    EXPECT_TRUE(service.getName(text));
+    EXPECT_EQ(text, "TimeService@" + hostName());
+    EXPECT_TRUE(service.getSystemName(text));
+    EXPECT_EQ(text, hostName());
+    EXPECT_TRUE(service.getCreationClassName(text));
+    EXPECT_EQ(text, "VESKA_TimeService");
+    EXPECT_TRUE(service.getSystemCreationClassName(text));
+    EXPECT_EQ(text, "VESKA_ComputerSystem");
+}
+
+TEST_F(TimeServiceTest, HasNoRegionAndLeavesTheArgumentUnchanged) {
+    TimeService service;
+    std::string region = "before";
+    EXPECT_FALSE(service.getRegion(region));
+    EXPECT_EQ(region, "before");
+    EXPECT_FALSE(service.setRegion("Europe"));
+}
+
+TEST_F(TimeServiceTest, TellsDaylightSavingByTheHostsNumber) {
+    for (const unsigned number : {0U, 1U, 2U, 4294967295U}) {
+        test::Node computer = test::computer(0, "node7");
+        computer.properties[200] = number;
+        test::simulate({computer});
+        bool automatic = number == 0;
+        EXPECT_TRUE(TimeService().getAutomaticDSTAdjustment(automatic));
+        EXPECT_EQ(automatic, number != 0) << number;
+    }
+}
+
+TEST_F(TimeServiceTest, StoresFalseWhenDaylightSavingIsUnknown) {
+    test::Node without = test::computer(0, "node7");
+    without.properties.erase(200);
+    test::Node asText = test::computer(0, "node7");
+    asText.properties[200] = "1";
+    for (const std::vector<test::Node>& nodes : {std::vector{without}, std::vector{asText}, {}}) {
+        test::simulate(nodes);
+        bool automatic = true;
+        EXPECT_FALSE(TimeService().getAutomaticDSTAdjustment(automatic));
+        EXPECT_FALSE(automatic);
+    }
+}
+
+TEST_F(TimeServiceTest, WritesDaylightSavingAsOneOrZero) {
+    EXPECT_TRUE(TimeService().setAutomaticDSTAdjustment(true));
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 200), 1);
+    EXPECT_TRUE(TimeService().setAutomaticDSTAdjustment(false));
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 200), 0);
+}
+
+TEST_F(TimeServiceTest, AnswersFalseWhenDaylightSavingCannotBeWritten) {
+    test::Node computer = test::computer(0, "node7");
+    computer.failWrites = {200};
+    test::simulate({computer});
+    EXPECT_FALSE(TimeService().setAutomaticDSTAdjustment(true));
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 200), 0);
+    test::simulate({});
+    EXPECT_FALSE(TimeService().setAutomaticDSTAdjustment(true));
+}
+
+TEST_F(TimeServiceTest, TakesTheFirstLineOfACommandsOutput) {
+    TimeService service;
+    std::string output = "before";
+    EXPECT_TRUE(service.executeCommand("printf 'one\\ntwo\\n'", "r", output));
+    EXPECT_EQ(output, "one\n");
+    EXPECT_TRUE(service.executeCommand("true", "r", output));
+    EXPECT_EQ(output, "");
+    EXPECT_TRUE(service.executeCommand("echo text; exit 7", "r", output));
+    EXPECT_EQ(output, "text\n");
+    EXPECT_TRUE(service.executeCommand("echo text >&2", "r", output));
+    EXPECT_EQ(output, "");
+    EXPECT_TRUE(service.executeCommand("printf 'one\\0two\\n'", "r", output));
+    EXPECT_EQ(output, "one");
+}
+
+TEST_F(TimeServiceTest, TakesNoMoreThan511BytesOfALine) {
+    std::string output;
+    EXPECT_TRUE(TimeService().executeCommand("printf '%01000d\\n' 1", "r", output));
+    EXPECT_EQ(output, std::string(511, '0'));
+}
+
+TEST_F(TimeServiceTest, LeavesTheOutputAloneWhenACommandCannotBeStarted) {
+    test::refuseToStart("echo");
+    std::string output = "before";
+    EXPECT_FALSE(TimeService().executeCommand("echo text", "r", output));
+    EXPECT_EQ(output, "before");
+}
+
+TEST_F(TimeServiceTest, HandsTheModeOn) {
+    std::string output;
+    TimeService().executeCommand("true", "re", output);
+    EXPECT_THAT(test::takeShellCalls(), ElementsAre("popen re: true"));
+}
+
+TEST_F(TimeServiceTest, StopsNothingWhereNoDaemonRuns) {
+    EXPECT_EQ(TimeService().StopService(), 0U);
+    EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps));
+    EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]"));
+}
+
+TEST_F(TimeServiceTest, StartsNothingWhereADaemonRuns) {
+    runDaemon();
+    EXPECT_EQ(TimeService().StartService(), 0U);
+    EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps));
+}
+
+TEST_F(TimeServiceTest, FailsWhenTheInitScriptCannotBeStarted) {
+    EXPECT_EQ(TimeService().StartService(), 2U);
+    EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps, "popen r: /etc/init.d/ntp start"));
+    runDaemon();
+    EXPECT_EQ(TimeService().StopService(), 2U);
+    EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps, "popen r: /etc/init.d/ntp stop"));
+}
+
+TEST_F(TimeServiceTest, KnowsADaemonByItsNameInAnyCase) {
+    runDaemon("ntp 812 1 /opt/NTPD");
+    EXPECT_EQ(TimeService().StartService(), 0U);
+    runDaemon("root 900 899 grep -i ntpd");
+    EXPECT_EQ(TimeService().StopService(), 0U);
+}
+
+TEST_F(TimeServiceTest, CountsAProcessListThatCannotBeStartedAsNotRunning) {
+    runDaemon();
+    test::refuseToStart("ps -ef");
+    EXPECT_EQ(TimeService().StopService(), 0U);
+    EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps));
+}
+
+TEST_F(TimeServiceTest, SynchronisesByTheFirstLineWhereNoDaemonRuns) {
+    const struct {
+        std::vector<std::string> printed;
+        unsigned int result;
+    } table[] = {
+        {{"ntpd: time slew +0.001200s"}, 0},
+        {{"ntpd: time set -3.500000s"}, 0},
+        {{"2026-11-21T06:00:00 ntpd[7]: ntpd: time slew +0.0s", "more"}, 0},
+        {{"ntpd: time sle"}, 2},
+        {{"ntpd: time  set"}, 2},
+        {{"NTPD: TIME SET"}, 2},
+        {{"ntpd: no servers found"}, 2},
+        {{""}, 2},
+        {{}, 2},
+        {{"2026-11-21T06:00:00 ntpd[7]: INIT", "ntpd: time slew +0.001200s"}, 2},
+    };
+    for (const auto& row : table) {
+        commands.add("ntpd", test::printing(row.printed) + "exit 1");
+        EXPECT_EQ(TimeService().SyncClock(), row.result) << testing::PrintToString(row.printed);
+        EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps, synchronise));
+        EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "ntpd [-xgq]"));
+    }
+}
+
+TEST_F(TimeServiceTest, FailsWhenTheSynchronisationCannotBeStarted) {
+    test::refuseToStart("ntpd -xgq");
+    EXPECT_EQ(TimeService().SyncClock(), 2U);
+}
+
+TEST_F(TimeServiceTest, SetsOffsetAndTimeAndSynchronises) {
+    long time = 1704106800;
+    unsigned int offset = 60;
+    EXPECT_EQ(TimeService().manageTime(time, offset), 0U);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 127), 60);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 126), "20240101110000.000000+000");
+    EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "ntpd [-xgq]"));
+}
+
+TEST_F(TimeServiceTest, AnswersTheSynchronisationsFailureWithOffsetAndTimeSet) {
+    commands.add("ntpd", test::printing({"ntpd: no servers found"}));
+    long time = 1704106800;
+    unsigned int offset = static_cast<unsigned int>(-300);
+    EXPECT_EQ(TimeService().manageTime(time, offset), 2U);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 127), 4294966996U);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 126), "20240101110000.000000+000");
+}
+
+TEST_F(TimeServiceTest, WritesNoTimeAndRunsNothingWhenTheOffsetCannotBeWritten) {
+    test::Node computer = test::computer(0, hostName());
+    computer.failWrites = {127};
+    test::simulate({computer});
+    long time = 1704106800;
+    unsigned int offset = 120;
+    EXPECT_EQ(TimeService().manageTime(time, offset), 2U);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 127), 60);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 126), "");
+    EXPECT_THAT(test::takeShellCalls(), IsEmpty());
+    EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(
+                                     " LOG 3000 .* TimeService:[0-9]+ manageTime: .*setProperty::timezone failed!!$")));
+}
+
+TEST_F(TimeServiceTest, RunsNothingWhenTheTimeCannotBeWritten) {
+    test::Node computer = test::computer(0, hostName());
+    computer.failWrites = {126};
+    test::simulate({computer});
+    long time = 1704106800;
+    unsigned int offset = 120;
+    EXPECT_EQ(TimeService().manageTime(time, offset), 2U);
+    EXPECT_EQ(test::simulatedProperty("/computer/0", 127), 120) << "the offset is written first";
+    EXPECT_THAT(test::takeShellCalls(), IsEmpty());
+    EXPECT_THAT(test::takeLog(),
+                Contains(ContainsRegex(" LOG 3000 .* TimeService:[0-9]+ manageTime: .*setProperty::Time failed!!$")));
+}
+
+} // namespace
