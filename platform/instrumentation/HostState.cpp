@@ -63,10 +63,14 @@ bool hasUncorrectableMemoryErrors(const Root& root) {
     return false;
 }
 
+std::optional<Zone> zoneOfFile(const Root& root, const std::string& path) {
+    const Root::Contents real = root.resolve(path);
+    if (!real || !isTrusted(root, real.text)) return std::nullopt;
+    return parseZoneFile(root.read(real.text).text);
+}
+
 Zone zoneInForce(const Root& root) {
-    const Root::Contents path = root.resolve(LOCAL_TIME);
-    if (!path || !isTrusted(root, path.text)) return {};
-    return parseZoneFile(root.read(path.text).text).value_or(Zone());
+    return zoneOfFile(root, LOCAL_TIME).value_or(Zone());
 }
 
 int offsetInForce(const Root& root) {

@@ -20,6 +20,11 @@ namespace Inside __attribute__((visibility("hidden"))) {
     /// Whether any memory controller has counted an error that could not be corrected.
     bool hasUncorrectableMemoryErrors(const Root& root);
 
+    /// The zone of a zone file, links followed. Nothing when it is missing, broken, no zone file, or neither
+    /// /etc/localtime
+    /// itself nor one of the zone folder.
+    std::optional<Zone> zoneOfFile(const Root& root, const std::string& path);
+
     /// The zone that /etc/localtime puts into force. UTC when it is missing, broken, no zone file, or neither a file
     /// there nor one of the zone folder.
     Zone zoneInForce(const Root& root);

@@ -1,8 +1,10 @@
 #include "instrumentation/RealHost.h"
 
+#include "instrumentation/Clock.h"
 #include "instrumentation/HostNodes.h"
 #include "instrumentation/HostState.h"
 #include "instrumentation/Log.h"
+#include "instrumentation/ZoneChange.h"
 #include "vk/NodeLexicon.h"
 
 #include <algorithm>
@@ -58,9 +60,18 @@ std::optional<Value> RealHost::read(const Node& node, unsigned int property) {
     return node.type == NodeLexicon::ComputerSystemNode ? changingProperty(root, property) : std::nullopt;
 }
 
-bool RealHost::write(const Node& node, unsigned int property, const Value&) {
+bool RealHost::write(const Node& node, unsigned int property, const Value& value) {
+    const std::string* text = std::get_if<std::string>(&value);
+    const unsigned int* number = std::get_if<unsigned int>(&value);
+    if (node.type == NodeLexicon::ComputerSystemNode) {
+        if (property == NodeLexicon::SystemTimeProperty && text != nullptr) return changeClock(root, *text);
+        if (property == NodeLexicon::GmtOffsetProperty && number != nullptr)
+            return changeOffset(root, static_cast<int>(*number)); // two's complement
+        if (property == NodeLexicon::AutomaticDSTAdjustmentProperty && number != nullptr && *number <= 1)
+            return changeDaylightSaving(root, *number == 1);
+    }
     logLine(FAILURE, "setProperty", __LINE__,
-            "property " + std::to_string(property) + " of " + node.path + " cannot be written");
+            "property " + std::to_string(property) + " of " + node.path + " cannot be written so");
     return false;
 }
 

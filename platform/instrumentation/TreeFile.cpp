@@ -2,23 +2,19 @@
 
 #include "common/FileDescriptor.h"
 #include "instrumentation/AtomicFile.h"
+#include "instrumentation/FileLock.h"
 #include "instrumentation/Log.h"
 
+#include <algorithm>
 #include <cerrno>
-#include <chrono>
 #include <cstdlib>
 #include <fcntl.h>
 #include <memory>
-#include <sys/file.h>
-#include <thread>
 
 namespace VK {
 namespace Inside {
 
 namespace {
-
-constexpr std::chrono::seconds LONGEST_WAIT{10};
-constexpr std::chrono::milliseconds BETWEEN_TRIES{5};
 
 TreeFileContents unusable(int error) {
     TreeFileContents contents;
@@ -38,22 +34,6 @@ int readBytes(int fd, std::size_t limit, std::string& text) {
         if (count < 0 && errno != EINTR) return errno;
     }
     return 0;
-}
-
-/// The lock, or none after the longest wait; then errno tells why.
-FileDescriptor lockFile(const std::string& file) {
-    FileDescriptor lock(::open((file + ".lock").c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
-    if (!lock) return lock;
-    const auto end = std::chrono::steady_clock::now() + LONGEST_WAIT;
-    while (flock(lock.get(), LOCK_EX | LOCK_NB) != 0) {
-        if (errno != EWOULDBLOCK && errno != EINTR) return FileDescriptor();
-        if (std::chrono::steady_clock::now() >= end) {
-            errno = EWOULDBLOCK;
-            return FileDescriptor();
-        }
-        std::this_thread::sleep_for(BETWEEN_TRIES);
-    }
-    return lock;
 }
 
 std::string withoutLinks(const std::string& file) {
@@ -80,8 +60,8 @@ TreeFileContents readTreeFile(const std::string& file, std::size_t limit) {
 
 std::string replaceTreeFile(const std::string& file, std::size_t limit, const TreeChange& change) {
     const std::string real = withoutLinks(file);
-    const FileDescriptor lock = lockFile(real);
-    if (!lock) return "cannot lock " + real + ".lock: " + errorText(errno);
+    const FileLock lock(AT_FDCWD, real + ".lock");
+    if (lock.error() != 0) return "cannot lock " + real + ".lock: " + errorText(lock.error());
     const TreeFileContents now = readTreeFile(real, limit);
     if (!now.problem.empty()) return now.problem;
     std::string problem;
