@@ -32,7 +32,8 @@ CMPIArray* getArray(const CMPIError* handle, CMPIStatus*) {
 
 template <Text Attributes::*Member>
 CMPIStatus setText(const CMPIError* handle, const char* value) {
-    open<ErrorObject>(handle).attributes.*Member = text(value);
+    auto& self = open<ErrorObject>(handle);
+    self.attributes.*Member = text(value);
     return status(CMPI_RC_OK);
 }
 

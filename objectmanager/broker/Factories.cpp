@@ -36,7 +36,8 @@ CMPIArgs* newArgs(const CMPIBroker* handle, CMPIStatus*) {
 }
 
 CMPIString* newStringSlot(const CMPIBroker* handle, const char* chars, CMPIStatus*) {
-    return newString(open(handle), text(chars));
+    Broker& broker = open(handle);
+    return newString(broker, text(chars));
 }
 
 CMPIArray* newArray(const CMPIBroker* handle, CMPICount size, CMPIType type, CMPIStatus*) {
@@ -72,7 +73,9 @@ CMPISelectExp* newSelectExp(const CMPIBroker* handle, const char*, const char*, 
 }
 
 bool classPathIsA(const CMPIBroker* handle, const CMPIObjectPath* path, const char* className, CMPIStatus*) {
-    return open(handle).schema().isA(open<PathObject>(path).path.className, text(className));
+    const Schema& schema = open(handle).schema();
+    const ObjectPath& given = open<PathObject>(path).path;
+    return schema.isA(given.className, text(className));
 }
 
 CMPIString* toString(const CMPIBroker* handle, const void* object, CMPIStatus*) {
@@ -86,7 +89,8 @@ bool isOfType(const CMPIBroker* handle, const void* object, const char* typeName
 }
 
 CMPIString* getType(const CMPIBroker* handle, const void* object, CMPIStatus*) {
-    return newString(open(handle), typeNameOf(object));
+    Broker& broker = open(handle);
+    return newString(broker, typeNameOf(object));
 }
 
 // Nothing is written: the object manager's output is its answer, and a provider has a log of its own.

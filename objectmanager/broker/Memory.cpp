@@ -120,8 +120,9 @@ void* resize(const CMPIBroker* broker, void* pointer, std::size_t size) {
 }
 
 char* duplicate(const CMPIBroker* broker, const char* chars) {
+    Broker& owner = open(broker);
     const std::size_t size = std::strlen(text(chars)) + 1;
-    void* copy = open(broker).memory.allocate(size);
+    void* copy = owner.memory.allocate(size);
     return copy == nullptr ? nullptr : static_cast<char*>(std::memcpy(copy, chars, size));
 }
 

@@ -12,7 +12,8 @@ namespace {
 /// Setter and getter of one text of the path.
 template <std::string ObjectPath::*Member>
 CMPIStatus set(const CMPIObjectPath* handle, const char* value) {
-    open<PathObject>(handle).path.*Member = text(value);
+    auto& self = open<PathObject>(handle);
+    self.path.*Member = text(value);
     return status(CMPI_RC_OK);
 }
 

@@ -31,7 +31,7 @@ Request requestFor(Operation operation, const CMPIObjectPath* path) {
     return request;
 }
 
-/// Fails with the answer's code. The message goes to the caller's status, which the slot would clear.
+/// A status other than OK is the up-call's; its message is not passed on.
 Answer ask(const CMPIBroker* handle, const CMPIContext* context, const Request& request) {
     Broker& broker = open(handle);
     const auto& entries = open<ContextObject>(context).entries;
@@ -159,23 +159,21 @@ CMPIEnumeration* referenceNames(const CMPIBroker* handle, const CMPIContext* con
     return enumerate(handle, context, associationRequest(Operation::ReferenceNames, path, resultClass, role), CMPI_ref);
 }
 
-/// A value that no object of the provider's has as its part: it belongs to the present call.
-CMPIData giveAway(Broker& broker, Value value) {
+/// A value that belongs to the present call alone.
+CMPIData giveAway(Broker& broker, const Value& value) {
     auto& holder = make<ArgsObject>(broker, std::vector<NamedValue>());
     return give(holder, value);
 }
 
 CMPIData invokeMethod(const CMPIBroker* handle, const CMPIContext* context, const CMPIObjectPath* path,
-                      const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus* rc) {
+                      const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus*) {
     Request request = requestFor(Operation::InvokeMethod, path);
     request.method = text(method);
     request.values = open<ArgsObject>(in).values;
     auto& target = open<ArgsObject>(out);
     Answer answer = ask(handle, context, request);
     target.values = std::move(answer.out);
-    if (answer.returnValue) return giveAway(open(handle), std::move(*answer.returnValue));
-    report(rc, CMPI_RC_OK);
-    return giveAway(open(handle), Value());
+    return giveAway(open(handle), answer.returnValue ? std::move(*answer.returnValue) : Value());
 }
 
 /// Properties go through whole instances, as providers serve those.

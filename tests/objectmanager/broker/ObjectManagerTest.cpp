@@ -4,6 +4,7 @@
 
 #include <gmock/gmock.h>
 
+#include <atomic>
 #include <thread>
 
 namespace om {
@@ -220,6 +221,9 @@ TEST_F(ObjectManagerTest, TheTimeOfTheProvidersFunctionIsTaken) {
 }
 
 TEST_F(ObjectManagerTest, ThreadsCallAtOnce) {
+    // The usual factories all write the same variable of the provider.
+    manager.instanceMI();
+    manager.methodMI();
     std::vector<std::thread> threads;
     std::atomic<int> right{0};
     for (int t = 0; t < 8; ++t) {

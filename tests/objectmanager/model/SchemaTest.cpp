@@ -1,0 +1,98 @@
+#include "objectmanager/model/Schema.h"
+
+#include <gtest/gtest.h>
+
+#include <set>
+
+namespace om {
+namespace {
+
+TEST(SchemaTest, NamesCompareWithoutRegardToCase) {
+    const Schema& schema = Schema::builtin();
+    ASSERT_NE(schema.find("veska_COMPUTERsystem"), nullptr);
+    EXPECT_EQ(schema.find("veska_COMPUTERsystem")->name, "VESKA_ComputerSystem");
+    EXPECT_EQ(schema.findProperty("veska_computersystem", "operationalSTATUS")->type, CMPI_uint16A);
+    EXPECT_EQ(schema.find("VESKA_"), nullptr);
+    EXPECT_EQ(schema.find(""), nullptr);
+}
+
+TEST(SchemaTest, IsAGoesUpTheLineOfInheritance) {
+    const Schema& schema = Schema::builtin();
+    EXPECT_TRUE(schema.isA("VESKA_TimeService", "cim_managedelement"));
+    EXPECT_TRUE(schema.isA("VESKA_TimeService", "VESKA_TimeService"));
+    EXPECT_TRUE(schema.isA("VESKA_ComputerSystemPackage", "CIM_Dependency"));
+    EXPECT_FALSE(schema.isA("CIM_Service", "VESKA_TimeService"));
+    EXPECT_FALSE(schema.isA("VESKA_TimeService", "CIM_System"));
+    EXPECT_FALSE(schema.isA("Unknown", "Unknown"));
+    EXPECT_FALSE(schema.isA("VESKA_TimeService", ""));
+}
+
+std::set<std::string> keysOf(const char* className) {
+    std::set<std::string> keys;
+    for (const PropertyDeclaration* key : Schema::builtin().resolve(className)->keys) keys.insert(key->name);
+    return keys;
+}
+
+TEST(SchemaTest, KeysOfTheServedClasses) {
+    using Names = std::set<std::string>;
+    EXPECT_EQ(keysOf("VESKA_ComputerSystem"), (Names{"CreationClassName", "Name"}));
+    EXPECT_EQ(keysOf("VESKA_PhysicalPackage"), (Names{"CreationClassName", "Tag"}));
+    EXPECT_EQ(keysOf("VESKA_EnabledLogicalElementCapabilities"), (Names{"InstanceID"}));
+    EXPECT_EQ(keysOf("VESKA_TimeService"),
+              (Names{"CreationClassName", "Name", "SystemCreationClassName", "SystemName"}));
+    EXPECT_EQ(keysOf("VESKA_CIMServiceConfig"), (Names{"CreationClassName", "Name"}));
+    EXPECT_EQ(keysOf("VESKA_ComputerCapabilities"), (Names{"Capabilities", "ManagedElement"}));
+    EXPECT_EQ(keysOf("VESKA_ComputerSystemPackage"), (Names{"Antecedent", "Dependent"}));
+    EXPECT_EQ(keysOf("VESKA_TimeServiceAffectsElement"), (Names{"AffectedElement", "AffectingElement"}));
+}
+
+TEST(SchemaTest, TheNearestDeclarationCounts) {
+    const Schema& schema = Schema::builtin();
+    EXPECT_EQ(schema.findProperty("VESKA_ComputerSystemPackage", "Antecedent")->referenceClass, "CIM_PhysicalPackage");
+    EXPECT_EQ(schema.findProperty("CIM_SystemPackaging", "Antecedent")->referenceClass, "CIM_PhysicalElement");
+    EXPECT_FALSE(schema.findProperty("CIM_ManagedElement", "InstanceID")->key);
+    EXPECT_TRUE(schema.findProperty("CIM_Capabilities", "InstanceID")->key);
+}
+
+TEST(SchemaTest, PropertiesOfOurOwnClasses) {
+    const Schema& schema = Schema::builtin();
+    EXPECT_EQ(schema.findProperty("VESKA_ComputerSystem", "UUID")->type, CMPI_string);
+    EXPECT_EQ(schema.findProperty("CIM_ComputerSystem", "UUID"), nullptr);
+    EXPECT_EQ(schema.findProperty("VESKA_EnabledLogicalElementCapabilities", "StateAwareness")->type, CMPI_uint16A);
+    EXPECT_EQ(schema.findProperty("VESKA_TimeService", "AutomaticDSTAdjustment")->type, CMPI_boolean);
+    EXPECT_EQ(schema.findProperty("VESKA_TimeService", "Region")->type, CMPI_uint16);
+    EXPECT_EQ(schema.findProperty("VESKA_CIMServiceConfig", "deliveryRetryIntervalSec")->type, CMPI_uint32);
+}
+
+TEST(SchemaTest, MethodsAreInheritedWithTheirParameters) {
+    const MethodDeclaration* manage = Schema::builtin().findMethod("VESKA_TimeService", "managetime");
+    ASSERT_NE(manage, nullptr);
+    ASSERT_EQ(manage->parameters.size(), 3U);
+    EXPECT_EQ(manage->parameters[1].type, CMPI_dateTime);
+    EXPECT_TRUE(manage->parameters[1].in && manage->parameters[1].out);
+    EXPECT_TRUE(manage->parameters[2].in && !manage->parameters[2].out);
+    EXPECT_EQ(manage->parameters[2].referenceClass, "CIM_ManagedElement");
+    EXPECT_NE(Schema::builtin().findMethod("VESKA_TimeService", "StopService"), nullptr);
+    EXPECT_EQ(Schema::builtin().findMethod("VESKA_CIMServiceConfig", "SetCIMconfig")->parameters.size(), 2U);
+    EXPECT_EQ(Schema::builtin().findMethod("VESKA_ComputerSystem", "ManageTime"), nullptr);
+}
+
+TEST(SchemaTest, EverySuperclassAndClassReferredToIsThere) {
+    const Schema& schema = Schema::builtin();
+    for (const ClassDeclaration& each : schema.classes()) {
+        EXPECT_TRUE(each.superclass.empty() || schema.find(each.superclass) != nullptr) << each.name;
+        for (const PropertyDeclaration& property : each.properties) {
+            EXPECT_EQ(property.type == CMPI_ref, schema.find(property.referenceClass) != nullptr) << property.name;
+        }
+    }
+    EXPECT_EQ(schema.classes().size(), 25U);
+}
+
+TEST(SchemaTest, AClassThatIsItsOwnAncestorEndsNoWalk) {
+    const Schema circle({{"A", "B", false, {}, {}}, {"B", "A", false, {}, {}}});
+    EXPECT_TRUE(circle.isA("A", "B"));
+    EXPECT_FALSE(circle.isA("A", "C"));
+}
+
+} // namespace
+} // namespace om
