@@ -62,6 +62,8 @@ MI* ProviderLibrary::create(const char* kind) {
         mi = factory(broker.handle(), &newContext(broker), &made);
     } catch (const std::exception& error) {
         throw LoadError(name + " threw: " + error.what());
+    } catch (...) {
+        throw LoadError(name + " threw an exception");
     }
     if (made.rc != CMPI_RC_OK) {
         const std::string text = isValid<StringObject>(made.msg) ? ": " + open<StringObject>(made.msg).text() : "";

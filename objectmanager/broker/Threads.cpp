@@ -56,8 +56,10 @@ int threadSleep(CMPIUint32 milliseconds) {
     return error;
 }
 
-/// The variable starts as 0; others wait until the function of the first has returned.
+/// The variable starts as 0; others wait until the function of the first has returned. If that ends by an exception
+/// or with its thread, the next one runs it again.
 int threadOnce(int* once, void (*initialise)()) {
+    constexpr int Fresh = 0;
     constexpr int Done = 1;
     constexpr int Running = 2;
     if (once == nullptr || initialise == nullptr) return EINVAL;
@@ -69,10 +71,18 @@ int threadOnce(int* once, void (*initialise)()) {
     if (__atomic_load_n(once, __ATOMIC_RELAXED) == Done) return 0;
     __atomic_store_n(once, Running, __ATOMIC_RELAXED);
     lock.unlock();
-    initialise();
-    lock.lock();
-    __atomic_store_n(once, Done, __ATOMIC_RELEASE);
-    changed.notify_all();
+    const auto finish = [&](int state) {
+        lock.lock();
+        __atomic_store_n(once, state, __ATOMIC_RELEASE);
+        changed.notify_all();
+    };
+    try {
+        initialise();
+    } catch (...) {
+        finish(Fresh);
+        throw;
+    }
+    finish(Done);
     return 0;
 }
 

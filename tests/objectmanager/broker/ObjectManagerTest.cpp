@@ -264,6 +264,14 @@ TEST(ObjectManagerLoading, AFactoryIsCalledWhenItIsNeededFirst) {
     EXPECT_THROW(manager.methodMI(), LoadError);
 }
 
+TEST(ObjectManagerLoading, AnExceptionOfTheProviderIsAFailure) {
+    ObjectManager manager(THROWING_PROVIDER, "Throwing", "root/test");
+    const Answer answer = manager.run(request(Operation::EnumInstances));
+    EXPECT_EQ(answer.code, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(answer.message, "the provider threw an exception");
+    EXPECT_THROW(manager.methodMI(), LoadError);
+}
+
 TEST(ObjectManagerLoading, AFunctionLeftNullIsNotSupported) {
     ObjectManager manager(Library, "Empty", "root/test");
     EXPECT_EQ(manager.run(request(Operation::EnumInstances)).code, CMPI_RC_ERR_NOT_SUPPORTED);

@@ -82,6 +82,18 @@ TEST_F(Threads, AFunctionRunsOnceHoweverManyAsk) {
     EXPECT_EQ(initialised, 1);
 }
 
+TEST_F(Threads, AFunctionThatThrowsRunsAgain) {
+    initialised = 0;
+    int variable = 0;
+    const auto throwFirst = [] {
+        if (++initialised == 1) throw 1;
+    };
+    EXPECT_NE(xft->threadOnce(&variable, throwFirst), 0);
+    EXPECT_EQ(xft->threadOnce(&variable, throwFirst), 0);
+    EXPECT_EQ(xft->threadOnce(&variable, throwFirst), 0);
+    EXPECT_EQ(initialised, 2);
+}
+
 TEST_F(Threads, KeysHaveFourBytesAndValuesForEachThread) {
     struct {
         CMPIUint32 key = 0;
