@@ -9,9 +9,15 @@ namespace NVLog {
 /// Where lines go and which are kept is read once per process, with secure_getenv:
 /// `NVLOG_SINK` (`syslog`, `stderr`, `file:PATH`, `none`; default `syslog`), `NVLOG_LEVELS` (comma-separated levels
 /// or `all`; default `3000,6000`) and `NVLOG_CHANNELS` (`log`, `trace` or both; default `log` for syslog, else both).
+/// An unknown sink means syslog; entries of a list that cannot be used are passed over, and a list without any usable
+/// one means the default. A list of more than 64 levels keeps all.
 ///
-/// Both operations may be called from any thread at any time. They never throw, never start a thread and never call
-/// openlog or closelog; a sink that cannot be opened falls back to syslog. A dropped line costs one table look-up.
+/// A file is made with mode 0640 (less the umask) and opened again when its inode changes or it vanishes; each line is
+/// one appending write. A line that its sink does not take, because it cannot be opened, is full, or would have to be
+/// waited for, goes to syslog instead; there, trace lines are kept only where `NVLOG_CHANNELS` names `trace`.
+///
+/// Both operations may be called from any thread at any time, and in the child of a fork. They never throw, wait, start
+/// a thread, raise a signal, change errno, or call openlog or closelog. A dropped line costs one table look-up.
 class NVLogger {
 public:
     /// Writes one line to the log channel. `function`, `file` and `line` tell where the event happened, `category`

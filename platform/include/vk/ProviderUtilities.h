@@ -48,10 +48,11 @@ public:
     static bool setKeyProperty(CMPIObjectPath* objectPath, const char* name, const std::string& value);
     static bool setKeyProperty(CMPIObjectPath* objectPath, const char* name, CMPIObjectPath* value);
 
-    /// Appends the path's keys to the moniker, in order: text as it is, integers and booleans as text; references and
-    /// nulls are left out. False when the broker would not tell the keys.
+    /// Appends the path's keys to the moniker, in order: text as it is, integers in decimal, booleans as `TRUE` and
+    /// `FALSE`; references, nulls and other kinds are left out. False when the broker would not tell the keys.
     static bool transformObjectPathToMoniker(const CMPIObjectPath* objectPath, Moniker& moniker);
-    /// Adds the moniker's pairs to the path as text keys, in order; false when one was refused.
+    /// Adds the moniker's pairs to the path as text keys, in order; false when one was refused. The moniker's cursor
+    /// stands on its first pair then.
     static bool transformMonikerToObjectPath(Moniker& moniker, CMPIObjectPath** objectPath);
 
     /// A new instance of that path, or null.
