@@ -13,11 +13,11 @@ namespace NVLog {
 /// one means the default. A list of more than 64 levels keeps all.
 ///
 /// A file is made with mode 0640 (less the umask) and opened again when its inode changes or it vanishes; each line is
-/// one appending write. A line that its sink does not take, because it cannot be opened, is full, or would have to be
-/// waited for, goes to syslog instead; there, trace lines are kept only where `NVLOG_CHANNELS` names `trace`.
+/// one appending write. A line that its sink does not take, because it cannot be opened, is full, or (a pipe named as
+/// file) has no room, goes to syslog instead; there, trace lines are kept only where `NVLOG_CHANNELS` names `trace`.
 ///
-/// Both operations may be called from any thread at any time, and in the child of a fork. They never throw, wait, start
-/// a thread, raise a signal, change errno, or call openlog or closelog. A dropped line costs one table look-up.
+/// Both operations may be called from any thread at any time, and in the child of a fork. They never throw, start a
+/// thread, raise a signal, change errno, or call openlog or closelog. A dropped line costs one table look-up.
 class NVLogger {
 public:
     /// Writes one line to the log channel. `function`, `file` and `line` tell where the event happened, `category`
