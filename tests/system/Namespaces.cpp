@@ -1,0 +1,100 @@
+#include "system/Namespaces.h"
+
+#include <gmock/gmock.h>
+
+#include <cerrno>
+#include <csignal>
+#include <cstring>
+#include <fstream>
+#include <sched.h>
+#include <stdexcept>
+#include <sys/mount.h>
+#include <sys/prctl.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace test {
+namespace {
+
+/// Why the tests cannot run; empty where they can.
+std::string reason = "the test program was started without namespaces";
+
+std::string failure(const std::string& what) {
+    return what + ": " + std::strerror(errno);
+}
+
+void checked(int result, const std::string& what) {
+    if (result != 0) throw std::runtime_error(failure(what));
+}
+
+bool write(const std::string& path, const std::string& text) {
+    std::ofstream file(path);
+    file << text << std::flush;
+    return file.good();
+}
+
+/// New namespaces for what this process starts: as root by right, else within a user namespace in which it is root.
+bool leaveHost() {
+    constexpr int wanted = CLONE_NEWNS | CLONE_NEWUTS | CLONE_NEWPID;
+    if (unshare(wanted) == 0) return true;
+    const std::string user = std::to_string(geteuid());
+    const std::string group = std::to_string(getegid());
+    return unshare(wanted | CLONE_NEWUSER) == 0 && write("/proc/self/setgroups", "deny") &&
+           write("/proc/self/uid_map", "0 " + user + " 1") && write("/proc/self/gid_map", "0 " + group + " 1");
+}
+
+int runTests() {
+    const int result = RUN_ALL_TESTS();
+    std::fflush(nullptr);
+    return result;
+}
+
+/// The first process of the new namespaces.
+[[noreturn]] void runInside() {
+    prctl(PR_SET_PDEATHSIG, SIGKILL);
+    if (mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0)
+        reason = failure("mounts cannot be made private");
+    else if (mount("proc", "/proc", "proc", MS_NOSUID | MS_NOEXEC | MS_NODEV, nullptr) != 0)
+        reason = failure("/proc cannot be mounted");
+    else
+        reason.clear();
+    std::exit(runTests());
+}
+
+int runInNamespaces() {
+    if (!leaveHost()) {
+        reason = failure("this machine allows no namespaces");
+        return runTests();
+    }
+    const pid_t first = fork();
+    if (first == 0) runInside();
+    int status = 0;
+    while (waitpid(first, &status, 0) < 0)
+        if (errno != EINTR) return 1;
+    return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+}
+
+} // namespace
+
+void NamespaceTest::SetUp() {
+    if (!reason.empty()) GTEST_SKIP() << reason;
+}
+
+CoveredFolder::CoveredFolder(const std::filesystem::path& theFolder) : folder(theFolder) {
+    checked(mount("tmpfs", folder.c_str(), "tmpfs", MS_NOSUID | MS_NODEV, "mode=755"), "covering " + folder.string());
+}
+
+CoveredFolder::~CoveredFolder() {
+    umount2(folder.c_str(), MNT_DETACH);
+}
+
+void nameHost(const std::string& name) {
+    checked(sethostname(name.data(), name.size()), "naming the host");
+}
+
+} // namespace test
+
+int main(int count, char** arguments) {
+    testing::InitGoogleMock(&count, arguments);
+    return testing::GTEST_FLAG(list_tests) ? RUN_ALL_TESTS() : test::runInNamespaces();
+}

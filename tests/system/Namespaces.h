@@ -1,0 +1,34 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+
+namespace test {
+
+/// Runs the program's tests in namespaces of their own: what they mount, the host's name and the processes that they
+/// see are theirs alone. The program's main, which links this, enters them before the first test.
+class NamespaceTest : public testing::Test {
+protected:
+    /// Skips the test, and says why, where this machine allows no namespaces.
+    void SetUp() override;
+};
+
+/// A file system that lies over a folder of the host for as long as this lives; empty at first, and gone afterwards
+/// with everything in it.
+class CoveredFolder {
+public:
+    explicit CoveredFolder(const std::filesystem::path& folder);
+    ~CoveredFolder();
+    CoveredFolder(const CoveredFolder&) = delete;
+    CoveredFolder& operator=(const CoveredFolder&) = delete;
+
+private:
+    const std::filesystem::path folder;
+};
+
+/// Gives the namespaces' host a name.
+void nameHost(const std::string& name);
+
+} // namespace test
