@@ -220,7 +220,7 @@ HardwareFacts readHardware(const Root& root) {
                             fromSysfs(root, "product_serial", isPlaceholderSerial),
                             fromDeviceTree(root, "serial-number", isPlaceholderSerial), sysinfo["Sequence Code"]});
     facts.sku = firstOf({tables.system(&SmbiosSystem::sku), fromSysfs(root, "product_sku")});
-    facts.uuid = firstOf({tables.system(&SmbiosSystem::uuid), asUuid(fromSysfs(root, "product_uuid")),
+    facts.uuid = firstOf({asUuid(tables.system(&SmbiosSystem::uuid)), asUuid(fromSysfs(root, "product_uuid")),
                           asUuid(fromDeviceTree(root, "vm,uuid")), asUuid(fromXen(root))});
     facts.ownerContact = info["PRIMARY_OWNER_CONTACT"];
     facts.ownerName = info["PRIMARY_OWNER_NAME"];

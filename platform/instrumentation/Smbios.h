@@ -9,7 +9,7 @@
 namespace VK {
 namespace Inside __attribute__((visibility("hidden"))) {
 
-    /// What the tables say of the system. Texts are clean, but may be placeholders.
+    /// What the tables say of the system. Texts are clean, but may be placeholders; so may the UUID.
     struct SmbiosSystem {
         std::string manufacturer;
         std::string product;

@@ -40,7 +40,7 @@ std::string uuidFromBytes(std::string_view bytes, SmbiosVersion version) {
         text += DIGITS[byte >> 4];
         text += DIGITS[byte & 15];
     }
-    return unlessJunk(std::move(text));
+    return text;
 }
 
 std::string uuidFromText(std::string_view text) {

@@ -17,7 +17,7 @@ namespace Inside __attribute__((visibility("hidden"))) {
     };
 
     /// The 16 bytes of a system's UUID as text, in lower case. From version 2.6 on the first three fields are stored
-    /// little-endian. Empty unless there are 16 bytes, and for UUIDs that tell nothing.
+    /// little-endian. Empty unless there are 16 bytes.
     std::string uuidFromBytes(std::string_view bytes, SmbiosVersion version);
 
     /// A UUID that stands as text somewhere, trimmed and in lower case. Empty for other texts, and for UUIDs that tell

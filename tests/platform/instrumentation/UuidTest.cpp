@@ -23,10 +23,12 @@ TEST(Uuid, TakesSixteenBytes) {
 }
 
 TEST(Uuid, JunkIsNone) {
-    EXPECT_EQ(uuidFromBytes(std::string(16, '\0'), {3, 0}), "");
-    EXPECT_EQ(uuidFromBytes(std::string(16, '\xFF'), {3, 0}), "");
-    EXPECT_EQ(uuidFromBytes("\x00\x02\x00\x03\x00\x04\x00\x05\x00\x06\x00\x07\x00\x08\x00\x09"sv, {3, 0}), "");
-    EXPECT_EQ(uuidFromBytes("\x03\x02\x01\x00\x05\x04\x07\x06\x08\x09\x0A\x0B\x0C\x0D\x0E\x0F"sv, {2, 4}), "");
+    EXPECT_EQ(uuidFromText(uuidFromBytes(std::string(16, '\0'), {3, 0})), "");
+    EXPECT_EQ(uuidFromText(uuidFromBytes(std::string(16, '\xFF'), {3, 0})), "");
+    EXPECT_EQ(uuidFromText(uuidFromBytes("\x00\x02\x00\x03\x00\x04\x00\x05\x00\x06\x00\x07\x00\x08\x00\x09"sv, {3, 0})),
+              "");
+    EXPECT_EQ(uuidFromText(uuidFromBytes("\x03\x02\x01\x00\x05\x04\x07\x06\x08\x09\x0A\x0B\x0C\x0D\x0E\x0F"sv, {2, 4})),
+              "");
     EXPECT_EQ(uuidFromText("10000000-0000-8000-0040-000000000000"), "");
     EXPECT_EQ(uuidFromText("FEFEFEFE-FEFE-FEFE-FEFE-FEFEFEFEFEFE"), "");
 }

@@ -1,0 +1,179 @@
+#include "vk/Instrumentation.h"
+
+#include "support/SmbiosImage.h"
+#include "vk/HostFacts.h"
+
+#include <gtest/gtest.h>
+
+#include <chrono>
+#include <cstdlib>
+#include <functional>
+#include <unistd.h>
+
+namespace VK {
+
+namespace {
+
+using Lexicon = NodeLexicon;
+
+constexpr auto NAME = Lexicon::NameProperty;
+constexpr auto OFFSET = Lexicon::GmtOffsetProperty;
+
+/// A process chooses its host once: each test runs in one of its own, and fails by what it prints.
+#define IN_PROCESS_WITH(variable, value, body)                                                                         \
+    EXPECT_EXIT(                                                                                                       \
+        {                                                                                                              \
+            setenv(variable, (value).c_str(), 1);                                                                      \
+            body();                                                                                                    \
+            fflush(stdout);                                                                                            \
+            _exit(testing::Test::HasFailure() ? 1 : 0);                                                                \
+        },                                                                                                             \
+        testing::ExitedWithCode(0), "")
+
+class InstrumentationTest : public testing::Test {
+protected:
+    support::TemporaryDirectory directory;
+};
+
+TEST_F(InstrumentationTest, ACursorOnNothingKnowsNothing) {
+    directory.write("tree.json", R"({"nodes":[]})");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", directory.path("tree.json"), [] {
+        Instrumentation cursor;
+        std::string text = "before";
+        unsigned int number = 7;
+        bool readOnly = true;
+        EXPECT_FALSE(cursor);
+        EXPECT_FALSE(++cursor);
+        EXPECT_FALSE(cursor.getProperty(NAME, text));
+        EXPECT_FALSE(cursor.getProperty(NAME, number));
+        EXPECT_FALSE(cursor.setProperty(NAME, text));
+        EXPECT_FALSE(cursor.setProperty(NAME, number));
+        EXPECT_FALSE(cursor.isPropertyReadOnly(NAME, readOnly));
+        EXPECT_EQ(text, "before");
+        EXPECT_EQ(number, 7U);
+        EXPECT_TRUE(readOnly);
+        EXPECT_EQ(cursor.getNodeStatus(), 0U);
+        EXPECT_EQ(cursor.getNodeDescription(), "");
+        EXPECT_EQ(cursor.getPathToNode(), NodePath());
+        EXPECT_EQ(cursor.getPathToParentNode(), NodePath());
+        cursor.setFilter(Lexicon::NamePath, "/");
+        EXPECT_FALSE(cursor);
+    });
+}
+
+TEST_F(InstrumentationTest, ReadsAndWritesASimulatedHost) {
+    directory.write("tree.json", R"({"product":{"kvm":true,"uid":"u"},"nodes":[
+        {"type":40,"path":"/c","status":20,"description":"Rack","properties":{"108":"node7","127":60},"readOnly":[108]},
+        {"type":1,"path":"/c/x","parent":"/c"}]})");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", directory.path("tree.json"), [] {
+        Instrumentation cursor;
+        cursor.selectNode(Lexicon::ComputerSystemNode);
+        ASSERT_TRUE(bool(cursor));
+        EXPECT_EQ(cursor.getNodeStatus(), 20U);
+        EXPECT_EQ(cursor.getNodeDescription(), "Rack");
+        std::string text;
+        unsigned int number = 0;
+        EXPECT_TRUE(cursor.getProperty(NAME, text));
+        EXPECT_EQ(text, "node7");
+        EXPECT_FALSE(cursor.getProperty(NAME, number)); // it is a text
+        EXPECT_TRUE(cursor.getProperty(OFFSET, number));
+        EXPECT_EQ(number, 60U);
+        EXPECT_FALSE(cursor.getProperty(OFFSET, text)); // it is a number
+        EXPECT_EQ(text, "node7");
+        bool readOnly = false;
+        EXPECT_TRUE(cursor.isPropertyReadOnly(NAME, readOnly));
+        EXPECT_TRUE(readOnly);
+        number = 4294966996U;
+        EXPECT_TRUE(cursor.setProperty(OFFSET, number));
+        EXPECT_FALSE(cursor.setProperty(NAME, text));
+
+        Instrumentation chassis;
+        chassis.selectNode(std::string("/c/x"));
+        EXPECT_EQ(std::string(chassis.getPathToNode()), "/c/x");
+        EXPECT_EQ(chassis.getPathToParentNode(), cursor.getPathToNode());
+        chassis.selectNode(Lexicon::ComputerSystemNode);
+        chassis.setFilter(static_cast<Lexicon::PathType>(1), "/c"); // no other path type is known
+        EXPECT_FALSE(bool(chassis));
+        chassis.selectNode(Lexicon::ComputerSystemNode);
+        EXPECT_TRUE(chassis.getProperty(OFFSET, number));
+        EXPECT_EQ(number, 4294966996U);
+
+        EXPECT_EQ(Instrumentation::convertPathToString(Instrumentation::convertStringToPath("/c/x")), "/c/x");
+        EXPECT_TRUE(hostIsKVM());
+        EXPECT_EQ(productOverrides().uid, "u");
+        EXPECT_FALSE(productOverrides().architecture.has_value());
+        EXPECT_TRUE(hostNotes().empty());
+    });
+}
+
+TEST_F(InstrumentationTest, SaysInANoteWhyATreeIsEmpty) {
+    const std::string file = directory.path("missing.json");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", file, [&file] {
+        Instrumentation cursor;
+        cursor.selectNode(Lexicon::ComputerSystemNode);
+        EXPECT_FALSE(bool(cursor));
+        EXPECT_EQ(hostNotes(), std::vector<std::string>{file + ": No such file or directory"});
+    });
+}
+
+TEST_F(InstrumentationTest, KnowsASnapshotsFirmwareFromItsFilesAlone) {
+    support::SmbiosImage(3, 0)
+        .add(support::SmbiosSystemImage{"QEMU", "Standard PC", {}, {}, {}, {}})
+        .writeTo(directory);
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", directory.path(), [] { EXPECT_TRUE(hostIsKVM()); });
+    support::SmbiosImage(3, 0).add(support::SmbiosSystemImage{"Veska", "KVM", {}, {}, {}, {}}).writeTo(directory);
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", directory.path(), [] { EXPECT_TRUE(hostIsKVM()); });
+    support::SmbiosImage(3, 0).add(support::SmbiosSystemImage{"Veska", "VS", {}, {}, {}, {}}).writeTo(directory);
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", directory.path(), [] { EXPECT_FALSE(hostIsKVM()); });
+}
+
+TEST_F(InstrumentationTest, ThisHostIsOneComputerWithTheKernelsName) {
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", std::string(), [] { // empty counts as not set
+        char kernels[129] = {};
+        ASSERT_EQ(gethostname(kernels, 128), 0);
+        Instrumentation cursor;
+        cursor.selectNode(Lexicon::ComputerSystemNode);
+        std::string name;
+        EXPECT_TRUE(cursor.getProperty(NAME, name));
+        EXPECT_EQ(name, kernels);
+        EXPECT_EQ(std::string(cursor.getPathToNode()), "/computer/0");
+        EXPECT_FALSE(++cursor);
+    });
+}
+
+/// Nanoseconds per computer of reading every computer, found by its path each time.
+double costPerComputer(const support::TemporaryDirectory& directory, int count) {
+    std::string nodes;
+    for (int i = 0; i < count; ++i)
+        nodes += std::string(i == 0 ? "" : ",") + R"({"type":40,"path":"/computer/)" + std::to_string(i) +
+                 R"(","properties":{"108":"node)" + std::to_string(i) + "\"}}";
+    directory.write("tree.json", "{\"nodes\":[" + nodes + "]}");
+    usleep(50'000); // until the file's stamp tells every change
+    const auto read = [] {
+        std::string name;
+        Instrumentation all;
+        for (all.selectNode(Lexicon::ComputerSystemNode); all; ++all) {
+            Instrumentation one;
+            one.selectNode(std::string(all.getPathToNode()));
+            if (!one.getProperty(NAME, name)) abort();
+        }
+    };
+    read();
+    const auto begin = std::chrono::steady_clock::now();
+    const int rounds = 20'000 / count;
+    for (int i = 0; i < rounds; ++i) read();
+    const std::chrono::duration<double, std::nano> time = std::chrono::steady_clock::now() - begin;
+    return time.count() / rounds / count;
+}
+
+TEST_F(InstrumentationTest, AThousandComputersCostTheSameEach) {
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", directory.path("tree.json"), [this] {
+        const double few = costPerComputer(directory, 10);
+        const double many = costPerComputer(directory, 1000);
+        EXPECT_LT(many, 5 * few) << few << " ns each of ten";
+    });
+}
+
+} // namespace
+
+} // namespace VK
