@@ -38,6 +38,18 @@ void writeMarker(const std::string& logger, const char* marker, unsigned int lin
 
 } // namespace
 
+void rethrowFromLogger() {
+    try {
+        throw;
+    } catch (const std::exception&) {
+        throw;
+    } catch (abi::__forced_unwind&) { // a cancelled thread
+        throw;
+    } catch (...) {
+        throw std::runtime_error("The logger failed");
+    }
+}
+
 void logAndTrace(const char* function, const char* file, unsigned int line, const std::string& category, int level,
                  const char* text) {
     try {
@@ -46,12 +58,8 @@ void logAndTrace(const char* function, const char* file, unsigned int line, cons
         const int lineNumber = static_cast<int>(line);
         NVLog::NVLogger::logLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, message);
         NVLog::NVLogger::traceLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, message);
-    } catch (const std::exception&) {
-        throw;
-    } catch (abi::__forced_unwind&) { // a cancelled thread
-        throw;
     } catch (...) {
-        throw std::runtime_error("The logger failed");
+        rethrowFromLogger();
     }
 }
 

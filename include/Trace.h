@@ -98,8 +98,11 @@ inline char* trace(const char* variable, const char* file, unsigned int line, un
 
 // --- Handing lines to the logger.
 
-/// Hands one line over: to the log channel, then to the trace channel. What the logger throws propagates; anything that
-/// is not a std::exception as one, so that the boundary towards the object manager knows it.
+/// Throws on what the logger threw: anything that is not a std::exception as one, so that the boundary towards the
+/// object manager knows it. To be called where an exception is handled.
+[[noreturn]] void rethrowFromLogger();
+
+/// Hands one line over: to the log channel, then to the trace channel. What the logger throws propagates as above.
 void logAndTrace(const char* function, const char* file, unsigned int line, const std::string& category, int level,
                  const char* text);
 
@@ -163,10 +166,12 @@ private:
 class ParameterTraceScope {
 public:
     template <class... Parts>
-    explicit ParameterTraceScope(const TracePoint& point, const Parts&... parts) : at(point) {
+    explicit ParameterTraceScope(const TracePoint& point, const Parts&... parts) try : at(point) {
         (void(buffer << parts), ...);
         parameters = NVLog::NVMessageBuffer::str(buffer).c_str();
         enter();
+    } catch (...) {
+        rethrowFromLogger();
     }
     ~ParameterTraceScope();
     ParameterTraceScope(const ParameterTraceScope&) = delete;

@@ -2,6 +2,8 @@
 
 #include "nvlog/NVLogger.h"
 
+#include <cxxabi.h>
+
 namespace VK::Cmpi {
 
 bool hasValue(const CMPIData& data, const CMPIStatus& status) {
@@ -33,8 +35,13 @@ const CMPIValue* asChars(const char* text) {
 bool refused(const char* function, int line, const std::string& what, const char* name, const CMPIStatus& status) {
     const std::string text = "The broker refused " + what + " " + (name != nullptr ? name : "(null)") +
                              ", return code " + std::to_string(static_cast<int>(status.rc));
-    NVLog::NVLogger::logLevelMessage(function, "ProviderUtilities", line, "Norvane.ProviderUtilities", 6000, nullptr, 0,
-                                     0, text);
+    try {
+        NVLog::NVLogger::logLevelMessage(function, "ProviderUtilities", line, "Norvane.ProviderUtilities", 6000,
+                                         nullptr, 0, 0, text);
+    } catch (const abi::__forced_unwind&) { // a cancelled thread
+        throw;
+    } catch (...) { // NOLINT(bugprone-empty-catch): another logger's failure is no reason to fail
+    }
     return false;
 }
 
