@@ -1,0 +1,354 @@
+#include "Linux/ComputerSystem.h"
+#include "support/SimulatedHost.h"
+
+#include <gmock/gmock.h>
+
+#include <string>
+#include <vector>
+
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+using VK::BaseServerProvider::ComputerSystem;
+using Filter = ComputerSystem::FilterType;
+using Texts = std::vector<std::string>;
+using Numbers = std::vector<unsigned short>;
+
+/// The host of one computer, changed by `change`.
+template <class Change>
+void simulateOne(Change change) {
+    test::Node node = test::computer(0, "node7");
+    change(node);
+    test::simulate({node, test::chassis(0, 0, "CZ1")});
+}
+
+Texts remainingNames(ComputerSystem& system) {
+    Texts names;
+    for (; system; ++system) {
+        std::string name = "(none)";
+        static_cast<void>(system.getName(name));
+        names.push_back(name);
+    }
+    return names;
+}
+
+void simulateThree() {
+    test::Node nameless = test::computer(1, "");
+    nameless.properties.erase(108);
+    test::simulate({test::computer(0, "node7"), nameless, test::computer(2, "node8")});
+}
+
+TEST(ComputerSystem, WalksTheComputersOfTheTreeAndNoOtherNodes) {
+    test::simulate({test::chassis(0, 0, "CZ1"), test::computer(0, "node7"), test::computer(1, "node8")});
+    ComputerSystem system;
+    EXPECT_THAT(remainingNames(system), ElementsAre("node7", "node8"));
+    EXPECT_FALSE(static_cast<bool>(++system)) << "past the end it stays past the end";
+}
+
+TEST(ComputerSystem, StandsOnNothingWithoutAComputer) {
+    test::simulate({test::chassis(0, 0, "CZ1")});
+    EXPECT_FALSE(static_cast<bool>(ComputerSystem()));
+}
+
+TEST(ComputerSystem, KnowsNothingWhereItStandsOnNothing) {
+    test::simulate({});
+    const ComputerSystem system;
+    std::string text = "before";
+    unsigned short number = 77;
+    EXPECT_FALSE(system.getName(text));
+    EXPECT_FALSE(system.getUUID(text));
+    EXPECT_FALSE(system.getEnabledState(number));
+    EXPECT_EQ(text, "before");
+    EXPECT_EQ(number, 77);
+    EXPECT_TRUE(system.getHealthState(number));
+    EXPECT_EQ(number, 0);
+    EXPECT_TRUE(system.getDescription(text));
+    EXPECT_EQ(text, "");
+}
+
+TEST(ComputerSystem, BecomesFalseForANameThatNoNodeHas) {
+    test::simulate({test::computer(0, "node7"), test::computer(1, "node8")});
+    ComputerSystem system;
+    system.setFilter(Filter::Name, "x");
+    EXPECT_FALSE(static_cast<bool>(system));
+}
+
+TEST(ComputerSystem, ComparesNamesByteForByte) {
+    test::simulate({test::computer(0, "node7")});
+    for (const char* other : {"Node7", "node", "node77", "node7 ", " node7", ""}) {
+        ComputerSystem system;
+        system.setFilter(Filter::Name, other);
+        EXPECT_FALSE(static_cast<bool>(system)) << "'" << other << "'";
+    }
+    ComputerSystem system;
+    system.setFilter(Filter::Name, "node7");
+    EXPECT_TRUE(static_cast<bool>(system));
+}
+
+TEST(ComputerSystem, DoesNotTakeANameForAnotherThatGoesOnBehindAZeroByte) {
+    test::simulate({test::computer(0, "node7")});
+    ComputerSystem system;
+    system.setFilter(Filter::Name, std::string("node7\0x", 7));
+    EXPECT_FALSE(static_cast<bool>(system));
+}
+
+TEST(ComputerSystem, LetsAComputerWithoutANamePassTheFilter) {
+    simulateThree();
+    ComputerSystem system;
+    system.setFilter(Filter::Name, "node8");
+    EXPECT_THAT(remainingNames(system), ElementsAre("(none)", "node8"));
+}
+
+TEST(ComputerSystem, LetsEveryNodePassAFilterOfAnotherType) {
+    simulateThree();
+    ComputerSystem system;
+    system.setFilter(static_cast<Filter>(1), "x");
+    EXPECT_THAT(remainingNames(system), ElementsAre("node7", "(none)", "node8"));
+}
+
+TEST(ComputerSystem, OnlyNarrowsWhatLiesAhead) {
+    test::simulate({test::computer(0, "node7"), test::computer(1, "node8"), test::computer(2, "node7")});
+    ComputerSystem system;
+    ++system;
+    system.setFilter(Filter::Name, "node7");
+    EXPECT_THAT(remainingNames(system), ElementsAre("node7"));
+}
+
+TEST(ComputerSystem, WantsEveryFilterToPass) {
+    test::simulate({test::computer(0, "node7"), test::computer(1, "node8")});
+    ComputerSystem system;
+    system.setFilter(Filter::Name, "node7");
+    EXPECT_TRUE(system.evaluate());
+    system.setFilter(Filter::Name, "node8");
+    EXPECT_FALSE(static_cast<bool>(system));
+}
+
+TEST(ComputerSystem, EvaluatesToTrueWithoutFilters) {
+    test::simulate({test::computer(0, "node7")});
+    EXPECT_TRUE(ComputerSystem().evaluate());
+}
+
+TEST(ComputerSystem, TracesTheFilterItIsGiven) {
+    test::simulate({test::computer(0, "node7")});
+    ComputerSystem system;
+    test::takeLog();
+    system.setFilter(Filter::Name, "node7");
+    const Texts lines = test::withoutPlaces(test::takeLog());
+    ASSERT_FALSE(lines.empty());
+    EXPECT_EQ(lines.front(), "LOG 4000 Norvane.BaseServerProvider ComputerSystem setFilter: ENTERING: setFilter() in "
+                             "ComputerSystem [Line],Parameters List:  filterType=0 reference=node7");
+}
+
+TEST(ComputerSystem, ReadsItsTexts) {
+    simulateOne([](test::Node& node) {
+        node.properties[115] = "ops@example.org";
+        node.properties[116] = "Operations";
+    });
+    const ComputerSystem system;
+    std::string text;
+    EXPECT_TRUE(system.getName(text));
+    EXPECT_EQ(text, "node7");
+    EXPECT_TRUE(system.getElementName(text));
+    EXPECT_EQ(text, "node7");
+    EXPECT_TRUE(system.getUUID(text));
+    EXPECT_EQ(text, "4c4c4544-0043-3010-8052-000000000000");
+    EXPECT_TRUE(system.getPrimaryOwnerContact(text));
+    EXPECT_EQ(text, "ops@example.org");
+    EXPECT_TRUE(system.getPrimaryOwnerName(text));
+    EXPECT_EQ(text, "Operations");
+    EXPECT_TRUE(system.getDescription(text));
+    EXPECT_EQ(text, "Rack server 0");
+    EXPECT_TRUE(system.getCreationClassName(text));
+    EXPECT_EQ(text, "VESKA_ComputerSystem");
+}
+
+TEST(ComputerSystem, SuppliesNoTextThatTheNodeLacks) {
+    simulateOne([](test::Node& node) { node.properties.clear(); });
+    const ComputerSystem system;
+    std::string text = "before";
+    EXPECT_FALSE(system.getName(text));
+    EXPECT_FALSE(system.getElementName(text));
+    EXPECT_FALSE(system.getUUID(text));
+    EXPECT_FALSE(system.getPrimaryOwnerContact(text));
+    EXPECT_FALSE(system.getPrimaryOwnerName(text));
+    EXPECT_EQ(text, "before");
+}
+
+TEST(ComputerSystem, TellsHealthFromTheNodeStatus) {
+    for (unsigned status = 0; status <= 30; ++status) {
+        simulateOne([&](test::Node& node) { node.status = status; });
+        unsigned short health = 0;
+        std::string text;
+        Numbers states;
+        Numbers expectedStates = {0};
+        std::string expectedText = "Unknown";
+        unsigned short expectedHealth = 0;
+        if (status == 1) {
+            expectedStates = {2, 11};
+            expectedText = "OK";
+            expectedHealth = 5;
+        } else if (status == 20) {
+            expectedStates = {3, 5};
+            expectedText = "Pred Fail";
+            expectedHealth = 10;
+        } else if (status >= 21 && status <= 26) {
+            expectedStates = {3};
+            expectedText = "Degraded";
+            expectedHealth = 10;
+        }
+        const ComputerSystem system;
+        EXPECT_TRUE(system.getHealthState(health) && system.getStatus(text) && system.getOperationalStatus(states));
+        EXPECT_EQ(health, expectedHealth) << "status " << status;
+        EXPECT_EQ(text, expectedText) << "status " << status;
+        EXPECT_EQ(states, expectedStates) << "status " << status;
+    }
+}
+
+TEST(ComputerSystem, TellsAPredictiveFailure) {
+    simulateOne([](test::Node& node) { node.status = 20; });
+    const ComputerSystem system;
+    unsigned short health = 0;
+    std::string text;
+    Numbers states;
+    EXPECT_TRUE(system.getHealthState(health) && system.getStatus(text) && system.getOperationalStatus(states));
+    EXPECT_EQ(health, 10);
+    EXPECT_EQ(text, "Pred Fail");
+    EXPECT_THAT(states, ElementsAre(3, 5));
+}
+
+TEST(ComputerSystem, AppendsTheOperationalStatusToWhatTheCallerHas) {
+    simulateOne([](test::Node&) {});
+    const ComputerSystem system;
+    Numbers states = {9};
+    EXPECT_TRUE(system.getOperationalStatus(states));
+    EXPECT_THAT(states, ElementsAre(9, 2, 11));
+}
+
+TEST(ComputerSystem, TellsTheEnabledStateFromThePowerState) {
+    struct Case {
+        unsigned powerState;
+        unsigned short enabledState;
+    };
+    for (const Case expected : {Case{0, 0}, Case{1, 2}, Case{16, 4}}) {
+        simulateOne([&](test::Node& node) { node.properties[123] = expected.powerState; });
+        unsigned short state = 77;
+        EXPECT_TRUE(ComputerSystem().getEnabledState(state));
+        EXPECT_EQ(state, expected.enabledState) << "power state " << expected.powerState;
+    }
+}
+
+TEST(ComputerSystem, SuppliesTheEnabledStateUnchangedForOtherPowerStates) {
+    for (const unsigned powerState : {7U, 2U, 15U, 17U, 4294967295U}) {
+        simulateOne([&](test::Node& node) { node.properties[123] = powerState; });
+        unsigned short state = 77;
+        EXPECT_TRUE(ComputerSystem().getEnabledState(state)) << "power state " << powerState;
+        EXPECT_EQ(state, 77) << "power state " << powerState;
+    }
+}
+
+TEST(ComputerSystem, SuppliesNoEnabledStateWithoutAPowerState) {
+    unsigned short state = 77;
+    simulateOne([](test::Node& node) { node.properties.erase(123); });
+    EXPECT_FALSE(ComputerSystem().getEnabledState(state));
+    simulateOne([](test::Node& node) { node.properties[123] = "1"; });
+    EXPECT_FALSE(ComputerSystem().getEnabledState(state));
+    EXPECT_EQ(state, 77);
+}
+
+TEST(ComputerSystem, IsNotDedicatedToAnything) {
+    simulateOne([](test::Node&) {});
+    Numbers purposes = {4, 5};
+    EXPECT_TRUE(ComputerSystem().getDedicated(purposes));
+    EXPECT_THAT(purposes, ElementsAre(0));
+}
+
+TEST(ComputerSystem, IdentifiesItselfPairByPair) {
+    simulateOne([](test::Node&) {});
+    Texts descriptions;
+    Texts values;
+    EXPECT_TRUE(ComputerSystem().getIdentifyingInfo(descriptions, values));
+    EXPECT_THAT(values,
+                ElementsAre("4c4c4544-0043-3010-8052-000000000000", "uid-1", "Model 0:SYS0", "SYS0", "x86_64", "true"));
+    EXPECT_THAT(descriptions, ElementsAre("CIM:GUID", "CIM:UniqueSystemID", "CIM:Model:SerialNumber", "CIM:Tag",
+                                          "CIM:Architecture", "CIM:SecureIndicationEnabled"));
+}
+
+TEST(ComputerSystem, FillsWhatIdentifiesItButAnswersFalseWithoutAChassis) {
+    test::simulate({test::computer(0, "node7")});
+    Texts descriptions;
+    Texts values;
+    const ComputerSystem system;
+    EXPECT_FALSE(system.getIdentifyingInfo(descriptions, values));
+    EXPECT_THAT(values, ElementsAre("4c4c4544-0043-3010-8052-000000000000", "uid-1", "x86_64", "true"));
+    EXPECT_THAT(descriptions,
+                ElementsAre("CIM:GUID", "CIM:UniqueSystemID", "CIM:Architecture", "CIM:SecureIndicationEnabled"));
+    EXPECT_FALSE(system.getOtherIdentifyingInfo(values));
+    EXPECT_FALSE(system.getIdentifyingDescriptions(descriptions));
+}
+
+TEST(ComputerSystem, LeavesOutOnlyTheGuidPairsWithoutAUuid) {
+    simulateOne([](test::Node& node) { node.properties.erase(64); });
+    Texts descriptions;
+    Texts values;
+    EXPECT_TRUE(ComputerSystem().getIdentifyingInfo(descriptions, values));
+    EXPECT_THAT(values, ElementsAre("Model 0:SYS0", "SYS0", "x86_64", "true"));
+    EXPECT_THAT(descriptions,
+                ElementsAre("CIM:Model:SerialNumber", "CIM:Tag", "CIM:Architecture", "CIM:SecureIndicationEnabled"));
+}
+
+TEST(ComputerSystem, LeavesOutTheModelPairsWithoutSerialNumberOrModelOfItsOwn) {
+    for (const unsigned missing : {50U, 39U}) {
+        simulateOne([&](test::Node& node) { node.properties.erase(missing); });
+        Texts descriptions;
+        Texts values;
+        EXPECT_TRUE(ComputerSystem().getIdentifyingInfo(descriptions, values)) << "the chassis alone decides";
+        EXPECT_THAT(descriptions,
+                    ElementsAre("CIM:GUID", "CIM:UniqueSystemID", "CIM:Architecture", "CIM:SecureIndicationEnabled"));
+        EXPECT_EQ(values.size(), descriptions.size());
+    }
+}
+
+TEST(ComputerSystem, AppendsWhatIdentifiesItAndClearsBeforeEitherHalf) {
+    simulateOne([](test::Node&) {});
+    const ComputerSystem system;
+    Texts values = {"mine"};
+    Texts descriptions = {"mine"};
+    EXPECT_TRUE(system.getIdentifyingInfo(descriptions, values));
+    EXPECT_EQ(values.size(), 7U);
+    EXPECT_EQ(values.front(), "mine");
+    EXPECT_TRUE(system.getOtherIdentifyingInfo(values));
+    EXPECT_TRUE(system.getIdentifyingDescriptions(descriptions));
+    EXPECT_EQ(values.size(), 6U);
+    EXPECT_EQ(values.front(), "4c4c4544-0043-3010-8052-000000000000");
+    EXPECT_EQ(descriptions.size(), 6U);
+    EXPECT_EQ(descriptions.front(), "CIM:GUID");
+}
+
+/// Asks a getter that never has a value.
+template <class Value>
+void expectUntouched(const ComputerSystem& system, bool (ComputerSystem::*getter)(Value&) const, const Value& before) {
+    Value value = before;
+    EXPECT_FALSE((system.*getter)(value));
+    EXPECT_EQ(value, before);
+}
+
+TEST(ComputerSystem, LeavesTheOutputOfWhatTheHostCannotSupply) {
+    simulateOne([](test::Node&) {});
+    const ComputerSystem system;
+    for (const auto getter :
+         {&ComputerSystem::getCaption, &ComputerSystem::getInstallDate, &ComputerSystem::getOtherEnabledState,
+          &ComputerSystem::getTimeOfLastStateChange, &ComputerSystem::getNameFormat})
+        expectUntouched(system, getter, std::string("before"));
+    for (const auto getter : {&ComputerSystem::getPrimaryStatus, &ComputerSystem::getDetailedStatus,
+                              &ComputerSystem::getOperatingStatus, &ComputerSystem::getCommunicationStatus,
+                              &ComputerSystem::getRequestedState, &ComputerSystem::getEnabledDefault,
+                              &ComputerSystem::getTransitioningToState, &ComputerSystem::getResetCapability})
+        expectUntouched(system, getter, static_cast<unsigned short>(77));
+    for (const auto getter : {&ComputerSystem::getStatusDescriptions, &ComputerSystem::getRoles,
+                              &ComputerSystem::getOtherDedicatedDescriptions})
+        expectUntouched(system, getter, Texts{"before"});
+    expectUntouched(system, &ComputerSystem::getAvailableRequestedStates, Numbers{77});
+}
+
+} // namespace
