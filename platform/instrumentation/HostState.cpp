@@ -54,11 +54,12 @@ unsigned int powerState(const Root& root) {
 }
 
 bool hasUncorrectableMemoryErrors(const Root& root) {
-    const std::string folder = "/sys/devices/system/edac/mc";
+    const std::string folder = "/sys/devices/system/edac/mc/";
     for (const std::string& name : root.list(folder).names) {
         if (name.rfind("mc", 0) != 0) continue;
-        if (root.read(folder + "/" + name + "/ue_count").text.find_first_of("123456789") != std::string::npos)
-            return true;
+        std::string file = folder;
+        file.append(name).append("/ue_count");
+        if (root.read(file).text.find_first_of("123456789") != std::string::npos) return true;
     }
     return false;
 }

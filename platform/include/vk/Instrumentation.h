@@ -25,7 +25,9 @@ private:
 /// A cursor over the host's node tree.
 ///
 /// The tree comes from this host, a snapshot of one, or a simulated host's file (vk/HostSource.h). A source that
-/// cannot be read is an empty tree and one log line at level 6000. No operation throws but for std::bad_alloc.
+/// cannot be read is an empty tree and one log line at level 6000; a simulated host's file may have 16 MiB. What cannot
+/// change while a host runs is read once per process, the rest (host name, power state, clock, zone, memory errors) at
+/// each call; a simulated host's file as it stands when nodes are selected. No operation throws but for std::bad_alloc.
 /// Cursors are independent of each other; one cursor belongs to one thread at a time.
 class Instrumentation {
 public:
@@ -56,8 +58,13 @@ public:
     bool getProperty(NodeLexicon::Properties property, std::string& value) const;
     bool getProperty(NodeLexicon::Properties property, unsigned int& value) const;
 
-    /// Writes a property of the current node. False, with nothing changed and one log line at level 6000, when the
-    /// host does not allow it.
+    /// Writes a property of the current node; this cursor and all new ones see it. False, with nothing changed and one
+    /// log line at level 6000, when the host does not allow it.
+    ///
+    /// Of a real host's computer system these can be written, each change with one log line at level 3000: the clock
+    /// (126, a CIM date-time from 2000 on; takes CAP_SYS_TIME; never of a snapshot), the offset (127, -840 to 840
+    /// minutes in two's complement) and daylight saving (200, 0 or 1); the last two replace /etc/localtime at one
+    /// stroke. A simulated host's file is replaced at one stroke too, under the lock file `<file>.lock`.
     bool setProperty(NodeLexicon::Properties property, std::string& value);
     bool setProperty(NodeLexicon::Properties property, unsigned int& value);
 
