@@ -105,7 +105,7 @@ private:
         if (const auto* embedded = std::get_if<std::shared_ptr<const om::Instance>>(&value.data)) {
             return *embedded ? quoted(instance(**embedded)) : "NULL";
         }
-        const std::string number = numberText(value);
+        std::string number = numberText(value);
         if (!number.empty()) return number;
         return quoted(plainText(value, {nameSpace, schema}));
     }

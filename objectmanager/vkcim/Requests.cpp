@@ -42,7 +42,7 @@ std::string queriedClass(const std::string& query) {
     while (at < query.size()) {
         std::size_t end = at;
         while (end < query.size() && isNameByte(query[end])) ++end;
-        const std::string word = query.substr(at, end - at);
+        std::string word = query.substr(at, end - at);
         if (next && !word.empty()) return word;
         next = next || om::sameName(word, "FROM");
         at = std::max(end, at + 1);
