@@ -48,8 +48,9 @@ public:
         return &call<R, A...>;
     }
 
+    // A thread's end is caught by a reference to no object, which is how the compiler's runtime has it.
     template <class R, class... A>
-    static R call(A... arguments) {
+    __attribute__((no_sanitize("null"))) static R call(A... arguments) {
         CMPIStatus* out = nullptr;
         (pick(out, arguments), ...);
         report(out, CMPI_RC_OK);

@@ -58,6 +58,10 @@ CMPIrc codeWithNulls(R (*slot)(First, A...), std::decay_t<First> first) {
     };
     if constexpr (std::is_same_v<R, CMPIStatus>) {
         return slot(first, argument(A{})...).rc;
+    } else if constexpr (std::is_same_v<std::remove_cv_t<std::remove_pointer_t<First>>, std::remove_pointer_t<R>>) {
+        R clone = slot(first, argument(A{})...); // only a clone is an object of the same kind
+        if (clone != nullptr) clone->ft->release(clone);
+        return rc.rc;
     } else {
         slot(first, argument(A{})...);
         return rc.rc;

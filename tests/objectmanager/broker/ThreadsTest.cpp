@@ -41,6 +41,9 @@ TEST_F(Threads, AThreadMayEndItself) {
 }
 
 TEST_F(Threads, ASleepingThreadCanBeCancelled) {
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the address sanitizer takes the frames that a cancelled thread leaves for an overflow";
+#endif
     static const CMPIBrokerExtFT* table = nullptr;
     table = xft;
     void* thread = xft->newThread(
