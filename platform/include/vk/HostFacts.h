@@ -24,7 +24,8 @@ const ProductOverrides& productOverrides();
 bool hostIsKVM();
 
 /// For people: one line for each thing that the host could not tell, and why: it lacks the source, or we may not see
-/// it. Nothing is thrown but std::bad_alloc.
+/// it; then one on time, zone, daylight saving and whether the NTP daemon runs, and one where the CIM server's
+/// configuration command is missing. Nothing is thrown but std::bad_alloc.
 std::vector<std::string> hostNotes();
 
 } // namespace VK
