@@ -30,12 +30,12 @@ CMPICount getArgCount(const CMPIArgs* handle, CMPIStatus*) {
 
 constexpr CMPIArgsFT makeTable() {
     auto ft = emptyTable<CMPIArgsFT>();
-    ft.release = Slot<&releaseObject<ArgsObject>>();
-    ft.clone = Slot<&cloneObject<ArgsObject>>();
-    ft.addArg = Slot<&addArg>();
-    ft.getArg = Slot<&getArg>();
-    ft.getArgAt = Slot<&getArgAt>();
-    ft.getArgCount = Slot<&getArgCount>();
+    ft.release = Slot<&releaseObject<ArgsObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<ArgsObject>, FaultKind::clone>();
+    ft.addArg = Slot<&addArg, FaultKind::addArg>();
+    ft.getArg = Slot<&getArg, FaultKind::getArg>();
+    ft.getArgAt = Slot<&getArgAt, FaultKind::getArgAt>();
+    ft.getArgCount = Slot<&getArgCount, FaultKind::getArgCount>();
     return ft;
 }
 

@@ -35,12 +35,12 @@ CMPIStatus setElementAt(const CMPIArray* handle, CMPICount index, const CMPIValu
 
 constexpr CMPIArrayFT makeTable() {
     auto ft = emptyTable<CMPIArrayFT>();
-    ft.release = Slot<&releaseObject<ArrayObject>>();
-    ft.clone = Slot<&cloneObject<ArrayObject>>();
-    ft.getSize = Slot<&getSize>();
-    ft.getSimpleType = Slot<&getSimpleType>();
-    ft.getElementAt = Slot<&getElementAt>();
-    ft.setElementAt = Slot<&setElementAt>();
+    ft.release = Slot<&releaseObject<ArrayObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<ArrayObject>, FaultKind::clone>();
+    ft.getSize = Slot<&getSize, FaultKind::getSize>();
+    ft.getSimpleType = Slot<&getSimpleType, FaultKind::getSimpleType>();
+    ft.getElementAt = Slot<&getElementAt, FaultKind::getElementAt>();
+    ft.setElementAt = Slot<&setElementAt, FaultKind::setElementAt>();
     return ft;
 }
 

@@ -66,12 +66,12 @@ CMPIStatus addEntry(const CMPIContext* handle, const char* name, const CMPIValue
 
 constexpr CMPIContextFT makeTable() {
     auto ft = emptyTable<CMPIContextFT>();
-    ft.release = Slot<&releaseObject<ContextObject>>();
-    ft.clone = Slot<&cloneObject<ContextObject>>();
-    ft.getEntry = Slot<&getEntry>();
-    ft.getEntryAt = Slot<&getEntryAt>();
-    ft.getEntryCount = Slot<&getEntryCount>();
-    ft.addEntry = Slot<&addEntry>();
+    ft.release = Slot<&releaseObject<ContextObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<ContextObject>, FaultKind::clone>();
+    ft.getEntry = Slot<&getEntry, FaultKind::getEntry>();
+    ft.getEntryAt = Slot<&getEntryAt, FaultKind::getEntryAt>();
+    ft.getEntryCount = Slot<&getEntryCount, FaultKind::getEntryCount>();
+    ft.addEntry = Slot<&addEntry, FaultKind::addEntry>();
     return ft;
 }
 

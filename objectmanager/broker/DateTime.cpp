@@ -25,11 +25,11 @@ bool isIntervalSlot(const CMPIDateTime* handle, CMPIStatus*) {
 
 constexpr CMPIDateTimeFT makeTable() {
     auto ft = emptyTable<CMPIDateTimeFT>();
-    ft.release = Slot<&releaseObject<DateTimeObject>>();
-    ft.clone = Slot<&cloneObject<DateTimeObject>>();
-    ft.getBinaryFormat = Slot<&getBinaryFormat>();
-    ft.getStringFormat = Slot<&getStringFormat>();
-    ft.isInterval = Slot<&isIntervalSlot>();
+    ft.release = Slot<&releaseObject<DateTimeObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<DateTimeObject>, FaultKind::clone>();
+    ft.getBinaryFormat = Slot<&getBinaryFormat, FaultKind::getBinaryFormat>();
+    ft.getStringFormat = Slot<&getStringFormat, FaultKind::getStringFormat>();
+    ft.isInterval = Slot<&isIntervalSlot, FaultKind::isInterval>();
     return ft;
 }
 

@@ -33,11 +33,11 @@ CMPIArray* toArray(const CMPIEnumeration* handle, CMPIStatus*) {
 
 constexpr CMPIEnumerationFT makeTable() {
     auto ft = emptyTable<CMPIEnumerationFT>();
-    ft.release = Slot<&releaseObject<EnumerationObject>>();
-    ft.clone = Slot<&cloneObject<EnumerationObject>>();
-    ft.getNext = Slot<&getNext>();
-    ft.hasNext = Slot<&hasNext>();
-    ft.toArray = Slot<&toArray>();
+    ft.release = Slot<&releaseObject<EnumerationObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<EnumerationObject>, FaultKind::clone>();
+    ft.getNext = Slot<&getNext, FaultKind::getNext>();
+    ft.hasNext = Slot<&hasNext, FaultKind::hasNext>();
+    ft.toArray = Slot<&toArray, FaultKind::toArray>();
     return ft;
 }
 

@@ -131,23 +131,23 @@ CMPIStatus closeMessageFile(const CMPIBroker* handle, CMPIMsgFileHandle file) {
 
 constexpr CMPIBrokerEncFT makeTable() {
     auto ft = emptyTable<CMPIBrokerEncFT>();
-    ft.newInstance = Slot<&newInstance>();
-    ft.newObjectPath = Slot<&newObjectPath>();
-    ft.newArgs = Slot<&newArgs>();
-    ft.newString = Slot<&newStringSlot>();
-    ft.newArray = Slot<&newArray>();
-    ft.newDateTime = Slot<&newDateTime>();
-    ft.newDateTimeFromBinary = Slot<&newDateTimeFromBinary>();
-    ft.newDateTimeFromChars = Slot<&newDateTimeFromChars>();
+    ft.newInstance = Slot<&newInstance, FaultKind::newInstance>();
+    ft.newObjectPath = Slot<&newObjectPath, FaultKind::newObjectPath>();
+    ft.newArgs = Slot<&newArgs, FaultKind::newArgs>();
+    ft.newString = Slot<&newStringSlot, FaultKind::newString>();
+    ft.newArray = Slot<&newArray, FaultKind::newArray>();
+    ft.newDateTime = Slot<&newDateTime, FaultKind::newDateTime>();
+    ft.newDateTimeFromBinary = Slot<&newDateTimeFromBinary, FaultKind::newDateTimeFromBinary>();
+    ft.newDateTimeFromChars = Slot<&newDateTimeFromChars, FaultKind::newDateTimeFromChars>();
     ft.newSelectExp = Slot<&newSelectExp>();
-    ft.classPathIsA = Slot<&classPathIsA>();
-    ft.toString = Slot<&toString>();
-    ft.isOfType = Slot<&isOfType>();
-    ft.getType = Slot<&getType>();
+    ft.classPathIsA = Slot<&classPathIsA, FaultKind::classPathIsA>();
+    ft.toString = Slot<&toString, FaultKind::toString>();
+    ft.isOfType = Slot<&isOfType, FaultKind::isOfType>();
+    ft.getType = Slot<&getType, FaultKind::getType>();
     ft.getMessage = &getMessage;
     ft.logMessage = Slot<&noMessages>();
     ft.trace = Slot<&noMessages>();
-    ft.newCMPIError = Slot<&newCMPIError>();
+    ft.newCMPIError = Slot<&newCMPIError, FaultKind::newCMPIError>();
     ft.openMessageFile = Slot<&openMessageFile>();
     ft.closeMessageFile = Slot<&closeMessageFile>();
     ft.getMessage2 = &getMessage2;

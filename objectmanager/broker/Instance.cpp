@@ -55,16 +55,16 @@ CMPIStatus setObjectPath(const CMPIInstance* handle, const CMPIObjectPath* path)
 
 constexpr CMPIInstanceFT makeTable() {
     auto ft = emptyTable<CMPIInstanceFT>();
-    ft.release = Slot<&releaseObject<InstanceObject>>();
-    ft.clone = Slot<&cloneObject<InstanceObject>>();
-    ft.getProperty = Slot<&getProperty>();
-    ft.getPropertyAt = Slot<&getPropertyAt>();
-    ft.getPropertyCount = Slot<&getPropertyCount>();
-    ft.setProperty = Slot<&setProperty>();
-    ft.getObjectPath = Slot<&getObjectPath>();
-    ft.setPropertyFilter = Slot<&setPropertyFilter>();
-    ft.setObjectPath = Slot<&setObjectPath>();
-    ft.setPropertyWithOrigin = Slot<&setPropertyWithOrigin>();
+    ft.release = Slot<&releaseObject<InstanceObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<InstanceObject>, FaultKind::clone>();
+    ft.getProperty = Slot<&getProperty, FaultKind::getProperty>();
+    ft.getPropertyAt = Slot<&getPropertyAt, FaultKind::getPropertyAt>();
+    ft.getPropertyCount = Slot<&getPropertyCount, FaultKind::getPropertyCount>();
+    ft.setProperty = Slot<&setProperty, FaultKind::setProperty>();
+    ft.getObjectPath = Slot<&getObjectPath, FaultKind::getObjectPath>();
+    ft.setPropertyFilter = Slot<&setPropertyFilter, FaultKind::setPropertyFilter>();
+    ft.setObjectPath = Slot<&setObjectPath, FaultKind::setObjectPath>();
+    ft.setPropertyWithOrigin = Slot<&setPropertyWithOrigin, FaultKind::setPropertyWithOrigin>();
     return ft;
 }
 

@@ -2,6 +2,7 @@
 
 #include "objectmanager/broker/Args.h"
 #include "objectmanager/broker/Broker.h"
+#include "objectmanager/broker/Fault.h"
 #include "objectmanager/broker/Instance.h"
 #include "objectmanager/broker/ObjectPath.h"
 #include "objectmanager/broker/ProviderLibrary.h"
@@ -160,6 +161,7 @@ invoke(Broker& broker, const Request& request, std::vector<ContextEntry> entries
         return answer;
     }
     Invocation invocation(broker, request, std::move(entries), answer);
+    FaultWatch watch(request.fault);
     try {
         const CMPIStatus answered = invocation.run(elapsed);
         answer.code = answered.rc;
@@ -172,6 +174,7 @@ invoke(Broker& broker, const Request& request, std::vector<ContextEntry> entries
         answer.code = CMPI_RC_ERR_FAILED;
         answer.message = "the provider threw an exception";
     }
+    answer.faulted = watch.happened();
     answer.out = std::move(invocation.outArguments().values);
     return answer;
 }

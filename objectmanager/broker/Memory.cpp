@@ -158,12 +158,12 @@ constexpr void fillLater(Table&, long) {}
 
 constexpr CMPIBrokerMemFT makeTable() {
     auto ft = emptyTable<CMPIBrokerMemFT>();
-    ft.mark = Slot<&mark>();
+    ft.mark = Slot<&mark, FaultKind::mark>();
     ft.release = Slot<&releaseToMark>();
-    ft.cmpiMalloc = Slot<&allocate>();
-    ft.cmpiCalloc = Slot<&allocateZeroed>();
-    ft.cmpiRealloc = Slot<&resize>();
-    ft.cmpiStrDup = Slot<&duplicate>();
+    ft.cmpiMalloc = Slot<&allocate, FaultKind::cmpiMalloc>();
+    ft.cmpiCalloc = Slot<&allocateZeroed, FaultKind::cmpiCalloc>();
+    ft.cmpiRealloc = Slot<&resize, FaultKind::cmpiRealloc>();
+    ft.cmpiStrDup = Slot<&duplicate, FaultKind::cmpiStrDup>();
     ft.cmpiFree = Slot<&freeBlock>();
     ft.freeInstance = Slot<&freeObject<InstanceObject>>();
     ft.freeObjectPath = Slot<&freeObject<PathObject>>();

@@ -85,7 +85,7 @@ CMPIString* message(const CMPIBroker* handle, const char* defaultText, CMPIStatu
     return newString(broker, std::move(result));
 }
 
-using Expand = Slot<&message>;
+using Expand = Slot<&message, FaultKind::getMessage>;
 
 } // namespace
 

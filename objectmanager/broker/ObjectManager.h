@@ -1,5 +1,6 @@
 #pragma once
 
+#include "objectmanager/broker/Fault.h"
 #include "objectmanager/model/Schema.h"
 #include "objectmanager/model/Values.h"
 
@@ -42,6 +43,7 @@ struct Request {
     std::string method;
     std::string query;
     std::string language;
+    std::optional<Fault> fault; ///< its calls are counted anew for every request
 };
 
 /// A library that cannot be loaded, or a factory function that is missing, fails or returns null.

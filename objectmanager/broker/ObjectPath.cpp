@@ -79,25 +79,26 @@ CMPIString* toString(const CMPIObjectPath* handle, CMPIStatus*) {
 
 constexpr CMPIObjectPathFT makeTable() {
     auto ft = emptyTable<CMPIObjectPathFT>();
-    ft.release = Slot<&releaseObject<PathObject>>();
-    ft.clone = Slot<&cloneObject<PathObject>>();
-    ft.setNameSpace = Slot<&set<&ObjectPath::nameSpace>>();
-    ft.getNameSpace = Slot<&get<&ObjectPath::nameSpace>>();
-    ft.setHostname = Slot<&set<&ObjectPath::host>>();
-    ft.getHostname = Slot<&get<&ObjectPath::host>>();
-    ft.setClassName = Slot<&set<&ObjectPath::className>>();
-    ft.getClassName = Slot<&get<&ObjectPath::className>>();
-    ft.addKey = Slot<&addKey>();
-    ft.getKey = Slot<&getKey>();
-    ft.getKeyAt = Slot<&getKeyAt>();
-    ft.getKeyCount = Slot<&getKeyCount>();
-    ft.setNameSpaceFromObjectPath = Slot<&setNameSpaceFromObjectPath>();
-    ft.setHostAndNameSpaceFromObjectPath = Slot<&setHostAndNameSpaceFromObjectPath>();
+    ft.release = Slot<&releaseObject<PathObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<PathObject>, FaultKind::clone>();
+    ft.setNameSpace = Slot<&set<&ObjectPath::nameSpace>, FaultKind::setNameSpace>();
+    ft.getNameSpace = Slot<&get<&ObjectPath::nameSpace>, FaultKind::getNameSpace>();
+    ft.setHostname = Slot<&set<&ObjectPath::host>, FaultKind::setHostname>();
+    ft.getHostname = Slot<&get<&ObjectPath::host>, FaultKind::getHostname>();
+    ft.setClassName = Slot<&set<&ObjectPath::className>, FaultKind::setClassName>();
+    ft.getClassName = Slot<&get<&ObjectPath::className>, FaultKind::getClassName>();
+    ft.addKey = Slot<&addKey, FaultKind::addKey>();
+    ft.getKey = Slot<&getKey, FaultKind::getKey>();
+    ft.getKeyAt = Slot<&getKeyAt, FaultKind::getKeyAt>();
+    ft.getKeyCount = Slot<&getKeyCount, FaultKind::getKeyCount>();
+    ft.setNameSpaceFromObjectPath = Slot<&setNameSpaceFromObjectPath, FaultKind::setNameSpaceFromObjectPath>();
+    ft.setHostAndNameSpaceFromObjectPath =
+        Slot<&setHostAndNameSpaceFromObjectPath, FaultKind::setHostAndNameSpaceFromObjectPath>();
     ft.getClassQualifier = Slot<&noQualifiers<Name>>();
     ft.getPropertyQualifier = Slot<&noQualifiers<Name, Name>>();
     ft.getMethodQualifier = Slot<&noQualifiers<Name, Name>>();
     ft.getParameterQualifier = Slot<&noQualifiers<Name, Name, Name>>();
-    ft.toString = Slot<&toString>();
+    ft.toString = Slot<&toString, FaultKind::toString>();
     return ft;
 }
 

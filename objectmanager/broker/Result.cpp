@@ -102,13 +102,13 @@ CMPIResult* clone(const CMPIResult* handle, CMPIStatus*) {
 
 constexpr CMPIResultFT makeTable() {
     auto ft = emptyTable<CMPIResultFT>();
-    ft.release = Slot<&releaseObject<ResultObject>>();
-    ft.clone = Slot<&clone>();
-    ft.returnData = Slot<&returnData>();
-    ft.returnInstance = Slot<&returnInstance>();
-    ft.returnObjectPath = Slot<&returnObjectPath>();
-    ft.returnDone = Slot<&returnDone>();
-    ft.returnError = Slot<&returnError>();
+    ft.release = Slot<&releaseObject<ResultObject>, FaultKind::release>();
+    ft.clone = Slot<&clone, FaultKind::clone>();
+    ft.returnData = Slot<&returnData, FaultKind::returnData>();
+    ft.returnInstance = Slot<&returnInstance, FaultKind::returnInstance>();
+    ft.returnObjectPath = Slot<&returnObjectPath, FaultKind::returnObjectPath>();
+    ft.returnDone = Slot<&returnDone, FaultKind::returnDone>();
+    ft.returnError = Slot<&returnError, FaultKind::returnError>();
     return ft;
 }
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "objectmanager/broker/Fault.h"
+
 #include <cmpift.h>
 
 #include <cerrno>
@@ -31,13 +33,13 @@ inline CMPIData noData() {
     return data;
 }
 
-/// Fills one slot of a function table with the function F of ours.
+/// Fills one slot of a function table with the function F of ours; Kind says what a fault of it is called.
 ///
 /// The exact type of a slot differs between versions of the CMPI headers (constness of objects, enumerations for
 /// integers); the conversion deduces it, and forwards to F. It is also the boundary that no C++ exception crosses:
 /// the status parameter is set to OK before F runs, and every exception ends as a failure status where the slot has
 /// one, and as null, 0 or ENOMEM where it returns a value.
-template <auto F>
+template <auto F, FaultKind Kind = FaultKind::None>
 class Slot {
 public:
     template <class R, class... A>
@@ -55,6 +57,13 @@ public:
         (pick(out, arguments), ...);
         report(out, CMPI_RC_OK);
         CMPIrc code = CMPI_RC_ERR_FAILED;
+        if constexpr (Kind != FaultKind::None) {
+            FaultWatch* const watch = FaultWatch::current();
+            if (watch != nullptr && watch->fails(Kind)) {
+                if (!watch->unstated()) report(out, code);
+                return failed<R>(code);
+            }
+        }
         try {
             if constexpr (std::is_void_v<R>) {
                 F(arguments...);

@@ -10,9 +10,9 @@ const char* getCharPtr(const CMPIString* handle, CMPIStatus*) {
 
 constexpr CMPIStringFT makeTable() {
     auto ft = emptyTable<CMPIStringFT>();
-    ft.release = Slot<&releaseObject<StringObject>>();
-    ft.clone = Slot<&cloneObject<StringObject>>();
-    ft.getCharPtr = Slot<&getCharPtr>();
+    ft.release = Slot<&releaseObject<StringObject>, FaultKind::release>();
+    ft.clone = Slot<&cloneObject<StringObject>, FaultKind::clone>();
+    ft.getCharPtr = Slot<&getCharPtr, FaultKind::getCharPtr>();
     return ft;
 }
 

@@ -182,11 +182,11 @@ template <class Table>
 constexpr void fillLater(Table&, long) {}
 
 constexpr void fillSynchronisation(CMPIBrokerExtFT& ft) {
-    ft.newMutex = Slot<&newMutex>();
+    ft.newMutex = Slot<&newMutex, FaultKind::newMutex>();
     ft.destroyMutex = Slot<&destroyMutex>();
     ft.lockMutex = Slot<&lockMutex>();
     ft.unlockMutex = Slot<&unlockMutex>();
-    ft.newCondition = Slot<&newCondition>();
+    ft.newCondition = Slot<&newCondition, FaultKind::newCondition>();
     ft.destroyCondition = Slot<&destroyCondition>();
     ft.condWait = Slot<&condWait>();
     ft.timedCondWait = Slot<&timedCondWait>();
@@ -196,13 +196,13 @@ constexpr void fillSynchronisation(CMPIBrokerExtFT& ft) {
 constexpr CMPIBrokerExtFT makeTable() {
     auto ft = emptyTable<CMPIBrokerExtFT>();
     ft.resolveFileName = Slot<&resolveFileName>();
-    ft.newThread = Slot<&newThread>();
+    ft.newThread = Slot<&newThread, FaultKind::newThread>();
     ft.joinThread = Slot<&joinThread>();
     ft.exitThread = Slot<&exitThread>();
     ft.cancelThread = Slot<&cancelThread>();
     ft.threadSleep = Slot<&threadSleep>();
     ft.threadOnce = Slot<&threadOnce>();
-    ft.createThreadKey = Slot<&createThreadKey>();
+    ft.createThreadKey = Slot<&createThreadKey, FaultKind::createThreadKey>();
     ft.destroyThreadKey = Slot<&destroyThreadKey>();
     ft.getThreadSpecific = Slot<&getThreadSpecific>();
     ft.setThreadSpecific = Slot<&setThreadSpecific>();

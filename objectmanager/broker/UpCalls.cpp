@@ -234,10 +234,10 @@ template <class Table>
 constexpr void fillLater(Table&, long) {}
 
 constexpr void fillAssociations(CMPIBrokerFT& ft) {
-    ft.associators = Slot<&associators>();
-    ft.associatorNames = Slot<&associatorNames>();
-    ft.references = Slot<&references>();
-    ft.referenceNames = Slot<&referenceNames>();
+    ft.associators = Slot<&associators, FaultKind::associators>();
+    ft.associatorNames = Slot<&associatorNames, FaultKind::associatorNames>();
+    ft.references = Slot<&references, FaultKind::references>();
+    ft.referenceNames = Slot<&referenceNames, FaultKind::referenceNames>();
 }
 
 constexpr CMPIBrokerFT makeTable() {
@@ -247,21 +247,21 @@ constexpr CMPIBrokerFT makeTable() {
                             CMPI_MB_Supports_Extended_Error;
     ft.brokerVersion = CMPIVersion200;
     ft.brokerName = "Embedded object manager";
-    ft.prepareAttachThread = Slot<&prepareAttachThread>();
-    ft.attachThread = Slot<&attachThread>();
-    ft.detachThread = Slot<&detachThread>();
+    ft.prepareAttachThread = Slot<&prepareAttachThread, FaultKind::prepareAttachThread>();
+    ft.attachThread = Slot<&attachThread, FaultKind::attachThread>();
+    ft.detachThread = Slot<&detachThread, FaultKind::detachThread>();
     ft.deliverIndication = Slot<&deliverIndication>();
-    ft.enumerateInstanceNames = Slot<&enumerateInstanceNames>();
-    ft.getInstance = Slot<&getInstance>();
-    ft.createInstance = Slot<&createInstance>();
-    ft.modifyInstance = Slot<&modifyInstance>();
-    ft.deleteInstance = Slot<&deleteInstance>();
-    ft.execQuery = Slot<&execQuery>();
-    ft.enumerateInstances = Slot<&enumerateInstances>();
+    ft.enumerateInstanceNames = Slot<&enumerateInstanceNames, FaultKind::enumerateInstanceNames>();
+    ft.getInstance = Slot<&getInstance, FaultKind::getInstance>();
+    ft.createInstance = Slot<&createInstance, FaultKind::createInstance>();
+    ft.modifyInstance = Slot<&modifyInstance, FaultKind::modifyInstance>();
+    ft.deleteInstance = Slot<&deleteInstance, FaultKind::deleteInstance>();
+    ft.execQuery = Slot<&execQuery, FaultKind::execQuery>();
+    ft.enumerateInstances = Slot<&enumerateInstances, FaultKind::enumerateInstances>();
     fillAssociations(ft);
-    ft.invokeMethod = Slot<&invokeMethod>();
-    ft.setProperty = Slot<&setProperty>();
-    ft.getProperty = Slot<&getProperty>();
+    ft.invokeMethod = Slot<&invokeMethod, FaultKind::invokeMethod>();
+    ft.setProperty = Slot<&setProperty, FaultKind::setProperty>();
+    ft.getProperty = Slot<&getProperty, FaultKind::getProperty>();
     fillLater(ft, 0);
     return ft;
 }

@@ -61,6 +61,7 @@ struct Answer {
     std::vector<std::variant<ObjectPath, Instance>> results;
     std::optional<Value> returnValue;
     std::vector<NamedValue> out;
+    bool faulted = false; ///< whether the fault that the request asked for happened
 };
 
 } // namespace om

@@ -1,6 +1,7 @@
 #include "objectmanager/vkcim/Arguments.h"
 
 #include "objectmanager/vkcim/Commands.h"
+#include "objectmanager/vkcim/FaultText.h"
 
 #include <CLI/CLI.hpp>
 
@@ -104,6 +105,17 @@ private:
                       ->type_name("T")
                       ->check(CLI::Range(std::size_t{1}, mostThreads).description(""));
         app.add_flag("--timing", arguments.timing, "Print how long the runs took, as JSON on standard error");
+        addFaults();
+    }
+
+    void addFaults() {
+        fault =
+            app.add_option("--fault", faultText,
+                           "Let the N-th call of a broker operation fail in each run; N+ lets all from the N-th on\n"
+                           "fail, and :null behind it leaves the status OK")
+                ->type_name("KIND:N");
+        app.add_flag_callback(
+            "--list-faults", [] { throw CLI::CallForVersion(faultList(), 0); }, "Print every KIND and exit");
     }
 
     std::string explain(const CLI::Error& error) const {
@@ -139,11 +151,20 @@ private:
         arguments.operation = command->operation;
         arguments.format = formats.at(formatName);
         if (properties) arguments.properties = splitNames(*properties);
-        if (!command->operation && repeat->count() + threads->count() > 0) {
-            throw CLI::ValidationError("report", "--repeat and --threads do not go with it");
+        if (!command->operation && repeat->count() + threads->count() + fault->count() > 0) {
+            throw CLI::ValidationError("report", "--repeat, --threads and --fault do not go with it");
         }
+        if (fault->count() > 0) arguments.fault = readFault();
         if (command->takes != Takes::Nothing && arguments.subject.empty()) {
             throw CLI::ValidationError(name, "what it works on is empty");
+        }
+    }
+
+    om::Fault readFault() const {
+        try {
+            return parseFault(faultText);
+        } catch (const std::runtime_error& error) {
+            throw CLI::ValidationError("--fault", std::string(error.what()) + "; see 'vkcim --list-faults'");
         }
     }
 
@@ -153,6 +174,8 @@ private:
     std::optional<std::string> properties;
     CLI::Option* repeat = nullptr;
     CLI::Option* threads = nullptr;
+    std::string faultText;
+    CLI::Option* fault = nullptr;
 };
 
 } // namespace

@@ -27,6 +27,7 @@ struct Arguments {
     std::size_t repeat = 1;
     std::size_t threads = 1;
     bool timing = false;
+    std::optional<om::Fault> fault;
 };
 
 /// Either arguments to run, or a text to print and the status to exit with.

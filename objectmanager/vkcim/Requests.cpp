@@ -93,6 +93,7 @@ om::Request makeRequest(const Arguments& arguments, const om::Schema& schema, st
     request.role = arguments.role;
     request.resultRole = arguments.resultRole;
     request.method = arguments.method;
+    request.fault = arguments.fault;
     const Takes takes = taken(request.operation);
     if (takes == Takes::Query) {
         request.query = arguments.subject;

@@ -46,6 +46,8 @@ public:
               : arguments.format == Format::Mof ? mofText(repeated.answer, nameSpace, schema)
                                                 : plainAnswer(repeated.answer, {nameSpace, schema, streams.colours}));
         if (repeated.worst != 0) complain(repeated, request.path.className);
+        if (request.fault && !repeated.answer.faulted)
+            streams.error << "vkcim: the fault did not happen, as there were fewer such calls\n";
         printTiming(repeated.timing);
         return written(repeated.worst == 0 ? 0 : answeredError);
     }

@@ -273,6 +273,23 @@ TEST(Vkcim, TheDefaultLibraryIsTheOneBesideTheProgram) {
     EXPECT_EQ(support::runCommand({copy.path("bin/vkcim"), "--provider", "Echo", "names", "Echo_Thing"}).status, 0);
 }
 
+TEST(Vkcim, FaultsOfTheBrokerAreListedAndHitEveryRun) {
+    const Outcome list = support::runCommand({VKCIM, "--list-faults"});
+    EXPECT_EQ(list.status, 0);
+    EXPECT_THAT(list.output, HasSubstr("\nnewObjectPath\n"));
+    const Words all = {"--fault", "returnObjectPath:1", "--repeat", "3", "names", "Echo_Thing"};
+    EXPECT_EQ(answer(all).at("results").size(), 1u) << "one of two is lost, in the last run as in the first";
+    const Outcome never = vkcim({"--fault", "returnObjectPath:9", "names", "Echo_Thing"});
+    EXPECT_EQ(never.status, 0);
+    EXPECT_THAT(never.error, HasSubstr("the fault did not happen"));
+    for (const char* bad : {"nothing:1", "newInstance", "newInstance:0"}) {
+        const Outcome refused = vkcim({"--fault", bad, "names", "Echo_Thing"});
+        EXPECT_EQ(refused.status, 2) << bad;
+        EXPECT_THAT(refused.error, HasSubstr("--list-faults"));
+    }
+    EXPECT_EQ(vkcim({"--fault", "newInstance:1", "report"}).status, 2);
+}
+
 TEST(Vkcim, TheLastOutputIsOnTheDiskOrItSaysSo) {
     const Outcome outcome = support::runCommand(
         {"/bin/sh", "-c",
