@@ -42,7 +42,8 @@ bool ask(unsigned number) {
     case 1: {
         const om::Answer answer = test::instances("VESKA_CIMServiceConfig");
         if (answer.code != CMPI_RC_OK || answer.results.size() != 1) return false;
-        const om::Value* const value = test::find(test::instancesOf(answer)[0].properties, "deliveryRetryAttempts");
+        const om::Instance instance = test::instancesOf(answer)[0];
+        const om::Value* const value = test::find(instance.properties, "deliveryRetryAttempts");
         return value != nullptr && std::get<std::uint64_t>(value->data) == 20;
     }
     case 2:
