@@ -99,9 +99,12 @@ TEST_F(CMPICIMServiceConfigTest, LeavesTheValuesOutWhenTheCommandCannotBeStarted
     addCommand("echo 'Current value: 30'");
     test::isolated([] {
         test::instances(className); // what is opened once is open from now on
-        const rlimit none = {0, 0};
+        rlimit usual = {};
+        ASSERT_EQ(getrlimit(RLIMIT_NOFILE, &usual), 0);
+        const rlimit none = {0, usual.rlim_max};
         ASSERT_EQ(setrlimit(RLIMIT_NOFILE, &none), 0);
         const om::Answer answer = test::instances(className);
+        ASSERT_EQ(setrlimit(RLIMIT_NOFILE, &usual), 0);
         EXPECT_EQ(answer.code, CMPI_RC_OK);
         ASSERT_THAT(answer.results, SizeIs(1));
         EXPECT_THAT(test::namesOf(test::instancesOf(answer)[0].properties), ElementsAre("Name", "CreationClassName"));

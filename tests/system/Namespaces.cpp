@@ -43,35 +43,38 @@ bool leaveHost() {
            write("/proc/self/uid_map", "0 " + user + " 1") && write("/proc/self/gid_map", "0 " + group + " 1");
 }
 
-int runTests() {
-    const int result = RUN_ALL_TESTS();
+/// Runs `work` in a child, and answers what it exits with; 128 and the signal where one ended it.
+template <class Work>
+int inChild(Work work) {
     std::fflush(nullptr);
-    return result;
+    const pid_t child = fork();
+    if (child == 0) {
+        prctl(PR_SET_PDEATHSIG, SIGKILL);
+        work();
+    }
+    int status = 0;
+    while (waitpid(child, &status, 0) < 0)
+        if (errno != EINTR) return 1;
+    return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
 }
 
-/// The first process of the new namespaces.
+/// What the first process of the new namespaces does.
 [[noreturn]] void runInside() {
-    prctl(PR_SET_PDEATHSIG, SIGKILL);
     if (mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0)
         reason = failure("mounts cannot be made private");
     else if (mount("proc", "/proc", "proc", MS_NOSUID | MS_NOEXEC | MS_NODEV, nullptr) != 0)
         reason = failure("/proc cannot be mounted");
     else
         reason.clear();
-    std::exit(runTests());
+    std::exit(RUN_ALL_TESTS());
 }
 
-int runInNamespaces() {
-    if (!leaveHost()) {
-        reason = failure("this machine allows no namespaces");
-        return runTests();
-    }
-    const pid_t first = fork();
-    if (first == 0) runInside();
-    int status = 0;
-    while (waitpid(first, &status, 0) < 0)
-        if (errno != EINTR) return 1;
-    return WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
+/// What the process between does, which can start nothing more once the namespaces' first process is gone; a sanitizer
+/// would want to, at a usual exit.
+[[noreturn]] void leaveAndRun() {
+    if (leaveHost()) _exit(inChild(runInside));
+    reason = failure("this machine allows no namespaces");
+    std::exit(RUN_ALL_TESTS());
 }
 
 } // namespace
@@ -96,5 +99,5 @@ void nameHost(const std::string& name) {
 
 int main(int count, char** arguments) {
     testing::InitGoogleMock(&count, arguments);
-    return testing::GTEST_FLAG(list_tests) ? RUN_ALL_TESTS() : test::runInNamespaces();
+    return testing::GTEST_FLAG(list_tests) ? RUN_ALL_TESTS() : test::inChild(test::leaveAndRun);
 }
