@@ -6,20 +6,22 @@
 #include <string_view>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// An instant: seconds since 1970-01-01 00:00:00 UTC, and microseconds of the next one.
-    struct Instant {
-        std::int64_t seconds = 0;
-        std::int64_t microseconds = 0;
-    };
+/// An instant: seconds since 1970-01-01 00:00:00 UTC, and microseconds of the next one.
+struct Instant {
+    std::int64_t seconds = 0;
+    std::int64_t microseconds = 0;
+};
 
-    /// Reads a CIM date-time, `yyyymmddhhmmss.mmmmmm±uuu` with the offset in minutes. Microseconds that are left open
-    /// with asterisks count as zeros. Nothing for intervals, other asterisks and days that do not exist.
-    std::optional<Instant> parseCimDateTime(std::string_view text);
+/// Reads a CIM date-time, `yyyymmddhhmmss.mmmmmm±uuu` with the offset in minutes. Microseconds that are left open
+/// with asterisks count as zeros. Nothing for intervals, other asterisks and days that do not exist.
+std::optional<Instant> parseCimDateTime(std::string_view text);
 
-    /// The instant as a CIM date-time on a clock that many minutes east of UTC. The year must have four digits.
-    std::string formatCimDateTime(Instant instant, int offsetMinutes);
+/// The instant as a CIM date-time on a clock that many minutes east of UTC. The year must have four digits.
+std::string formatCimDateTime(Instant instant, int offsetMinutes);
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -7,20 +7,22 @@
 #include <string>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// Sets this host's clock to a CIM date-time, and then the hardware clock where there is one. True when the clock
-    /// was set; else false, with one log line that says why: the text is none, lies before 2000, the root is not this
-    /// host's, or the privilege CAP_SYS_TIME is missing. A change writes one line too: from when, to when, by which
-    /// user.
-    bool changeClock(const Root& root, const std::string& text);
+/// Sets this host's clock to a CIM date-time, and then the hardware clock where there is one. True when the clock
+/// was set; else false, with one log line that says why: the text is none, lies before 2000, the root is not this
+/// host's, or the privilege CAP_SYS_TIME is missing. A change writes one line too: from when, to when, by which
+/// user.
+bool changeClock(const Root& root, const std::string& text);
 
-    /// Why a text is not what a clock may be set to; empty, with `instant` filled in, when it is.
-    std::string checkClockText(const std::string& text, Instant& instant);
+/// Why a text is not what a clock may be set to; empty, with `instant` filled in, when it is.
+std::string checkClockText(const std::string& text, Instant& instant);
 
-    /// What a hardware clock is set to at an instant: UTC, or local time where it keeps that. Its seconds are the
-    /// nearest.
-    tm hardwareClockTime(Instant instant, int offsetSeconds);
+/// What a hardware clock is set to at an instant: UTC, or local time where it keeps that. Its seconds are the
+/// nearest.
+tm hardwareClockTime(Instant instant, int offsetSeconds);
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -6,36 +6,38 @@
 #include <string>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// What VK::Instrumentation is made of: a place among the nodes of one type, or on one node, of a host's tree as it
-    /// stood when the nodes were selected.
-    class Cursor {
-    public:
-        explicit Cursor(Host& ofHost) : host(ofHost) {}
+/// What VK::Instrumentation is made of: a place among the nodes of one type, or on one node, of a host's tree as it
+/// stood when the nodes were selected.
+class Cursor {
+public:
+    explicit Cursor(Host& ofHost) : host(ofHost) {}
 
-        void selectType(unsigned int type);
-        void selectPath(const std::string& path);
-        /// The node that the cursor stands on, or null.
-        const Node* node() const { return current; }
-        void advance();
-        void filterByPath(const std::string& path);
-        /// Moves off the end, for filters that no node passes.
-        void finish() { current = nullptr; }
+    void selectType(unsigned int type);
+    void selectPath(const std::string& path);
+    /// The node that the cursor stands on, or null.
+    const Node* node() const { return current; }
+    void advance();
+    void filterByPath(const std::string& path);
+    /// Moves off the end, for filters that no node passes.
+    void finish() { current = nullptr; }
 
-        std::optional<Value> read(unsigned int property) const;
-        bool write(unsigned int property, const Value& value);
-        std::optional<bool> isReadOnly(unsigned int property) const;
-        unsigned int status() const;
+    std::optional<Value> read(unsigned int property) const;
+    bool write(unsigned int property, const Value& value);
+    std::optional<bool> isReadOnly(unsigned int property) const;
+    unsigned int status() const;
 
-    private:
-        Host& host;
-        std::shared_ptr<const NodeTree> tree;
-        const NodeTree::Nodes* sameType = nullptr; ///< what ++ walks along; null after selectPath
-        std::size_t rank = 0;
-        const Node* current = nullptr;
-        bool filtered = false;
-    };
+private:
+    Host& host;
+    std::shared_ptr<const NodeTree> tree;
+    const NodeTree::Nodes* sameType = nullptr; ///< what ++ walks along; null after selectPath
+    std::size_t rank = 0;
+    const Node* current = nullptr;
+    bool filtered = false;
+};
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

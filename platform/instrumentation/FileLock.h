@@ -5,21 +5,23 @@
 #include <string>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// Holds a lock among processes and threads: the file `name` of a folder, made where it is missing, and left there.
-    class FileLock {
-    public:
-        /// Waits for the lock, ten seconds at most. `folder` may be AT_FDCWD.
-        FileLock(int folder, const std::string& name);
+/// Holds a lock among processes and threads: the file `name` of a folder, made where it is missing, and left there.
+class FileLock {
+public:
+    /// Waits for the lock, ten seconds at most. `folder` may be AT_FDCWD.
+    FileLock(int folder, const std::string& name);
 
-        /// 0 while the lock is held, else the errno value; EWOULDBLOCK when somebody else kept it.
-        int error() const { return failure; }
+    /// 0 while the lock is held, else the errno value; EWOULDBLOCK when somebody else kept it.
+    int error() const { return failure; }
 
-    private:
-        FileDescriptor file;
-        int failure = 0;
-    };
+private:
+    FileDescriptor file;
+    int failure = 0;
+};
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

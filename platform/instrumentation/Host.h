@@ -6,34 +6,36 @@
 #include <optional>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// A host as cursors see it: this one, a snapshot of one or a simulated one. Any number of threads may use it.
-    class Host {
-    public:
-        Host() = default;
-        virtual ~Host() = default;
-        Host(const Host&) = delete;
-        Host& operator=(const Host&) = delete;
+/// A host as cursors see it: this one, a snapshot of one or a simulated one. Any number of threads may use it.
+class Host {
+public:
+    Host() = default;
+    virtual ~Host() = default;
+    Host(const Host&) = delete;
+    Host& operator=(const Host&) = delete;
 
-        /// The tree as it stands now; never null.
-        virtual std::shared_ptr<const NodeTree> tree() = 0;
+    /// The tree as it stands now; never null.
+    virtual std::shared_ptr<const NodeTree> tree() = 0;
 
-        /// What a property of a node holds now.
-        virtual std::optional<Value> read(const Node& node, unsigned int property) = 0;
+    /// What a property of a node holds now.
+    virtual std::optional<Value> read(const Node& node, unsigned int property) = 0;
 
-        /// Writes a property: true, or false and a log line that says why.
-        virtual bool write(const Node& node, unsigned int property, const Value& value) = 0;
+    /// Writes a property: true, or false and a log line that says why.
+    virtual bool write(const Node& node, unsigned int property, const Value& value) = 0;
 
-        /// Whether a property can only be read; nothing where that is not known.
-        virtual std::optional<bool> isReadOnly(const Node& node, unsigned int property) = 0;
+    /// Whether a property can only be read; nothing where that is not known.
+    virtual std::optional<bool> isReadOnly(const Node& node, unsigned int property) = 0;
 
-        /// The node's status now.
-        virtual unsigned int status(const Node& node) = 0;
+    /// The node's status now.
+    virtual unsigned int status(const Node& node) = 0;
 
-        /// The host of this process (vk/HostSource.h), made when first asked for.
-        static Host& current();
-    };
+    /// The host of this process (vk/HostSource.h), made when first asked for.
+    static Host& current();
+};
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -6,10 +6,12 @@
 #include <vector>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// One line for each thing that the facts lack, and why.
-    std::vector<std::string> notesOn(const HardwareFacts& facts);
+/// One line for each thing that the facts lack, and why.
+std::vector<std::string> notesOn(const HardwareFacts& facts);
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -5,28 +5,30 @@
 #include <string_view>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// The longest text that a property carries, in bytes.
-    constexpr std::size_t LONGEST_TEXT = 256;
+/// The longest text that a property carries, in bytes.
+constexpr std::size_t LONGEST_TEXT = 256;
 
-    /// Without blanks, tabs, line ends and NULs at both ends.
-    std::string_view trimmed(std::string_view text);
+/// Without blanks, tabs, line ends and NULs at both ends.
+std::string_view trimmed(std::string_view text);
 
-    /// The same length, each byte below 0x20 and from 0x7F on being a dot.
-    std::string printable(std::string_view text);
+/// The same length, each byte below 0x20 and from 0x7F on being a dot.
+std::string printable(std::string_view text);
 
-    /// A text of the firmware as properties carry it: trimmed, printable, at most 256 bytes.
-    std::string cleanText(std::string_view text);
+/// A text of the firmware as properties carry it: trimmed, printable, at most 256 bytes.
+std::string cleanText(std::string_view text);
 
-    /// A text that an administrator wrote: as above, but what is UTF-8 stays UTF-8.
-    std::string cleanWrittenText(std::string_view text);
+/// A text that an administrator wrote: as above, but what is UTF-8 stays UTF-8.
+std::string cleanWrittenText(std::string_view text);
 
-    /// ASCII letters in lower case; other bytes stay.
-    std::string lowerCase(std::string_view text);
+/// ASCII letters in lower case; other bytes stay.
+std::string lowerCase(std::string_view text);
 
-    /// The text up to the first line end.
-    std::string_view firstLine(std::string_view text);
+/// The text up to the first line end.
+std::string_view firstLine(std::string_view text);
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -1,10 +1,12 @@
 #pragma once
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// Whether the processor says that it runs under KVM; false on processors that cannot say it.
-    bool processorSaysKvm();
+/// Whether the processor says that it runs under KVM; false on processors that cannot say it.
+bool processorSaysKvm();
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -7,33 +7,35 @@
 #include <mutex>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// This host, or a snapshot of one below another root. What cannot change while a host runs is read once.
-    class RealHost final : public Host {
-    public:
-        explicit RealHost(const Root& hostRoot) : root(hostRoot) {}
+/// This host, or a snapshot of one below another root. What cannot change while a host runs is read once.
+class RealHost final : public Host {
+public:
+    explicit RealHost(const Root& hostRoot) : root(hostRoot) {}
 
-        std::shared_ptr<const NodeTree> tree() override;
-        std::optional<Value> read(const Node& node, unsigned int property) override;
-        bool write(const Node& node, unsigned int property, const Value& value) override;
-        std::optional<bool> isReadOnly(const Node& node, unsigned int property) override;
-        unsigned int status(const Node& node) override;
+    std::shared_ptr<const NodeTree> tree() override;
+    std::optional<Value> read(const Node& node, unsigned int property) override;
+    bool write(const Node& node, unsigned int property, const Value& value) override;
+    std::optional<bool> isReadOnly(const Node& node, unsigned int property) override;
+    unsigned int status(const Node& node) override;
 
-        /// The facts behind the tree.
-        const HardwareFacts& hardware();
-        /// The problem of a root that cannot be used, or an empty text.
-        const std::string& problem();
+    /// The facts behind the tree.
+    const HardwareFacts& hardware();
+    /// The problem of a root that cannot be used, or an empty text.
+    const std::string& problem();
 
-    private:
-        void readOnce();
+private:
+    void readOnce();
 
-        const Root root;
-        std::once_flag once;
-        HardwareFacts facts;
-        std::string rootProblem;
-        std::shared_ptr<const NodeTree> nodes;
-    };
+    const Root root;
+    std::once_flag once;
+    HardwareFacts facts;
+    std::string rootProblem;
+    std::shared_ptr<const NodeTree> nodes;
+};
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

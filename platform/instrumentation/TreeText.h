@@ -8,23 +8,24 @@
 #include <vector>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// A simulated host's file, read.
-    struct TreeText {
-        std::vector<Node> nodes;
-        ProductOverrides product;
-        std::string problem; ///< why the text was refused, with the byte where that showed; empty when it was not
-    };
+/// A simulated host's file, read.
+struct TreeText {
+    std::vector<Node> nodes;
+    ProductOverrides product;
+    std::string problem; ///< why the text was refused, with the byte where that showed; empty when it was not
+};
 
-    /// Reads the JSON text of a simulated host. Unknown keys, keys and paths given twice, and values that do not fit
-    /// are refused; then there are no nodes and no overrides.
-    TreeText readTreeText(std::string_view text);
+/// Reads the JSON text of a simulated host. Unknown keys, keys and paths given twice, and values that do not fit
+/// are refused; then there are no nodes and no overrides.
+TreeText readTreeText(std::string_view text);
 
-    /// The text with one property of the node at `path` changed or added; everything else keeps its value and its
-    /// order. Empty when the text cannot be read, has no such node, or the new text would not be UTF-8.
-    std::string changeTreeText(std::string_view text, const std::string& path, unsigned int property,
-                               const Value& value);
+/// The text with one property of the node at `path` changed or added; everything else keeps its value and its
+/// order. Empty when the text cannot be read, has no such node, or the new text would not be UTF-8.
+std::string changeTreeText(std::string_view text, const std::string& path, unsigned int property, const Value& value);
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

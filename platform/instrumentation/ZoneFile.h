@@ -9,46 +9,48 @@
 #include <vector>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// What a time zone file (TZif) says. Offsets are seconds east of UTC, instants seconds since 1970.
-    class Zone {
-    public:
-        /// A kind of local time.
-        struct LocalTime {
-            std::int32_t offset = 0;
-            bool daylight = false;
-        };
-        struct Transition {
-            std::int64_t instant = 0;
-            std::size_t localTime = 0; ///< index of what is in force from then on
-        };
-
-        /// UTC.
-        Zone() : localTimes(1) {}
-        Zone(std::vector<LocalTime> times, std::vector<Transition> all, std::optional<PosixRule> last)
-            : localTimes(std::move(times)), transitions(std::move(all)), rule(last) {}
-
-        /// What is in force at an instant.
-        LocalTime at(std::int64_t instant) const;
-        /// The offset without daylight saving: the one in force or, during daylight saving, the one that it ends in.
-        std::int32_t standardOffsetAt(std::int64_t instant) const;
-        /// Whether daylight saving is in force at the instant or comes into force later.
-        bool hasDaylightSavingFrom(std::int64_t instant) const;
-
-    private:
-        std::size_t passedAt(std::int64_t instant) const;
-
-        std::vector<LocalTime> localTimes; ///< never empty
-        std::vector<Transition> transitions;
-        std::optional<PosixRule> rule; ///< what follows the last transition
+/// What a time zone file (TZif) says. Offsets are seconds east of UTC, instants seconds since 1970.
+class Zone {
+public:
+    /// A kind of local time.
+    struct LocalTime {
+        std::int32_t offset = 0;
+        bool daylight = false;
+    };
+    struct Transition {
+        std::int64_t instant = 0;
+        std::size_t localTime = 0; ///< index of what is in force from then on
     };
 
-    /// Reads a zone file; nothing unless it is whole and right.
-    std::optional<Zone> parseZoneFile(std::string_view bytes);
+    /// UTC.
+    Zone() : localTimes(1) {}
+    Zone(std::vector<LocalTime> times, std::vector<Transition> all, std::optional<PosixRule> last)
+        : localTimes(std::move(times)), transitions(std::move(all)), rule(last) {}
 
-    /// A zone file (version 2) for one offset for ever, in whole minutes; its name is its offset, `+0530`.
-    std::string makeZoneFile(std::int32_t offsetMinutes);
+    /// What is in force at an instant.
+    LocalTime at(std::int64_t instant) const;
+    /// The offset without daylight saving: the one in force or, during daylight saving, the one that it ends in.
+    std::int32_t standardOffsetAt(std::int64_t instant) const;
+    /// Whether daylight saving is in force at the instant or comes into force later.
+    bool hasDaylightSavingFrom(std::int64_t instant) const;
 
-} // namespace )
+private:
+    std::size_t passedAt(std::int64_t instant) const;
+
+    std::vector<LocalTime> localTimes; ///< never empty
+    std::vector<Transition> transitions;
+    std::optional<PosixRule> rule; ///< what follows the last transition
+};
+
+/// Reads a zone file; nothing unless it is whole and right.
+std::optional<Zone> parseZoneFile(std::string_view bytes);
+
+/// A zone file (version 2) for one offset for ever, in whole minutes; its name is its offset, `+0530`.
+std::string makeZoneFile(std::int32_t offsetMinutes);
+
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

@@ -5,40 +5,42 @@
 #include <string>
 
 namespace VK {
-namespace Inside __attribute__((visibility("hidden"))) {
+#pragma GCC visibility push(hidden)
+namespace Inside {
 
-    /// One change of the files that make the time zone: /etc/localtime, /etc/timezone where there is one, and in
-    /// /var/lib/vk/instrumentation what they were before. Changes of several processes wait for each other.
-    class ZoneFiles {
-    public:
-        /// Which of the zones replaced one after the other is kept.
-        enum Keep { KeepFirst, KeepLatest };
+/// One change of the files that make the time zone: /etc/localtime, /etc/timezone where there is one, and in
+/// /var/lib/vk/instrumentation what they were before. Changes of several processes wait for each other.
+class ZoneFiles {
+public:
+    /// Which of the zones replaced one after the other is kept.
+    enum Keep { KeepFirst, KeepLatest };
 
-        explicit ZoneFiles(const Root& hostRoot) : root(hostRoot) {}
+    explicit ZoneFiles(const Root& hostRoot) : root(hostRoot) {}
 
-        /// Puts a zone of that offset for ever into force; false when nothing was changed.
-        bool replaceByOffset(int minutes, Keep keep);
-        /// Puts the zone that was kept into force again; false when nothing was changed.
-        bool bringBack();
+    /// Puts a zone of that offset for ever into force; false when nothing was changed.
+    bool replaceByOffset(int minutes, Keep keep);
+    /// Puts the zone that was kept into force again; false when nothing was changed.
+    bool bringBack();
 
-        /// Why nothing was changed.
-        const std::string& problem() const { return why; }
-        /// What /etc/localtime was and is, for people.
-        const std::string& before() const { return was; }
-        const std::string& after() const { return is; }
+    /// Why nothing was changed.
+    const std::string& problem() const { return why; }
+    /// What /etc/localtime was and is, for people.
+    const std::string& before() const { return was; }
+    const std::string& after() const { return is; }
 
-    private:
-        struct Session;
+private:
+    struct Session;
 
-        bool fail(const std::string& what, int error = 0);
-        bool begin(Session& session);
-        bool put(const Session& session, const SavedZone& wanted);
+    bool fail(const std::string& what, int error = 0);
+    bool begin(Session& session);
+    bool put(const Session& session, const SavedZone& wanted);
 
-        const Root& root;
-        std::string why;
-        std::string was;
-        std::string is;
-    };
+    const Root& root;
+    std::string why;
+    std::string was;
+    std::string is;
+};
 
-} // namespace )
+} // namespace Inside
+#pragma GCC visibility pop
 } // namespace VK

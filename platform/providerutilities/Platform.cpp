@@ -4,6 +4,8 @@
 
 namespace VK {
 
-bool ProviderUtilities::isKVM() { return hostIsKVM(); }
+bool ProviderUtilities::isKVM() {
+    return hostIsKVM();
+}
 
 } // namespace VK
