@@ -2,6 +2,8 @@
 
 #include "nvlog/NVLogger.h"
 
+#include <stdexcept>
+
 #include <cxxabi.h>
 
 namespace VK::Cmpi {
@@ -10,22 +12,39 @@ bool hasValue(const CMPIData& data, const CMPIStatus& status) {
     return succeeded(status) && (data.state & (CMPI_nullValue | CMPI_notFound | CMPI_badValue)) == 0;
 }
 
-const char* textOf(const CMPIString* string) {
+void requireTold(const CMPIStatus& status, const char* what) {
+    if (succeeded(status) || isAbsent(status)) return;
+    throw std::runtime_error(std::string("The broker could not tell ") + what + ", return code " +
+                             std::to_string(static_cast<int>(status.rc)));
+}
+
+const char* textOf(const CMPIString* string, CMPIStatus& status) {
+    status = freshStatus();
     if (!hasSlot(string, &CMPIStringFT::getCharPtr)) return nullptr;
-    CMPIStatus status = freshStatus();
     const char* const text = string->ft->getCharPtr(string, &status);
     return succeeded(status) ? text : nullptr;
 }
 
-const char* textOf(const CMPIData& data) {
+const char* textOf(const CMPIString* string) {
+    CMPIStatus status;
+    return textOf(string, status);
+}
+
+const char* textOf(const CMPIData& data, CMPIStatus& status) {
+    status = freshStatus();
     switch (data.type) {
     case CMPI_string:
-        return textOf(data.value.string);
+        return textOf(data.value.string, status);
     case CMPI_chars:
         return data.value.chars;
     default:
         return nullptr;
     }
+}
+
+const char* textOf(const CMPIData& data) {
+    CMPIStatus status;
+    return textOf(data, status);
 }
 
 const CMPIValue* asChars(const char* text) {

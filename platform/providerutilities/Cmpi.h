@@ -34,13 +34,24 @@ bool hasService(const CMPIBroker* broker, Slot CMPIBrokerEncFT::*slot) {
     return broker != nullptr && broker->eft != nullptr && broker->eft->*slot != nullptr;
 }
 
+/// Some brokers count a class's keys that the path does not have, and say so when asked for them.
+constexpr bool isAbsent(const CMPIStatus& status) {
+    return status.rc == CMPI_RC_ERR_NO_SUCH_PROPERTY || status.rc == CMPI_RC_ERR_NOT_FOUND;
+}
+
+/// Throws std::runtime_error for a status that is neither success nor absence: the broker could not tell `what`, so
+/// that nobody takes it for not being there.
+void requireTold(const CMPIStatus& status, const char* what);
+
 /// Whether an answer holds a value.
 bool hasValue(const CMPIData& data, const CMPIStatus& status);
 
-/// A string's text, valid as long as the string; null when it has none.
+/// A string's text, valid as long as the string; null when it has none, or when `status` tells a failure.
+const char* textOf(const CMPIString* string, CMPIStatus& status);
 const char* textOf(const CMPIString* string);
 
-/// A value's text when it is a text; null otherwise.
+/// A value's text when it is a text; null otherwise, or when `status` tells a failure.
+const char* textOf(const CMPIData& data, CMPIStatus& status);
 const char* textOf(const CMPIData& data);
 
 /// How a text is handed to a slot with the type CMPI_chars: as itself, not as a value that points to it.

@@ -58,6 +58,14 @@ bool setArray(const CMPIBroker* broker, CMPIInstance* instance, const char* name
     return set(instance, name, &value, static_cast<CMPIType>(CMPI_ARRAY | elementType));
 }
 
+/// For messages; null where the broker does not tell.
+const char* classOf(const CMPIObjectPath* path) {
+    if (!Cmpi::hasSlot(path, &CMPIObjectPathFT::getClassName)) return nullptr;
+    CMPIStatus status = Cmpi::freshStatus();
+    const CMPIString* const name = path->ft->getClassName(path, &status);
+    return Cmpi::succeeded(status) ? Cmpi::textOf(name) : nullptr;
+}
+
 bool setDateTime(const CMPIBroker* broker, CMPIInstance* instance, const char* name, const std::string& text) {
     CMPIStatus status = UNUSABLE;
     CMPIValue value{};
@@ -75,7 +83,9 @@ CMPIInstance* ProviderUtilities::createInstance(const CMPIBroker* broker, CMPIOb
     if (objectPath == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newInstance)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();
     CMPIInstance* const instance = broker->eft->newInstance(broker, objectPath, &status);
-    return Cmpi::succeeded(status) ? instance : nullptr;
+    if (instance != nullptr && Cmpi::succeeded(status)) return instance;
+    Cmpi::refused("createInstance", __LINE__, "an instance of the class", classOf(objectPath), status);
+    return nullptr;
 }
 
 bool ProviderUtilities::setProperty(CMPIInstance* instance, const char* name, std::string& value) {

@@ -8,13 +8,13 @@ namespace VK {
 
 namespace {
 
-/// A key's value as a moniker has it; none for references, nulls and other kinds.
-std::optional<std::string> valueText(const CMPIData& key) {
+/// A key's value as a moniker has it; none for references, nulls and other kinds, and when `status` tells a failure.
+std::optional<std::string> valueText(const CMPIData& key, CMPIStatus& status) {
     const CMPIValue& value = key.value;
     switch (key.type) {
     case CMPI_string:
     case CMPI_chars:
-        if (const char* const text = Cmpi::textOf(key); text != nullptr) return text;
+        if (const char* const text = Cmpi::textOf(key, status); text != nullptr) return text;
         return std::nullopt;
     case CMPI_boolean:
         return value.boolean != 0 ? "TRUE" : "FALSE";
@@ -39,22 +39,17 @@ std::optional<std::string> valueText(const CMPIData& key) {
     }
 }
 
-/// Some brokers count a class's keys that the path does not have, and say so when asked for them.
-bool isAbsent(const CMPIStatus& status) {
-    return status.rc == CMPI_RC_ERR_NO_SUCH_PROPERTY || status.rc == CMPI_RC_ERR_NOT_FOUND;
-}
-
 bool appendKey(const CMPIObjectPath* path, CMPICount index, Moniker& moniker) {
     CMPIStatus status = Cmpi::freshStatus();
     CMPIString* keyName = nullptr;
     const CMPIData key = path->ft->getKeyAt(path, index, &keyName, &status);
-    if (isAbsent(status)) return true;
+    if (Cmpi::isAbsent(status)) return true;
     if (!Cmpi::succeeded(status)) return false;
     if (!Cmpi::hasValue(key, status)) return true;
     const char* const name = Cmpi::textOf(keyName);
     if (name == nullptr) return false;
-    if (const auto value = valueText(key)) moniker.addKey(name, *value);
-    return true;
+    if (const auto value = valueText(key, status)) moniker.addKey(name, *value);
+    return Cmpi::succeeded(status);
 }
 
 } // namespace

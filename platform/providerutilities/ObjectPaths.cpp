@@ -8,6 +8,8 @@ namespace VK {
 
 namespace {
 
+constexpr char keysOfPath[] = "the keys of a path";
+
 CMPIData absent() {
     CMPIData data{};
     data.state = CMPI_nullValue | CMPI_notFound;
@@ -22,8 +24,11 @@ CMPIData findKey(const CMPIObjectPath* path, const char* name) {
         CMPIStatus status = Cmpi::freshStatus();
         CMPIString* keyName = nullptr;
         const CMPIData key = path->ft->getKeyAt(path, i, &keyName, &status);
-        const char* const text = Cmpi::textOf(keyName);
-        if (Cmpi::hasValue(key, status) && text != nullptr && strcasecmp(text, name) == 0) return key;
+        Cmpi::requireTold(status, keysOfPath);
+        if (!Cmpi::hasValue(key, status)) continue;
+        const char* const text = Cmpi::textOf(keyName, status);
+        Cmpi::requireTold(status, keysOfPath);
+        if (text != nullptr && strcasecmp(text, name) == 0) return key;
     }
     return absent();
 }
@@ -51,7 +56,8 @@ std::string ProviderUtilities::getNamespace(const CMPIObjectPath* objectPath) {
     if (!Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getNameSpace)) return {};
     CMPIStatus status = Cmpi::freshStatus();
     const CMPIString* const nameSpace = objectPath->ft->getNameSpace(objectPath, &status);
-    const char* const text = Cmpi::succeeded(status) ? Cmpi::textOf(nameSpace) : nullptr;
+    const char* const text = Cmpi::succeeded(status) ? Cmpi::textOf(nameSpace, status) : nullptr;
+    Cmpi::requireTold(status, "the namespace of a path");
     return text != nullptr ? text : "";
 }
 
@@ -60,19 +66,24 @@ CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, co
     if (className == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newObjectPath)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();
     CMPIObjectPath* const path = broker->eft->newObjectPath(broker, nameSpace.c_str(), className, &status);
-    return Cmpi::succeeded(status) ? path : nullptr;
+    if (path != nullptr && Cmpi::succeeded(status)) return path;
+    Cmpi::refused("createObjectPath", __LINE__, "a path of the class", className, status);
+    return nullptr;
 }
 
 unsigned int ProviderUtilities::getKeyCount(const CMPIObjectPath* objectPath) {
     if (!Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getKeyCount)) return 0;
     CMPIStatus status = Cmpi::freshStatus();
     const CMPICount count = objectPath->ft->getKeyCount(objectPath, &status);
+    Cmpi::requireTold(status, keysOfPath);
     return Cmpi::succeeded(status) ? count : 0;
 }
 
 bool ProviderUtilities::getKeyProperty(const CMPIObjectPath* objectPath, const char* name, std::string& value) {
     const CMPIData key = getKey(objectPath, name);
-    const char* const text = (key.state & CMPI_nullValue) == 0 ? Cmpi::textOf(key) : nullptr;
+    CMPIStatus status = Cmpi::freshStatus();
+    const char* const text = (key.state & CMPI_nullValue) == 0 ? Cmpi::textOf(key, status) : nullptr;
+    Cmpi::requireTold(status, keysOfPath);
     if (text == nullptr) return false;
     value = text;
     return true;

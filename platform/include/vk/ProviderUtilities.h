@@ -13,8 +13,9 @@ namespace VK {
 /// What a provider does with CMPI objects, on top of any broker.
 ///
 /// Every status and null that the broker answers is checked. A key or property that the broker refuses is left out
-/// and logged once, at level 6000. Paths, instances and arrays belong to the broker and are never freed here. Nothing
-/// is thrown but std::bad_alloc. A null path, instance or argument list has no keys, properties or arguments.
+/// and logged once, at level 6000, and so is a path or an instance that it does not make. Paths, instances and arrays
+/// belong to the broker and are never freed here. Nothing is thrown but std::bad_alloc, and std::runtime_error where
+/// said: a request whose keys cannot be read must not be taken for one without them, which means all. A null path, instance or argument list has no keys, properties or arguments.
 class ProviderUtilities {
 public:
     /// The class identifier of names that the class table does not hold.
@@ -30,17 +31,18 @@ public:
     static bool areClassesRelated(const CMPIBroker* broker, const std::string& nameSpace, const char* className,
                                   const char* otherClassName);
 
-    /// A path's namespace; empty when it has none.
+    /// A path's namespace; empty when it has none. Throws std::runtime_error when the broker answers an error.
     static std::string getNamespace(const CMPIObjectPath* objectPath);
 
     /// A new path without keys, or null.
     static CMPIObjectPath* createObjectPath(const CMPIBroker* broker, const char* className, std::string nameSpace);
 
-    /// How many keys the path has; 0 for a class path.
+    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker answers an error.
     static unsigned int getKeyCount(const CMPIObjectPath* objectPath);
 
     /// Reads a text or a reference key, its name without regard to case: true and the value, or false (no such key, of
-    /// another type, or null) with `value` untouched.
+    /// another type, or null) with `value` untouched. Throws std::runtime_error when the broker answers an error, other
+    /// than that the key is not there, to every way of asking.
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, std::string& value);
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, CMPIObjectPath** value);
 

@@ -46,8 +46,11 @@ TEST_F(Instances, AreMadeOfAPath) {
     EXPECT_NE(ProviderUtilities::createInstance(fake.get(), path), nullptr);
     EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), nullptr), nullptr);
     EXPECT_EQ(ProviderUtilities::createInstance(nullptr, path), nullptr);
+    EXPECT_THAT(takeLog(), IsEmpty());
     fake.refusals = {{"newInstance", CMPI_RC_ERR_NOT_FOUND}};
     EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
+    EXPECT_THAT(takeLog(), ElementsAre("LOG 6000 Norvane.ProviderUtilities The broker refused an instance of the class "
+                                       "CIM_System, return code 6"));
     fake.encapsulated.newInstance = nullptr;
     EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
 }

@@ -5,6 +5,8 @@
 
 #include <gmock/gmock.h>
 
+#include <stdexcept>
+
 using testing::ElementsAre;
 using testing::IsEmpty;
 using VK::ProviderUtilities;
@@ -55,8 +57,10 @@ TEST_F(ObjectPaths, HaveANamespace) {
     EXPECT_EQ(ProviderUtilities::getNamespace(path), "root/cimv2");
     EXPECT_EQ(ProviderUtilities::getNamespace(fake.makePath("", "C")), "");
     EXPECT_EQ(ProviderUtilities::getNamespace(nullptr), "");
-    fake.refusals = {{"getNameSpace", CMPI_RC_ERR_FAILED}};
-    EXPECT_EQ(ProviderUtilities::getNamespace(path), "");
+    for (const char* slot : {"getNameSpace", "getCharPtr"}) {
+        fake.refusals = {{slot, CMPI_RC_ERR_FAILED}};
+        EXPECT_THROW(ProviderUtilities::getNamespace(path), std::runtime_error) << slot;
+    }
     fake.refusals = {};
     fake.nullAnswers = {"getNameSpace"};
     EXPECT_EQ(ProviderUtilities::getNamespace(path), "");
@@ -77,9 +81,16 @@ TEST_F(ObjectPaths, AreNullWhereTheBrokerMakesNone) {
     EXPECT_EQ(ProviderUtilities::createObjectPath(fake.get(), nullptr, "root/x"), nullptr);
     fake.refusals = {{"newObjectPath", CMPI_RC_ERR_FAILED}};
     EXPECT_EQ(make(), nullptr);
+    EXPECT_THAT(takeLog(), ElementsAre("LOG 6000 Norvane.ProviderUtilities The broker refused a path of the class "
+                                       "CIM_System, return code 1"));
     fake.refusals = {};
+    fake.nullAnswers = {"newObjectPath"};
+    EXPECT_EQ(make(), nullptr);
+    EXPECT_EQ(takeLog().size(), 1U);
+    fake.nullAnswers = {};
     fake.writesStatus = false;
     EXPECT_NE(make(), nullptr);
+    EXPECT_THAT(takeLog(), IsEmpty());
     fake.encapsulated.newObjectPath = nullptr;
     EXPECT_EQ(make(), nullptr);
     fake.broker.eft = nullptr;
@@ -90,7 +101,8 @@ TEST_F(Keys, AreCounted) {
     EXPECT_EQ(ProviderUtilities::getKeyCount(path), 6U);
     EXPECT_EQ(ProviderUtilities::getKeyCount(nullptr), 0U);
     fake.refusals = {{"getKeyCount", CMPI_RC_ERR_FAILED}};
-    EXPECT_EQ(ProviderUtilities::getKeyCount(path), 0U);
+    EXPECT_THROW(ProviderUtilities::getKeyCount(path), std::runtime_error)
+        << "not a path without keys, which means all";
     fake.pathTable.getKeyCount = nullptr;
     EXPECT_EQ(ProviderUtilities::getKeyCount(path), 0U);
 }
@@ -131,12 +143,18 @@ TEST_F(Keys, AreFoundAmongAllWhereTheBrokerFindsNone) {
     EXPECT_EQ(text("name"), "-");
 }
 
-TEST_F(Keys, AreAbsentWhereTheBrokerDoesNotTellThem) {
+TEST_F(Keys, AreNotTakenForAbsentWhereTheBrokerCannotTellThem) {
+    fake.refusals = {{"getKey", CMPI_RC_ERR_FAILED}};
+    EXPECT_EQ(text("Name"), "node7") << "found among all";
+    EXPECT_EQ(text("None"), "-");
     fake.refusals = {{"getKey", CMPI_RC_ERR_FAILED}, {"getKeyAt", CMPI_RC_ERR_FAILED}};
-    EXPECT_EQ(text("Name"), "-");
-    EXPECT_EQ(reference("System"), nullptr);
+    EXPECT_THROW(text("Name"), std::runtime_error);
+    EXPECT_THROW(reference("System"), std::runtime_error);
+    fake.refusals = {{"getKey", CMPI_RC_ERR_FAILED}, {"getKeyCount", CMPI_RC_ERR_FAILED}};
+    EXPECT_THROW(text("Name"), std::runtime_error);
     fake.refusals = {{"getCharPtr", CMPI_RC_ERR_FAILED}};
-    EXPECT_EQ(text("Name"), "-");
+    EXPECT_THROW(text("Name"), std::runtime_error);
+    EXPECT_THROW(text("None"), std::runtime_error) << "its name could be any of those that cannot be read";
 }
 
 TEST_F(ObjectPaths, TakeTextAndReferenceKeys) {
