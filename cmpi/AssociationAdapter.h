@@ -26,12 +26,15 @@ public:
     AssociationAdapter(const AssociationAdapter&) = delete;
     AssociationAdapter& operator=(const AssociationAdapter&) = delete;
 
-    /// The path of the association that stands now, with both references; null when one end is missing.
+    /// The path of the association that stands now, with both references; null when one end is missing, and when the
+    /// broker could not tell the class of the request's path, whose keys then have chosen nothing.
     CMPIObjectPath* getObjectPath() const {
         const TraceScope scope(Self::traceSource());
+        if (requestedClassId == ProviderUtilities::CLASS_ID_UNKNOWN) return nullptr;
         if (!computer || !partner) return nullptr;
         CMPIObjectPath* const computerPath = computer.getObjectPath();
         CMPIObjectPath* const partnerPath = partner.getObjectPath();
+        if (computerPath == nullptr || partnerPath == nullptr) return nullptr; // what was refused is logged
         CMPIObjectPath* path = createPath(Self::className);
         if (path == nullptr) return nullptr;
         for (const char* role : roles())

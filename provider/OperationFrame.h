@@ -60,12 +60,17 @@ private:
     const char* const function;
 };
 
+/// Tells of a part of the answer that the object manager did not take. The rest is handed over all the same.
+inline void noteRefusal(const TracePoint& at, const CMPIStatus& status) {
+    if (status.rc != CMPI_RC_OK) traceMessage(at, "The object manager refused a part of the answer", FailureLevel);
+}
+
 /// Hand an adapter's answer to the object manager; a null, which stands for nothing, is not handed over.
 inline void returnPath(const CMPIResult* result, CMPIObjectPath* path) {
-    if (path != nullptr) CMReturnObjectPath(result, path);
+    if (path != nullptr) noteRefusal(frameSource, CMReturnObjectPath(result, path));
 }
 inline void returnInstance(const CMPIResult* result, CMPIInstance* instance) {
-    if (instance != nullptr) CMReturnInstance(result, instance);
+    if (instance != nullptr) noteRefusal(frameSource, CMReturnInstance(result, instance));
 }
 
 } // namespace VK::BaseServerProvider
