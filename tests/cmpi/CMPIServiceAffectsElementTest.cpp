@@ -135,9 +135,13 @@ TEST(CMPITimeServiceAffectsElement, OfAnotherHostsKeysIsStillThisHostsPair) {
     test::simulate({test::computer(0, "one")});
     om::Request request;
     request.operation = om::Operation::EnumInstanceNames;
-    request.path = test::associationPath(association, {{"AffectedElement", computer("another host")},
-                                                       {"AffectingElement", timeService("another host")}});
-    EXPECT_THAT(printed(test::provider().run(request)), ElementsAre(pairOf("one")));
+    for (const om::ObjectPath& asked :
+         {test::associationPath(association, {{"AffectedElement", computer("another host")},
+                                              {"AffectingElement", timeService("another host")}}),
+          test::path(association, {{"Name", "another host"}, {"SystemName", "another host"}})}) {
+        request.path = asked;
+        EXPECT_THAT(printed(test::provider().run(request)), ElementsAre(pairOf("one")));
+    }
 }
 
 TEST(CMPITimeServiceAffectsElement, CarriesItsReferencesAsProperties) {

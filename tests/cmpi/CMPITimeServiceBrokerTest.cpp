@@ -87,6 +87,27 @@ TEST_F(CMPITimeServiceBrokerTest, RefusesMissingArgumentsAndACountThatFails) {
     EXPECT_EQ(invoke(&failing), 4U);
 }
 
+TEST_F(CMPITimeServiceBrokerTest, RefusesAWrongCountBeforeAnyArgumentIsLookedAt) {
+    static CMPICount count;
+    static unsigned int looks;
+    looks = 0;
+    CMPIArgsFT table = *out->ft;
+    table.getArgCount = [](const CMPIArgs*, CMPIStatus*) { return count; };
+    table.getArg = [](const CMPIArgs*, const char*, CMPIStatus*) {
+        ++looks;
+        return CMPIData{};
+    };
+    const CMPIArgs in = {out->hdl, &table};
+    for (const CMPICount wrong : {0U, 1U, 4U, 5U, 4294967295U}) {
+        count = wrong;
+        EXPECT_EQ(invoke(&in), 4U) << wrong;
+    }
+    EXPECT_EQ(looks, 0U);
+    count = 2;
+    EXPECT_EQ(invoke(&in), 4U);
+    EXPECT_GT(looks, 0U);
+}
+
 TEST_F(CMPITimeServiceBrokerTest, FailsWithoutOutArgumentsAndTouchesNothing) {
     out = nullptr;
     EXPECT_EQ(invoke(arguments(true)), 1U);

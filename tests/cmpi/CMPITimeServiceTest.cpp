@@ -1,9 +1,12 @@
 #include "support/FakeCommands.h"
+#include "support/Isolated.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
 #include <gmock/gmock.h>
 
+#include <csignal>
+#include <ctime>
 #include <unistd.h>
 
 namespace {
@@ -198,6 +201,14 @@ TEST_F(CMPITimeServiceTest, AnswersOneWhenTheSynchronisationFailsAlthoughTheTime
     EXPECT_EQ(answer.code, CMPI_RC_ERR_FAILED);
     EXPECT_THAT(answer.out, IsEmpty());
     EXPECT_EQ(test::simulatedProperty("/computer/0", 126), "20240101110000.000000+000");
+}
+
+TEST_F(CMPITimeServiceTest, SetsTheTimeAlsoWithSigchldIgnored) {
+    test::isolated([&] {
+        std::signal(SIGCHLD, SIG_IGN);
+        EXPECT_EQ(manage(setting("20240101120000.000000+060")).code, CMPI_RC_OK);
+        EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "ntpd [-xgq]"));
+    });
 }
 
 } // namespace
