@@ -102,7 +102,7 @@ TEST_F(InstrumentationTest, ReadsAndWritesASimulatedHost) {
         EXPECT_TRUE(hostIsKVM());
         EXPECT_EQ(productOverrides().uid, "u");
         EXPECT_FALSE(productOverrides().architecture.has_value());
-        EXPECT_TRUE(hostNotes().empty());
+        EXPECT_EQ(hostNotes().front().rfind("time service: NTP daemon ", 0), 0U) << "nothing is missing";
     });
 }
 
@@ -112,7 +112,7 @@ TEST_F(InstrumentationTest, SaysInANoteWhyATreeIsEmpty) {
         Instrumentation cursor;
         cursor.selectNode(Lexicon::ComputerSystemNode);
         EXPECT_FALSE(bool(cursor));
-        EXPECT_EQ(hostNotes(), std::vector<std::string>{file + ": No such file or directory"});
+        EXPECT_EQ(hostNotes().front(), file + ": No such file or directory");
     });
 }
 

@@ -5,6 +5,7 @@
 #include <cstdlib>
 
 namespace VK::Inside {
+#include <ostream>
 
 namespace {
 
@@ -17,6 +18,10 @@ struct Machine {
     const char *manufacturer, *chassisSerial, *sku, *chassisName;
     unsigned int packageType;
 };
+
+void PrintTo(const Machine& machine, std::ostream* stream) {
+    *stream << machine.folder;
+}
 
 constexpr Machine MACHINES[] = {
     {"desktop-3.1", "Gigabyte Technology Co., Ltd. X399 AORUS XTREME", 1, "X399 AORUS XTREME", nullptr,
