@@ -14,6 +14,11 @@ std::string defaultLibrary(const std::string& folder) {
     return !fs::exists(beside, ignored) && fs::exists(installed, ignored) ? installed : beside;
 }
 
+std::string libraryPath(const std::string& name) {
+    std::error_code ignored;
+    return name.find('/') == std::string::npos && fs::exists(name, ignored) ? "./" + name : name;
+}
+
 std::string programFolder() {
     std::error_code error;
     const fs::path program = fs::read_symlink("/proc/self/exe", error);

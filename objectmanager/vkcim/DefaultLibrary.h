@@ -8,6 +8,10 @@ namespace vkcim {
 /// library folder beside it. The first of these when neither is there.
 std::string defaultLibrary(const std::string& folder);
 
+/// A library given by name, as dlopen wants it: without a slash dlopen would look everywhere but in the working
+/// directory, where a file of that name goes first.
+std::string libraryPath(const std::string& name);
+
 /// The folder of the running program; empty when it cannot be told.
 std::string programFolder();
 

@@ -273,6 +273,14 @@ TEST(Vkcim, TheDefaultLibraryIsTheOneBesideTheProgram) {
     EXPECT_EQ(support::runCommand({copy.path("bin/vkcim"), "--provider", "Echo", "names", "Echo_Thing"}).status, 0);
 }
 
+TEST(Vkcim, ALibraryOfTheWorkingDirectoryNeedsNoSlash) {
+    const support::TemporaryDirectory folder;
+    folder.link(ECHO_PROVIDER, "libecho.so");
+    const std::string command = "cd '" + folder.path() + "' && exec " VKCIM " --library libecho.so --provider Echo";
+    const Outcome outcome = support::runCommand({"/bin/sh", "-c", command + " names Echo_Thing"});
+    EXPECT_EQ(outcome.status, 0) << outcome.error;
+}
+
 TEST(Vkcim, FaultsOfTheBrokerAreListedAndHitEveryRun) {
     const Outcome list = support::runCommand({VKCIM, "--list-faults"});
     EXPECT_EQ(list.status, 0);
