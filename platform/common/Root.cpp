@@ -82,10 +82,12 @@ Root::Contents readAll(int fd, std::size_t limit) {
 
 } // namespace
 
-Root::Root(const std::string& where) : directory(absolute(where)), live(directory == "/") {}
+Root::Root(const std::string& where, bool isSnapshot)
+    : directory(absolute(where)), live(!isSnapshot && directory == "/") {}
 
 const Root& Root::host() {
-    static const Root root(HostSource::current().kind == HostSource::Snapshot ? HostSource::current().location : "/");
+    const HostSource& source = HostSource::current();
+    static const Root root = source.kind == HostSource::Snapshot ? Root(source.location, true) : Root("/");
     return root;
 }
 

@@ -37,13 +37,14 @@ public:
     static constexpr std::size_t DEFAULT_LIMIT = std::size_t{1} << 20;
 
     /// The root at the directory `where`; a relative one is taken from the working directory of now. Where it cannot be
-    /// reached, every operation answers why.
-    explicit Root(const std::string& where);
+    /// reached, every operation answers why. `isSnapshot` says that a root at `/` is not to be taken for the running
+    /// host.
+    explicit Root(const std::string& where, bool isSnapshot = false);
 
     /// The root of the process's host (vk/HostSource.h): the snapshot's folder, else `/`.
     static const Root& host();
 
-    /// Whether this is `/`, that is the running host's own files.
+    /// Whether these are the running host's own files: this is `/`, and not as a snapshot.
     bool isLive() const { return live; }
 
     /// The directory, absolute.

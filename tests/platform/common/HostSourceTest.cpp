@@ -37,6 +37,18 @@ TEST(HostSource, IsASnapshotOrASimulatedHost) {
     EXPECT_EQ(chosenWith(nullptr, "host.json"), "Simulated host.json /");
 }
 
+TEST(HostSource, IsASnapshotAlsoAtTheTopWhereNothingOfTheRunningHostMayBeChanged) {
+    for (const char* root : {"/", "/usr/.."}) {
+        EXPECT_EQ(chosenWith(root, nullptr), std::string("Snapshot ") + root + " /");
+        const std::string found = support::inChild([&] {
+            setenv("VK_INSTRUMENTATION_ROOT", root, 1);
+            EXPECT_TRUE(Root::host().exists("/etc"));
+            return std::string(Root::host().isLive() ? "live" : "not live");
+        });
+        EXPECT_EQ(found, "not live");
+    }
+}
+
 TEST(HostSource, PrefersATreeToARoot) {
     EXPECT_EQ(chosenWith("/usr/lib", "host.json"), "Simulated host.json /");
 }
