@@ -1,0 +1,63 @@
+# What is installed where. Components: provider (libraries, schema, registration), tools, development.
+
+set(runtime_libraries vknabaseserverprofileprovider nvlog vkcommon vkproduct vkinstrumentation vkproviderutilities)
+
+# An object manager may load the provider through a link in a folder of its own, and $ORIGIN is that folder then; so the
+# installed libraries name their own folder as well. Which one that is becomes known when installing (--prefix): room for
+# it is kept in the built libraries by a long name of the same place. In the system's own folder none is needed.
+string(REPEAT "/." 200 room)
+set_target_properties(${runtime_libraries} PROPERTIES BUILD_RPATH "$ORIGIN${room}" INSTALL_RPATH "$ORIGIN")
+
+# Debug information names the sources from the tree's root on, not where the tree lay when it was built.
+foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkinstrumentation_inside om_schema om_broker vkcim_core vkcim)
+    target_compile_options(${target} PRIVATE
+        -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)
+endforeach()
+
+install(TARGETS ${runtime_libraries}
+    LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT provider NAMELINK_COMPONENT development)
+foreach(library IN LISTS runtime_libraries)
+    install(CODE "
+        set(library \"\$ENV{DESTDIR}\${CMAKE_INSTALL_PREFIX}/${CMAKE_INSTALL_LIBDIR}/lib${library}.so.1\")
+        set(folder \"\${CMAKE_INSTALL_PREFIX}/${CMAKE_INSTALL_LIBDIR}\")
+        if(folder MATCHES \"^/usr/lib(64|/[^/]*-linux-[^/]*)?\$\")
+            file(RPATH_REMOVE FILE \"\${library}\")
+        else()
+            file(RPATH_SET FILE \"\${library}\" NEW_RPATH \"\\\$ORIGIN:\${folder}\")
+        endif()" COMPONENT provider)
+endforeach()
+install(CODE "
+    if(NOT CMAKE_INSTALL_PREFIX STREQUAL \"${CMAKE_INSTALL_PREFIX}\")
+        message(NOTICE \"-- The provider looks for cimconfig in ${VK_COMMAND_FOLDER}: configure with the prefix to change that\")
+    endif()" COMPONENT provider)
+
+install(TARGETS vkcim RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
+
+install(DIRECTORY platform/include/nvlog platform/include/vk
+    DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/vk-baseserver COMPONENT development)
+install(DIRECTORY platform/include/cmpi
+    DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/vk-baseserver COMPONENT development)
+
+install(FILES ${VK_SCHEMA_DIR}/vk-baseserver.mof ${VK_SCHEMA_DIR}/vk-baseserver-registration.mof
+    ${VK_SCHEMA_DIR}/vk-baseserver.reg DESTINATION ${VK_SHARE_DIR} COMPONENT provider)
+
+# Programs and texts with this build's names and folders in them.
+function(vk_configured file destination component kind)
+    get_filename_component(name ${file} NAME_WLE)
+    configure_file(${file} ${CMAKE_BINARY_DIR}/installed/${name} @ONLY)
+    install(${kind} ${CMAKE_BINARY_DIR}/installed/${name} DESTINATION ${destination} COMPONENT ${component})
+endfunction()
+vk_configured(tools/vk-provider-register.in ${CMAKE_INSTALL_SBINDIR} provider PROGRAMS)
+vk_configured(tools/register-openpegasus.sh.in ${VK_SHARE_DIR} provider FILES)
+vk_configured(tools/register-sfcb.sh.in ${VK_SHARE_DIR} provider FILES)
+vk_configured(tools/vk-provider-check.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
+vk_configured(tools/vk-host-snapshot.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
+install(FILES ${VK_SCHEMA_DIR}/libvknabaseserverprofileprovider.7 DESTINATION ${CMAKE_INSTALL_MANDIR}/man7
+    COMPONENT provider)
+vk_configured(docs/man/vk-provider-register.8.in ${CMAKE_INSTALL_MANDIR}/man8 provider FILES)
+vk_configured(docs/man/vk-provider-check.8.in ${CMAKE_INSTALL_MANDIR}/man8 tools FILES)
+vk_configured(docs/man/vk-host-snapshot.8.in ${CMAKE_INSTALL_MANDIR}/man8 tools FILES)
+vk_configured(docs/man/vkcim.1.in ${CMAKE_INSTALL_MANDIR}/man1 tools FILES)
+install(FILES tools/vkcim.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
+    RENAME vkcim COMPONENT tools)
+install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/examples COMPONENT tools)
