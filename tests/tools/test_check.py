@@ -1,0 +1,120 @@
+"""vk-provider-check on hosts made of a few files."""
+
+import json
+import os
+import unittest
+from pathlib import Path
+
+from support import BUILD, folder, run
+
+CHECK = BUILD / "installed/vk-provider-check"
+COMMANDS = {"ps", "ntpd"}
+
+
+def make_host(without=()):
+    """A host on which everything is there, but for what is named."""
+    root = folder()
+    files = {"sys/firmware/dmi/tables/smbios_entry_point": b"_SM_", "sys/firmware/dmi/tables/DMI": b"\x7f\x04",
+             "etc/machine-id": b"0123456789abcdef0123456789abcdef\n", "etc/localtime": b"TZif2",
+             "usr/share/zoneinfo/Etc/GMT": b"TZif2", "bin/ps": b"", "bin/ntpd": b"", "etc/init.d/ntp": b"",
+             "usr/sbin/cimconfig": b"", "sys/class/dmi/id/sys_vendor": b"QEMU\n"}
+    (root / "etc").mkdir()
+    for name, data in files.items():
+        if name in without:
+            continue
+        path = root / name
+        path.parent.mkdir(parents=True, exist_ok=True)
+        path.write_bytes(data)
+        path.chmod(0o755)
+    return root
+
+
+def check(root, *words, **env):
+    return run(CHECK, "--root", root, "--format", "json", *words, env={"PATH": "/bin", **env})
+
+
+def missing(done):
+    return {c["name"]: c for c in json.loads(done.stdout)["checks"] if not c["found"]}
+
+
+class Check(unittest.TestCase):
+    # Rights are those of this process, whatever the host looks like.
+    RIGHTS = {"right to set the clock", "right to change the zone"}
+
+    def test_finds_everything(self):
+        done = check(make_host())
+        self.assertEqual(set(missing(done)) - self.RIGHTS, set())
+        answer = json.loads(done.stdout)
+        self.assertEqual(answer["missing"], len(missing(done)))
+        self.assertEqual(done.returncode, 1 if answer["missing"] else 0)
+        self.assertEqual({k for c in answer["checks"] for k in c}, {"name", "found", "detail", "without"})
+
+    def test_names_each_thing_that_is_missing_and_what_fails_then(self):
+        for file, name, effect in [
+                ("sys/firmware/dmi/tables/DMI", "hardware tables", "VESKA_PhysicalPackage"),
+                ("etc/machine-id", "machine id", "unique identifier"), ("etc/localtime", "time zone", "UTC"),
+                ("usr/share/zoneinfo/Etc/GMT", "time zones", "file of its own"),
+                ("bin/ps", "ps", "not running"), ("bin/ntpd", "ntpd", "ManageTime"),
+                ("etc/init.d/ntp", "/etc/init.d/ntp", "ManageTime"),
+                ("usr/sbin/cimconfig", "cimconfig", "VESKA_CIMServiceConfig")]:
+            with self.subTest(file):
+                done = check(make_host(without=[file]))
+                self.assertEqual(done.returncode, 1)
+                found = missing(done)
+                self.assertEqual(set(found) - self.RIGHTS, {name})
+                self.assertIn(effect, found[name]["without"])
+
+    def test_tells_a_file_without_use_from_one_that_is_there(self):
+        root = make_host()
+        (root / "etc/machine-id").write_bytes(b"\n")
+        (root / "etc/localtime").write_bytes(b"something else")
+        (root / "bin/ntpd").chmod(0o644)
+        found = missing(check(root))
+        self.assertIn("empty", found["machine id"]["detail"])
+        self.assertIn("no time zone file", found["time zone"]["detail"])
+        self.assertIn("not in PATH", found["ntpd"]["detail"])
+
+    def test_looks_for_cimconfig_where_the_provider_does(self):
+        root = make_host()
+        (root / "sys/class/dmi/id/sys_vendor").write_bytes(b"Example\n")
+        detail = missing(check(root))["cimconfig"]["detail"]
+        self.assertIn("/lib/vk/vcm/bin/cimconfig", detail)
+        there = Path(root / detail.split("cimconfig")[0].lstrip("/") / "cimconfig")
+        there.parent.mkdir(parents=True)
+        there.write_bytes(b"")
+        there.chmod(0o755)
+        self.assertNotIn("cimconfig", missing(check(root)))
+
+    def test_a_device_tree_serves_in_place_of_tables(self):
+        root = make_host(without=["sys/firmware/dmi/tables/DMI", "sys/firmware/dmi/tables/smbios_entry_point"])
+        (root / "proc/device-tree").mkdir(parents=True)
+        (root / "proc/device-tree/model").write_bytes(b"Board\0")
+        self.assertNotIn("hardware tables", missing(check(root)))
+
+    @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
+    def test_knows_what_a_user_without_rights_cannot_do(self):
+        root = make_host()
+        root.chmod(0o755)
+        (root / "sys/firmware/dmi/tables/DMI").chmod(0o400)
+        done = run("setpriv", "--reuid=65534", "--regid=65534", "--clear-groups", "--inh-caps=-all", CHECK, "--root", root,
+                   "--format", "json", env={"PATH": "/bin:/usr/bin"})
+        if not done.stdout:
+            self.skipTest(f"the program cannot be run as another user here: {done.stderr}")
+        found = missing(done)
+        self.assertEqual(set(found), {"hardware tables"} | self.RIGHTS)
+        self.assertIn("no right to read it", found["hardware tables"]["detail"])
+
+    def test_prints_for_people(self):
+        done = run(CHECK, "--root", make_host(without=["bin/ntpd"]), env={"PATH": "/bin"})
+        self.assertRegex(done.stdout, r"(?m)^MISSING  ntpd +not in PATH$")
+        self.assertRegex(done.stdout, r"(?m)^found    ps +/bin/ps$")
+        self.assertIn("without it: ManageTime", done.stdout)
+
+    def test_refuses_unusable_arguments(self):
+        self.assertEqual(run(CHECK, "--format", "xml").returncode, 2)
+        self.assertEqual(run(CHECK, "--root", "/nonexistent").returncode, 2)
+        self.assertIn("Example:", run(CHECK, "--help").stdout)
+
+
+if __name__ == "__main__":
+    unittest.main()

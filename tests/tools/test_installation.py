@@ -1,0 +1,173 @@
+"""An installation: what it holds, that it runs from where it is, and that nothing in it names where it was built."""
+
+import json
+import os
+import re
+import sys
+import unittest
+from pathlib import Path
+
+from support import BUILD, LIBRARY, files_below, folder, install, run
+
+SOURCE = Path(__file__).resolve().parents[2]
+PREFIX = folder() / "installed"
+install(PREFIX)
+LIBRARIES = ["nvlog", "vkcommon", "vkproduct", "vkinstrumentation", "vkproviderutilities",
+             "vknabaseserverprofileprovider"]
+EXAMPLE = PREFIX / "share/vk-baseserver/examples/rack-server.json"
+OPEN = "import ctypes, sys; ctypes.CDLL(sys.argv[1], mode=ctypes.RTLD_GLOBAL).BaseServerProvider_Create_InstanceMI"
+
+
+def simulated(**more):
+    return {"PATH": "/usr/bin:/bin", "VK_INSTRUMENTATION_TREE": str(EXAMPLE), "NVLOG_SINK": "none", **more}
+
+
+class Contents(unittest.TestCase):
+    def test_holds_everything_in_its_folder(self):
+        expected = [f"lib/lib{name}.so.1" for name in LIBRARIES] + [f"lib/lib{name}.so" for name in LIBRARIES]
+        expected += ["bin/vkcim", "sbin/vk-provider-register", "sbin/vk-provider-check", "sbin/vk-host-snapshot",
+                     "share/man/man1/vkcim.1", "share/man/man7/libvknabaseserverprofileprovider.7",
+                     "share/man/man8/vk-provider-register.8", "share/man/man8/vk-provider-check.8",
+                     "share/man/man8/vk-host-snapshot.8", "share/bash-completion/completions/vkcim",
+                     "share/vk-baseserver/vk-baseserver.mof", "share/vk-baseserver/vk-baseserver-registration.mof",
+                     "share/vk-baseserver/vk-baseserver.reg", "share/vk-baseserver/register-openpegasus.sh",
+                     "share/vk-baseserver/register-sfcb.sh", "share/vk-baseserver/examples/rack-server.json"]
+        headers = (SOURCE / "platform/include").rglob("*.h")
+        expected += [f"include/vk-baseserver/{h.relative_to(SOURCE / 'platform/include')}" for h in headers]
+        self.assertEqual([str(p.relative_to(PREFIX)) for p in files_below(PREFIX)], sorted(expected))
+
+    def test_each_component_alone_holds_its_part_and_all_three_everything(self):
+        parts = []
+        for component in ("provider", "tools", "development"):
+            where = folder() / "p"
+            install(where, component=component)
+            parts += [str(p.relative_to(where)) for p in files_below(where)]
+        self.assertEqual(sorted(parts), [str(p.relative_to(PREFIX)) for p in files_below(PREFIX)])
+
+    def test_names_no_place_where_it_was_built(self):
+        for path in files_below(PREFIX):
+            data = os.readlink(path).encode() if path.is_symlink() else path.read_bytes()
+            for place in (SOURCE, BUILD):
+                self.assertFalse(os.fsencode(place) in data, f"{path} names {place}")
+
+    def test_leaves_no_variable_of_the_build_unfilled(self):
+        for path in files_below(PREFIX):
+            if not path.read_bytes().startswith(b"\x7fELF"):
+                self.assertNotRegex(path.read_text(encoding="utf-8"), r"@[A-Z_]+@", path)
+
+
+class Libraries(unittest.TestCase):
+    def open_in_a_clean_process(self, path):
+        return run(sys.executable, "-c", OPEN, path, cwd="/", env={"PATH": "/usr/bin:/bin"})
+
+    def test_load_from_their_folder(self):
+        done = self.open_in_a_clean_process(PREFIX / "lib" / f"{LIBRARY}.1")
+        self.assertEqual(done.returncode, 0, done.stderr)
+
+    def test_load_through_a_link_in_another_folder(self):
+        link = folder() / LIBRARY
+        link.symlink_to(PREFIX / "lib" / f"{LIBRARY}.1")
+        done = self.open_in_a_clean_process(link)
+        self.assertEqual(done.returncode, 0, done.stderr)
+
+    def test_load_through_the_link_that_the_registration_puts(self):
+        root, where = folder(), folder()
+        import fakes
+        fakes.pegasus(root, up=True)
+        done = run(PREFIX / "sbin/vk-provider-register", "--root", root, "--provider-dir", where, "install")
+        self.assertEqual(done.returncode, 0, done.stderr)
+        self.assertEqual(self.open_in_a_clean_process(where / LIBRARY).returncode, 0)
+
+    def test_take_each_other_from_the_same_installation(self):
+        link = folder() / LIBRARY
+        link.symlink_to(PREFIX / "lib" / f"{LIBRARY}.1")
+        script = OPEN + "; print(open('/proc/self/maps').read())"
+        maps = run(sys.executable, "-c", script, link, cwd="/").stdout
+        loaded = {Path(line.split()[-1]) for line in maps.splitlines() if "/libvk" in line or "/libnvlog" in line}
+        self.assertEqual({p.name for p in loaded}, {f"lib{name}.so.1" for name in LIBRARIES})
+        self.assertEqual({p.parent for p in loaded}, {PREFIX / "lib"})
+
+    def test_have_no_run_path_in_a_folder_of_the_system(self):
+        stage = folder()
+        install(Path("/usr"), destdir=stage, component="provider")
+        for path in (stage / "usr").rglob(f"{LIBRARY}.1"):
+            found = re.search(r"RUNPATH.*\[(.*)\]", run("readelf", "-d", path).stdout)
+            in_system_folder = re.fullmatch(r"/usr/lib(64|/[^/]*-linux-[^/]*)?", f"/{path.parent.relative_to(stage)}")
+            self.assertEqual(found is None, in_system_folder is not None, path)
+
+
+class Programs(unittest.TestCase):
+    def test_run_from_the_prefix(self):
+        done = run(PREFIX / "bin/vkcim", "--format", "json", "instances", "VESKA_PhysicalPackage", cwd="/", env=simulated())
+        self.assertEqual(done.returncode, 0, done.stderr)
+        package = json.loads(done.stdout)["results"][0]["properties"]
+        self.assertEqual(package["SerialNumber"]["value"], "CZ1234")
+        self.assertEqual(package["PackageType"]["value"], 2)
+
+    def test_run_from_a_staged_installation(self):
+        stage = folder()
+        install(Path("/opt/vk"), destdir=stage)
+        self.assertEqual([p.name for p in stage.iterdir()], ["opt"])
+        there = stage / "opt/vk"
+        run_path = re.search(r"RUNPATH.*\[(.*)\]", run("readelf", "-d", there / "lib" / f"{LIBRARY}.1").stdout)
+        self.assertEqual(run_path.group(1), "$ORIGIN:/opt/vk/lib")
+        done = run(there / "bin/vkcim", "names", "VESKA_ComputerSystem", cwd="/", env=simulated())
+        self.assertIn('Name="node7"', done.stdout, done.stderr)
+        done = run(there / "sbin/vk-provider-register", "--root", folder(), "install")
+        self.assertEqual(done.returncode, 0, done.stderr)
+
+    def test_the_example_answers_every_class(self):
+        done = run(PREFIX / "bin/vkcim", "--format", "json", "report", env=simulated())
+        answers = json.loads(done.stdout)
+        for name, answer in {**answers["classes"], **answers["associations"]}.items():
+            self.assertEqual(answer["status"]["code"], 0, name)
+        self.assertEqual(len(answers["classes"]["VESKA_ComputerSystem"]["results"]), 1)
+        self.assertEqual(len(answers["associations"]["VESKA_ComputerSystemPackage"]["results"]), 1)
+
+    def test_the_manual_pages_are_sound_and_know_every_property(self):
+        if run("sh", "-c", "command -v groff").returncode != 0:
+            self.skipTest("groff is not installed")
+        for page in (PREFIX / "share/man").rglob("*.[178]"):
+            done = run("groff", "-man", "-Tutf8", "-ww", "-z", page)
+            self.assertEqual(done.stderr, "", page)
+        manual = (PREFIX / "share/man/man7/libvknabaseserverprofileprovider.7").read_text(encoding="utf-8")
+        for declared in json.loads((BUILD / "schema/schema.json").read_text(encoding="utf-8"))["classes"]:
+            section = manual.split(f".SS {declared['name']}\n")[1].split("\n.SS ")[0].split("\n.SH ")[0]
+            for feature in declared["properties"] + declared["methods"]:
+                self.assertIn(f"\\fB{feature['name']}\\fR", section)
+
+
+class Completion(unittest.TestCase):
+    def complete(self, *words):
+        script = ('. "$1"; shift; COMP_WORDS=("$@"); COMP_CWORD=$(($# - 1)); _vkcim; printf "%s\\n" "${COMPREPLY[@]}"')
+        done = run("bash", "-c", script, "-", PREFIX / "share/bash-completion/completions/vkcim", "vkcim", *words)
+        self.assertEqual(done.stderr, "")
+        return set(done.stdout.split())
+
+    def test_knows_the_commands_and_options_of_the_program(self):
+        text = run(PREFIX / "bin/vkcim", "--help").stdout
+        commands = set(re.findall(r"^  ([a-z-]+)  ", text.split("\nCommands:")[1], re.M))
+        options = set(re.findall(r"^  (--[a-z-]+)", text, re.M))
+        self.assertGreater(len(commands), 10)
+        self.assertEqual(self.complete(""), commands)
+        self.assertEqual(self.complete("report", "--"), options)
+
+    def test_knows_the_classes_and_methods_of_the_schema(self):
+        declared = json.loads((BUILD / "schema/schema.json").read_text(encoding="utf-8"))["classes"]
+        self.assertEqual(self.complete("instances", "V"), {c["name"] for c in declared})
+        self.assertEqual(self.complete("--assoc-class", ""), {c["name"] for c in declared if c["association"]})
+        for c in declared:
+            self.assertEqual(self.complete("invoke", c["name"], ""), {m["name"] for m in c["methods"]})
+        ends = {p["name"] for c in declared if c["association"] for p in c["properties"] if p["type"].endswith(" ref")}
+        self.assertEqual(self.complete("associators", "--role", ""), ends)
+
+    def test_narrows_by_what_is_typed(self):
+        self.assertEqual(self.complete("inst"), {"instances"})
+        self.assertEqual(self.complete("--format", "j"), {"json"})
+        self.assertEqual(self.complete("--format", "json", "get", "VESKA_T"),
+                         {"VESKA_TimeService", "VESKA_TimeServiceAffectsElement"})
+
+
+if __name__ == "__main__":
+
+    unittest.main()
