@@ -147,7 +147,7 @@ class Masked(unittest.TestCase):
 
     def test_leaves_what_says_nothing(self):
         data = table(chassis_serial="To Be Filled By O.E.M.", system_serial="0123456789", uuid_bytes=b"\xff" * 16)
-        root = make_host(data)
+        root = make_host(data, **{"sys/class/dmi/id/product_serial": b"0123456789\n"})
         target, _ = take(root, "--mask")
         told = properties(target, "VESKA_PhysicalPackage")
         self.assertNotIn("SerialNumber", told)

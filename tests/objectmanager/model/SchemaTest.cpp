@@ -48,7 +48,9 @@ TEST(SchemaTest, KeysOfTheServedClasses) {
 
 TEST(SchemaTest, TheNearestDeclarationCounts) {
     const Schema& schema = Schema::builtin();
-    EXPECT_EQ(schema.findProperty("VESKA_ComputerSystemPackage", "Antecedent")->referenceClass, "CIM_PhysicalPackage");
+    EXPECT_EQ(schema.findProperty("VESKA_ComputerSystemPackage", "Antecedent")->referenceClass,
+              "VESKA_PhysicalPackage");
+    EXPECT_EQ(schema.findProperty("CIM_ComputerSystemPackage", "Antecedent")->referenceClass, "CIM_PhysicalPackage");
     EXPECT_EQ(schema.findProperty("CIM_SystemPackaging", "Antecedent")->referenceClass, "CIM_PhysicalElement");
     EXPECT_FALSE(schema.findProperty("CIM_ManagedElement", "InstanceID")->key);
     EXPECT_TRUE(schema.findProperty("CIM_Capabilities", "InstanceID")->key);
@@ -60,7 +62,7 @@ TEST(SchemaTest, PropertiesOfOurOwnClasses) {
     EXPECT_EQ(schema.findProperty("CIM_ComputerSystem", "UUID"), nullptr);
     EXPECT_EQ(schema.findProperty("VESKA_EnabledLogicalElementCapabilities", "StateAwareness")->type, CMPI_uint16A);
     EXPECT_EQ(schema.findProperty("VESKA_TimeService", "AutomaticDSTAdjustment")->type, CMPI_boolean);
-    EXPECT_EQ(schema.findProperty("VESKA_TimeService", "Region")->type, CMPI_uint16);
+    EXPECT_EQ(schema.findProperty("VESKA_TimeService", "Region")->type, CMPI_string);
     EXPECT_EQ(schema.findProperty("VESKA_CIMServiceConfig", "deliveryRetryIntervalSec")->type, CMPI_uint32);
 }
 
