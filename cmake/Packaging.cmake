@@ -80,7 +80,7 @@ set(CPACK_RPM_TOOLS_PACKAGE_REQUIRES "vk-baseserver-provider = ${PROJECT_VERSION
 set(CPACK_RPM_DEVELOPMENT_PACKAGE_NAME vk-baseserver-devel)
 set(CPACK_RPM_DEVELOPMENT_PACKAGE_REQUIRES "vk-baseserver-provider = ${PROJECT_VERSION}")
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION /usr/sbin /usr/share/man /usr/share/man/man1 /usr/share/man/man7
-    /usr/share/man/man8 /usr/share/bash-completion /usr/share/bash-completion/completions /usr/lib64)
+    /usr/share/man/man8 /usr/lib64)
 set(CPACK_RPM_SPEC_MORE_DEFINE "%define _build_id_links none")
 
 set(CPACK_GENERATOR DEB)

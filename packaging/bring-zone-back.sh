@@ -26,11 +26,17 @@ put_zone_entry() {
     case $kind in
     link)
         ln -sfn "$(zone_bytes)" "$1.vk-new" || return 1
-        [ -e "$1.vk-new" ] || { rm -f "$1.vk-new"; return 1; }
+        if [ ! -e "$1.vk-new" ]; then
+            rm -f "$1.vk-new"
+            return 1
+        fi
         ;;
     file)
-        zone_bytes >"$1.vk-new" && [ "$(wc -c <"$1.vk-new")" -eq "$length" ] && chmod 644 "$1.vk-new" ||
-            { rm -f "$1.vk-new"; return 1; }
+        if ! zone_bytes >"$1.vk-new" || [ "$(wc -c <"$1.vk-new")" -ne "$length" ]; then
+            rm -f "$1.vk-new"
+            return 1
+        fi
+        chmod 644 "$1.vk-new"
         ;;
     absent)
         rm -f "$1"
@@ -44,11 +50,13 @@ put_zone_entry() {
 bring_zone_back() {
     kept=${1:-}/var/lib/vk/instrumentation/replaced-zone
     [ -f "$kept" ] || return 0
-    [ "$(head -n 1 "$kept")" = "vk-zone 1" ] && zone_entry 1 && put_zone_entry "${1:-}/etc/localtime" || {
+    if [ "$(head -n 1 "$kept")" != "vk-zone 1" ] || ! zone_entry 1 || ! put_zone_entry "${1:-}/etc/localtime"; then
         echo "The time zone that was replaced cannot be brought back; it stays as it is." >&2
         return 0
-    }
-    [ -e "${1:-}/etc/timezone" ] && zone_entry 2 && [ "$kind" != absent ] && put_zone_entry "${1:-}/etc/timezone"
+    fi
+    if [ -e "${1:-}/etc/timezone" ] && zone_entry 2 && [ "$kind" != absent ]; then
+        put_zone_entry "${1:-}/etc/timezone" || :
+    fi
     rm -f "$kept"
 }
 

@@ -154,6 +154,18 @@ class OpenPegasus(Register):
         self.register("status", status=1)
         self.assertFalse((self.root / "var/lib/vk/registration/openpegasus").exists())
 
+    def test_an_installation_that_broke_off_is_finished_by_the_next(self):
+        manager = fakes.pegasus(self.root, up=True)
+        whole = (self.root / "usr/sbin/cimmof").read_text(encoding="ascii")
+        manager.program("cimmof", whole.split("}\n", 1)[1].replace("root/PG_InterOp)", "root/PG_InterOp) exit 1"))
+        self.register("install", status=1)
+        (self.root / "usr/sbin/cimmof").write_text(whole, encoding="ascii")
+        manager.calls()
+        self.register("install")
+        classes, registration = self.registering()
+        self.assertEqual(manager.calls(), [classes, classes.replace("cimmof", "cimmof -uC"), registration])
+        self.register("status")
+
     def test_what_is_not_ours_is_never_replaced_nor_removed(self):
         fakes.pegasus(self.root, up=True)
         (self.root / self.link).write_text("somebody else's", encoding="ascii")
