@@ -13,6 +13,6 @@ TEST(MakeString, NarrowsToUtf8) {
 }
 
 TEST(MakeString, ReplacesWhatIsNoCharacter) {
-    for (const wchar_t bad : {wchar_t{0xD800}, wchar_t{0xDFFF}, wchar_t{0x110000}, wchar_t{-1}})
+    for (const wchar_t bad : {wchar_t{0xD800}, wchar_t{0xDFFF}, wchar_t{0x110000}, static_cast<wchar_t>(-1)})
         EXPECT_EQ(make_string(std::wstring(1, bad)), "\xef\xbf\xbd") << static_cast<long>(bad);
 }
