@@ -197,7 +197,12 @@ std::vector<ChassisFacts> withoutTables(const Root& root, const Sysinfo& sysinfo
     return told ? std::vector<ChassisFacts>{facts} : std::vector<ChassisFacts>();
 }
 
-std::string kernelsMachine() {
+/// Of a snapshot what its own kernel said, where it is there to be read; else this kernel's machine.
+std::string architectureOf(const Root& root) {
+    if (!root.isLive()) {
+        const std::string told = cleanText(firstLine(root.read("/proc/sys/kernel/arch").text));
+        if (!told.empty()) return told;
+    }
     utsname name{};
     return uname(&name) == 0 ? static_cast<const char*>(name.machine) : std::string();
 }
@@ -224,7 +229,7 @@ HardwareFacts readHardware(const Root& root) {
                           asUuid(fromDeviceTree(root, "vm,uuid")), asUuid(fromXen(root))});
     facts.ownerContact = info["PRIMARY_OWNER_CONTACT"];
     facts.ownerName = info["PRIMARY_OWNER_NAME"];
-    facts.architecture = kernelsMachine();
+    facts.architecture = architectureOf(root);
 
     if (tables) {
         for (const SmbiosChassis& chassis : tables.smbios.chassis) facts.chassis.push_back(fromTable(chassis));

@@ -44,7 +44,7 @@ struct HardwareFacts {
     Fact firmwareModel;
     Fact ownerContact;
     Fact ownerName;
-    std::string architecture; ///< the kernel's name of the machine
+    std::string architecture; ///< the kernel's name of the machine; of a snapshot its own kernel's, where it tells
     std::vector<ChassisFacts> chassis;
 };
 

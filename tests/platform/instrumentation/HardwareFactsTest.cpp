@@ -1,5 +1,6 @@
 #include "instrumentation/HardwareFacts.h"
 
+#include "instrumentation/HostNodes.h"
 #include "instrumentation/HostNotes.h"
 #include "support/SmbiosImage.h"
 
@@ -9,6 +10,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <sys/stat.h>
+#include <sys/utsname.h>
 #include <unistd.h>
 
 namespace VK::Inside {
@@ -149,6 +151,15 @@ TEST_F(HardwareFactsTest, NothingTellsOfNothing) {
     EXPECT_THAT(notesOn(facts), Contains(StartsWith("no SMBIOS tables: the firmware provides none")));
     EXPECT_THAT(notesOn(facts), Contains("no serial number: the host does not tell it"));
     EXPECT_THAT(notesOn(facts), Contains("no chassis: the host does not tell of one"));
+}
+
+TEST_F(HardwareFactsTest, ASnapshotTellsItsOwnArchitecture) {
+    utsname here{};
+    ASSERT_EQ(uname(&here), 0);
+    EXPECT_EQ(read().architecture, here.machine);
+    host.write("proc/sys/kernel/arch", "riscv64\n");
+    EXPECT_EQ(read().architecture, "riscv64");
+    EXPECT_EQ(hostNodes(read()).front().description, "Linux riscv64");
 }
 
 TEST_F(HardwareFactsTest, TablesWithoutChassisHaveNone) {
