@@ -9,17 +9,21 @@ namespace Inside {
 
 namespace {
 
-std::string tablesNote(int error) {
-    const std::string what = "no SMBIOS tables: ";
+std::string whyNoTables(int error) {
     switch (error) {
     case ENOENT:
-        return what + "the firmware provides none (/sys/firmware/dmi/tables is not there)";
+        return "the firmware provides none (/sys/firmware/dmi/tables is not there)";
     case EACCES:
     case EPERM:
-        return what + "/sys/firmware/dmi/tables may be read by root alone";
+        return "/sys/firmware/dmi/tables may be read by root alone";
     default:
-        return what + "/sys/firmware/dmi/tables cannot be read (" + errorText(error) + ")";
+        return "/sys/firmware/dmi/tables cannot be read (" + errorText(error) + ")";
     }
+}
+
+/// Tables that are there but hidden from us may well tell of one.
+std::string whyNoChassis(int tablesError) {
+    return tablesError == 0 || tablesError == ENOENT ? "the host does not tell of one" : whyNoTables(tablesError);
 }
 
 std::string reason(const Fact& fact) {
@@ -43,13 +47,13 @@ void noteMissing(std::vector<std::string>& notes, const char* what, const Fact& 
 
 std::vector<std::string> notesOn(const HardwareFacts& facts) {
     std::vector<std::string> notes;
-    if (facts.tablesError != 0) notes.push_back(tablesNote(facts.tablesError));
+    if (facts.tablesError != 0) notes.push_back("no SMBIOS tables: " + whyNoTables(facts.tablesError));
     notes.insert(notes.end(), facts.problems.begin(), facts.problems.end());
     noteMissing(notes, "UUID", facts.uuid);
     noteMissing(notes, "serial number", facts.serial);
     noteMissing(notes, "manufacturer", facts.manufacturer);
     noteMissing(notes, "model", facts.model);
-    if (facts.chassis.empty()) notes.push_back("no chassis: the host does not tell of one");
+    if (facts.chassis.empty()) notes.push_back("no chassis: " + whyNoChassis(facts.tablesError));
     noteMissing(notes, "primary owner", facts.ownerName);
     return notes;
 }
