@@ -3,8 +3,11 @@
 #include "common/FileDescriptor.h"
 
 #include <cerrno>
+#include <csignal>
 #include <cstdio>
+#include <ctime>
 #include <fcntl.h>
+#include <pthread.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -18,14 +21,42 @@ std::string besides(const std::string& name) {
     return "." + name + ".vk-new";
 }
 
+/// Keeps the signal of a write beyond the process's file size limit from it, which would end it.
+class SizeLimitSignal {
+public:
+    SizeLimitSignal() noexcept {
+        sigemptyset(&ours);
+        sigaddset(&ours, SIGXFSZ);
+        pthread_sigmask(SIG_BLOCK, &ours, &before);
+    }
+    ~SizeLimitSignal() { pthread_sigmask(SIG_SETMASK, &before, nullptr); }
+    SizeLimitSignal(const SizeLimitSignal&) = delete;
+    SizeLimitSignal& operator=(const SizeLimitSignal&) = delete;
+
+    /// Takes back the signal that the failed write sent to this thread, unless the thread had it blocked anyway.
+    void takeBack() const noexcept {
+        if (sigismember(&before, SIGXFSZ) == 1) return;
+        const timespec atOnce{};
+        while (sigtimedwait(&ours, nullptr, &atOnce) < 0 && errno == EINTR) {
+        }
+    }
+
+private:
+    sigset_t ours{};
+    sigset_t before{};
+};
+
 int writeAll(int fd, const std::string& bytes) {
+    const SizeLimitSignal signal;
     std::size_t done = 0;
     while (done < bytes.size()) {
         const ssize_t count = ::write(fd, bytes.data() + done, bytes.size() - done);
-        if (count >= 0)
+        if (count >= 0) {
             done += static_cast<std::size_t>(count);
-        else if (errno != EINTR)
-            return errno;
+        } else if (const int error = errno; error != EINTR) {
+            if (error == EFBIG) signal.takeBack();
+            return error;
+        }
     }
     return 0;
 }
