@@ -15,7 +15,8 @@ namespace VK {
 /// Every status and null that the broker answers is checked. A key or property that the broker refuses is left out
 /// and logged once, at level 6000, and so is a path or an instance that it does not make. Paths, instances and arrays
 /// belong to the broker and are never freed here. Nothing is thrown but std::bad_alloc, and std::runtime_error where
-/// said: a request whose keys cannot be read must not be taken for one without them, which means all. A null path, instance or argument list has no keys, properties or arguments.
+/// said: a request whose keys cannot be read must not be taken for one without them, which means all. A null path,
+/// instance or argument list has no keys, properties or arguments.
 class ProviderUtilities {
 public:
     /// The class identifier of names that the class table does not hold.
