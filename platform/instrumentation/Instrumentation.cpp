@@ -2,6 +2,8 @@
 
 #include "instrumentation/Cursor.h"
 
+#include <utility>
+
 namespace VK {
 
 class __attribute__((visibility("hidden"))) Instrumentation::Cursor : public Inside::Cursor {
@@ -13,9 +15,9 @@ namespace {
 
 /// Hands out a property that is of the kind asked for.
 template <typename T>
-bool take(const std::optional<Inside::Value>& found, T& value) {
-    const T* content = found ? std::get_if<T>(&*found) : nullptr;
-    if (content != nullptr) value = *content;
+bool take(std::optional<Inside::Value>&& found, T& value) {
+    T* const content = found ? std::get_if<T>(&*found) : nullptr;
+    if (content != nullptr) value = std::move(*content);
     return content != nullptr;
 }
 

@@ -74,6 +74,7 @@ public:
 
     std::ostream& getStream() {
         if (!stream) stream.emplace(*this);
+        streamIsUsed = true;
         return *stream;
     }
 
@@ -82,7 +83,8 @@ public:
         constexpr std::size_t KEPT_CAPACITY = 16 * 1024;
         collected.clear();
         handedOut = false;
-        if (stream) stream->reset();
+        if (streamIsUsed) stream->reset(); // costs as much as a line does without it
+        streamIsUsed = false;
         return collected.capacity() <= KEPT_CAPACITY;
     }
 
@@ -91,6 +93,7 @@ private:
     const std::string empty; ///< what there is to hand out twice
     bool handedOut = false;  ///< the text lives until the next insertion
     std::optional<Stream> stream;
+    bool streamIsUsed = false; ///< asked for since it was made or last reset
 };
 
 } // namespace NVLog
