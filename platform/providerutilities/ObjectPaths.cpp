@@ -61,8 +61,9 @@ std::string ProviderUtilities::getNamespace(const CMPIObjectPath* objectPath) {
     return text != nullptr ? text : "";
 }
 
-CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, const char* className,
-                                                    std::string nameSpace) {
+CMPIObjectPath*
+ProviderUtilities::createObjectPath(const CMPIBroker* broker, const char* className,
+                                    std::string nameSpace) { // NOLINT(performance-unnecessary-value-param)
     if (className == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newObjectPath)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();
     CMPIObjectPath* const path = broker->eft->newObjectPath(broker, nameSpace.c_str(), className, &status);
