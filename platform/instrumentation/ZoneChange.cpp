@@ -28,6 +28,7 @@ std::string offsetText(int minutes) {
 /// Ends a change: the log line, and the process's own idea of local time.
 bool finish(const Root& root, bool done, const std::string& what, const ZoneFiles& files) {
     if (!done) return refuse(what + " not changed: " + files.problem());
+    if (files.after().empty()) return true;
     if (root.isLive()) tzset();
     logLine(NOTICE, "setProperty", __LINE__,
             what + " (" + files.before() + " became " + files.after() + ") by uid " + std::to_string(getuid()));
@@ -45,7 +46,7 @@ bool changeOffset(const Root& root, int minutes) {
     if (minutes < -FARTHEST || minutes > FARTHEST)
         return refuse("offset from UTC of " + std::to_string(minutes) + " minutes is not between -840 and +840");
     if (minutes == now) return true;
-    ZoneFiles files(root);
+    ZoneFiles files(root, [&] { return offsetInForce(root) == minutes; });
     const bool done = files.replaceByOffset(minutes, ZoneFiles::KeepFirst);
     return finish(root, done, fromTo("offset from UTC", offsetText(now), offsetText(minutes)), files);
 }
@@ -54,7 +55,7 @@ bool changeDaylightSaving(const Root& root, bool on) {
     const std::time_t now = std::time(nullptr);
     const Zone zone = zoneInForce(root);
     if (zone.hasDaylightSavingFrom(now) == on) return true;
-    ZoneFiles files(root);
+    ZoneFiles files(root, [&] { return hasDaylightSaving(root) == on; });
     const bool done =
         on ? files.bringBack() : files.replaceByOffset(zone.standardOffsetAt(now) / 60, ZoneFiles::KeepLatest);
     return finish(root, done, fromTo("automatic daylight saving", on ? "0" : "1", on ? "1" : "0"), files);

@@ -122,6 +122,7 @@ bool ZoneFiles::put(const Session& session, const SavedZone& wanted) {
 bool ZoneFiles::replaceByOffset(int minutes, Keep keep) {
     Session session;
     if (!begin(session)) return false;
+    if (asWanted()) return true;
     // Kept before the zone changes: at no time is there a change that cannot be taken back.
     const bool keepThis = keep == KeepLatest || !root.exists(KEPT);
     if (keepThis) {
@@ -138,6 +139,7 @@ bool ZoneFiles::bringBack() {
     if (!root.exists(KEPT)) return fail("no zone with daylight saving was replaced");
     Session session;
     if (!begin(session)) return false;
+    if (asWanted()) return true;
     const Root::Contents bytes = root.read(KEPT, Root::DEFAULT_LIMIT * 3);
     if (!bytes) return fail(KEPT, bytes.error);
     const std::optional<SavedZone> kept = readSavedZone(bytes.text);

@@ -2,6 +2,7 @@
 
 #include "instrumentation/SavedFile.h"
 
+#include <functional>
 #include <string>
 
 namespace VK {
@@ -15,16 +16,18 @@ public:
     /// Which of the zones replaced one after the other is kept.
     enum Keep { KeepFirst, KeepLatest };
 
-    explicit ZoneFiles(const Root& hostRoot) : root(hostRoot) {}
+    /// `isAsWanted` is asked once every other change is over: one of them may have made the host as this one is to.
+    ZoneFiles(const Root& hostRoot, std::function<bool()> isAsWanted)
+        : root(hostRoot), asWanted(std::move(isAsWanted)) {}
 
-    /// Puts a zone of that offset for ever into force; false when nothing was changed.
+    /// Puts a zone of that offset for ever into force; false when that failed and nothing was changed.
     bool replaceByOffset(int minutes, Keep keep);
-    /// Puts the zone that was kept into force again; false when nothing was changed.
+    /// Puts the zone that was kept into force again; false when that failed and nothing was changed.
     bool bringBack();
 
-    /// Why nothing was changed.
+    /// Why it failed.
     const std::string& problem() const { return why; }
-    /// What /etc/localtime was and is, for people.
+    /// What /etc/localtime was and is, for people; the latter empty when nothing had to be changed.
     const std::string& before() const { return was; }
     const std::string& after() const { return is; }
 
@@ -36,6 +39,7 @@ private:
     bool put(const Session& session, const SavedZone& wanted);
 
     const Root& root;
+    const std::function<bool()> asWanted;
     std::string why;
     std::string was;
     std::string is;

@@ -1,13 +1,20 @@
 #include "instrumentation/ZoneChange.h"
 
 #include "LogCapture.h"
+#include "instrumentation/FileLock.h"
 #include "instrumentation/HostState.h"
 #include "support/HostCopy.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <chrono>
+#include <fcntl.h>
+#include <filesystem>
+#include <future>
+#include <memory>
 #include <sys/stat.h>
+#include <thread>
 #include <unistd.h>
 
 namespace VK::Inside {
@@ -160,6 +167,24 @@ TEST_F(ZoneChange, WithoutTimezoneFileNoneIsMade) {
     ASSERT_TRUE(changeOffset(root(), 330));
     ASSERT_TRUE(changeDaylightSaving(root(), true));
     EXPECT_FALSE(host.exists("etc/timezone"));
+}
+
+TEST_F(ZoneChange, SwitchedOffByTwoAtOnceItStillComesBack) {
+    use("Europe/Berlin");
+    const std::string state = host.path() + "/var/lib/vk/instrumentation";
+    std::filesystem::create_directories(state);
+    auto lock = std::make_unique<FileLock>(AT_FDCWD, state + "/lock");
+    ASSERT_EQ(lock->error(), 0);
+    const auto switchOff = [this] { return changeDaylightSaving(root(), false); };
+    auto first = std::async(std::launch::async, switchOff);
+    auto second = std::async(std::launch::async, switchOff);
+    std::this_thread::sleep_for(std::chrono::milliseconds(300)); // both have found it on, and wait
+    lock.reset();
+    EXPECT_TRUE(first.get());
+    EXPECT_TRUE(second.get());
+    EXPECT_EQ(takeLog().size(), 1U);
+    EXPECT_TRUE(changeDaylightSaving(root(), true));
+    EXPECT_EQ(host.link("etc/localtime"), "/usr/share/zoneinfo/Europe/Berlin");
 }
 
 TEST_F(ZoneChange, ADamagedMemoryChangesNothing) {
