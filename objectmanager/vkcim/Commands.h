@@ -57,7 +57,7 @@ inline const Command commands[] = {
      "list the paths of the associations that refer to a path",
      "vkcim reference-names VESKA_ComputerSystem --result-class VESKA_ComputerSystemPackage"},
     {"invoke", om::Operation::InvokeMethod, Takes::Path, true, true, false, "call a method",
-     "vkcim invoke VESKA_TimeService ManageTime GetRequest=true"},
+     "vkcim invoke VESKA_TimeService ManageTime GetRequest=true ManagedElement=VESKA_ComputerSystem"},
 };
 
 } // namespace vkcim

@@ -156,6 +156,19 @@ TEST(Vkcim, InvokeAnswersReturnValueAndOutArguments) {
     EXPECT_EQ(answer({"invoke", "Echo_Thing", "Run"}).at("returnValue").at("value"), 0);
 }
 
+TEST(Vkcim, TheExampleOfInvokesHelpSucceeds) {
+    const std::string help = support::runCommand({VKCIM, "invoke", "--help"}).output;
+    const std::string heading = "Example:\n";
+    const std::size_t begin = help.find(heading);
+    ASSERT_NE(begin, std::string::npos);
+    const std::size_t line = begin + heading.size();
+    const std::string example = help.substr(line, help.find('\n', line) - line);
+    const std::string folder = std::filesystem::path(VKCIM).parent_path();
+    const Outcome outcome = support::runCommand({"/bin/sh", "-c", "PATH=" + folder + ":$PATH; " + example});
+    EXPECT_EQ(outcome.status, 0) << example << ": " << outcome.error;
+    EXPECT_THAT(outcome.output, HasSubstr("TimeData"));
+}
+
 TEST(Vkcim, AnotherStatusThanOkExitsWithOneAndIsNamed) {
     const Outcome failed = vkcim({"--format", "json", "instances", "Echo_Fail"});
     EXPECT_EQ(failed.status, 1);
