@@ -28,10 +28,6 @@ const CIMServiceConfig::Setting CIMServiceConfig::attempts = {
     "cimconfig -s maxIndicationDeliveryRetryAttempts=", "cimconfig  -g maxIndicationDeliveryRetryAttempts",
     "maxIndicationDeliveryRetryAttempts="};
 
-const TraceSource& CIMServiceConfig::traceSource() {
-    return source;
-}
-
 CIMServiceConfig::CIMServiceConfig() {
     const TraceScope scope(source);
 }

@@ -36,8 +36,6 @@ public:
     /// exactly) and for a request without "=".
     unsigned int executeCIMServiceConfig(std::string& request);
 
-    static const TraceSource& traceSource();
-
 private:
     struct Setting;
     static const Setting interval;

@@ -23,10 +23,6 @@ bool contains(const std::string& text, const char* word) {
 
 } // namespace
 
-const TraceSource& TimeService::traceSource() {
-    return source;
-}
-
 TimeService::TimeService() : name("TimeService") {
     const TraceScope scope(source);
     name += "@" + hostName.text();

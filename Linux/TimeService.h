@@ -48,8 +48,6 @@ public:
     /// synchronises. Ends at the first step that fails.
     unsigned int manageTime(long& time, unsigned int& gmtOffset);
 
-    static const TraceSource& traceSource();
-
 private:
     bool isDaemonRunning();
     unsigned int runInitScript(const char* command);
