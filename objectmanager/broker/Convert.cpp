@@ -21,7 +21,7 @@ CMPIType elementType(CMPIType type) {
 template <class T>
 T take(const CMPIValue* value) {
     T result;
-    std::memcpy(&result, static_cast<const void*>(value), sizeof result);
+    std::memcpy(&result, static_cast<const void*>(value), sizeof result); // NOLINT(bugprone-sizeof-expression)
     return result;
 }
 

@@ -61,9 +61,8 @@ std::string ProviderUtilities::getNamespace(const CMPIObjectPath* objectPath) {
     return text != nullptr ? text : "";
 }
 
-CMPIObjectPath*
-ProviderUtilities::createObjectPath(const CMPIBroker* broker, const char* className,
-                                    std::string nameSpace) { // NOLINT(performance-unnecessary-value-param)
+CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, const char* className,
+                                                    std::string nameSpace) {
     if (className == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newObjectPath)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();
     CMPIObjectPath* const path = broker->eft->newObjectPath(broker, nameSpace.c_str(), className, &status);

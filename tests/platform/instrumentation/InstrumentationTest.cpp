@@ -5,7 +5,6 @@
 
 #include <gtest/gtest.h>
 
-#include <chrono>
 #include <cstdlib>
 #include <functional>
 #include <unistd.h>
@@ -138,39 +137,6 @@ TEST_F(InstrumentationTest, ThisHostIsOneComputerWithTheKernelsName) {
         EXPECT_EQ(name, kernels);
         EXPECT_EQ(std::string(cursor.getPathToNode()), "/computer/0");
         EXPECT_FALSE(++cursor);
-    });
-}
-
-/// Nanoseconds per computer of reading every computer, found by its path each time.
-double costPerComputer(const support::TemporaryDirectory& directory, int count) {
-    std::string nodes;
-    for (int i = 0; i < count; ++i)
-        nodes += std::string(i == 0 ? "" : ",") + R"({"type":40,"path":"/computer/)" + std::to_string(i) +
-                 R"(","properties":{"108":"node)" + std::to_string(i) + "\"}}";
-    directory.write("tree.json", "{\"nodes\":[" + nodes + "]}");
-    usleep(50'000); // until the file's stamp tells every change
-    const auto read = [] {
-        std::string name;
-        Instrumentation all;
-        for (all.selectNode(Lexicon::ComputerSystemNode); all; ++all) {
-            Instrumentation one;
-            one.selectNode(std::string(all.getPathToNode()));
-            if (!one.getProperty(NAME, name)) abort();
-        }
-    };
-    read();
-    const auto begin = std::chrono::steady_clock::now();
-    const int rounds = 20'000 / count;
-    for (int i = 0; i < rounds; ++i) read();
-    const std::chrono::duration<double, std::nano> time = std::chrono::steady_clock::now() - begin;
-    return time.count() / rounds / count;
-}
-
-TEST_F(InstrumentationTest, AThousandComputersCostTheSameEach) {
-    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", directory.path("tree.json"), [this] {
-        const double few = costPerComputer(directory, 10);
-        const double many = costPerComputer(directory, 1000);
-        EXPECT_LT(many, 5 * few) << few << " ns each of ten";
     });
 }
 
