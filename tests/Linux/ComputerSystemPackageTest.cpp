@@ -12,11 +12,6 @@ using test::print;
 using test::thrownText;
 using VK::BaseServerProvider::ComputerSystemPackage;
 
-test::Node without(test::Node node, unsigned property) {
-    node.properties.erase(property);
-    return node;
-}
-
 std::string failureFrom(VK::Moniker end) {
     return thrownText<VK::InstrumentationException>([&] { ComputerSystemPackage().getComputerSystemMoniker(end); });
 }
@@ -54,19 +49,19 @@ TEST(ComputerSystemPackage, FailsForAnUnknownComputer) {
 }
 
 TEST(ComputerSystemPackage, FailsWhereAComputerOnTheWayHasNoName) {
-    test::simulate({without(test::computer(0, ""), 108), test::computer(1, "b")});
+    test::simulate({test::without(test::computer(0, ""), 108), test::computer(1, "b")});
     VK::Moniker end = moniker({{"Name", "b"}});
     EXPECT_EQ(thrownText<VK::InstrumentationException>([&] { ComputerSystemPackage().getPhysicalPackageMoniker(end); }),
               "Name Property on Computer Node not available.");
 }
 
 TEST(ComputerSystemPackage, FailsWhereAChassisOnTheWayHasNoSerialNumber) {
-    test::simulate({test::computer(0, "a"), without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
+    test::simulate({test::computer(0, "a"), test::without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
     EXPECT_EQ(failureFrom(moniker({{"Tag", "B"}})), "Serial Property on Chassis not available.");
 }
 
 TEST(ComputerSystemPackage, DoesNotMindAChassisWithoutSerialNumberBehindTheOneWanted) {
-    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), without(test::chassis(0, 1, ""), 50)});
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::without(test::chassis(0, 1, ""), 50)});
     VK::Moniker end = moniker({{"Tag", "A"}});
     ComputerSystemPackage().getComputerSystemMoniker(end);
     EXPECT_EQ(print(end), "Name=a");
@@ -75,7 +70,7 @@ TEST(ComputerSystemPackage, DoesNotMindAChassisWithoutSerialNumberBehindTheOneWa
 TEST(ComputerSystemPackage, TellsAMissingChassisByTheMissingNameInItsOwnWords) {
     test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
     EXPECT_EQ(failureFrom(moniker({{"Tag", "B"}})), "Name Property on Computer not available.");
-    test::simulate({without(test::computer(0, ""), 108), test::chassis(0, 0, "A")});
+    test::simulate({test::without(test::computer(0, ""), 108), test::chassis(0, 0, "A")});
     EXPECT_EQ(failureFrom(moniker({{"Tag", "A"}})), "Name Property on Computer not available.");
     test::simulate({test::chassis(3, 0, "A")}); // its parent is not there
     EXPECT_EQ(failureFrom(moniker({{"Tag", "A"}})), "Name Property on Computer not available.");
@@ -90,7 +85,7 @@ TEST(ComputerSystemPackage, TakesThePlatformGUIDFromTheFirstComputer) {
 
 TEST(ComputerSystemPackage, HasNoPlatformGUIDWithoutAUUIDOnTheFirstComputer) {
     std::string guid = "untouched";
-    test::simulate({without(test::computer(0, "a"), 64), test::computer(1, "b")});
+    test::simulate({test::without(test::computer(0, "a"), 64), test::computer(1, "b")});
     EXPECT_FALSE(ComputerSystemPackage().getPlatformGUID(guid));
     test::simulate({});
     EXPECT_FALSE(ComputerSystemPackage().getPlatformGUID(guid));

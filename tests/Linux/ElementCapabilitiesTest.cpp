@@ -12,12 +12,6 @@ using test::print;
 using test::thrownText;
 using VK::BaseServerProvider::ElementCapabilities;
 
-test::Node nameless(unsigned index) {
-    test::Node node = test::computer(index, "");
-    node.properties.erase(108);
-    return node;
-}
-
 TEST(ElementCapabilities, LeadFromAComputerToItsCapabilities) {
     test::simulate({test::computer(0, "a"), test::computer(1, "node7")});
     VK::Moniker end = moniker({{"CreationClassName", "VESKA_ComputerSystem"}, {"Name", "node7"}});
@@ -50,7 +44,7 @@ TEST(ElementCapabilities, NeedTheKeyInExactlyThatSpelling) {
 }
 
 TEST(ElementCapabilities, FailWhereAComputerOnTheWayHasNoName) {
-    test::simulate({nameless(0), test::computer(1, "node7")});
+    test::simulate({test::without(test::computer(0, ""), 108), test::computer(1, "node7")});
     VK::Moniker end = moniker({{"Name", "node7"}});
     EXPECT_EQ(thrownText<VK::InstrumentationException>([&] { ElementCapabilities().getCapabilitiesMoniker(end); }),
               "Name Property on Computer Node not available.");

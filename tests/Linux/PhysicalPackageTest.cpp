@@ -19,11 +19,6 @@ std::vector<std::string> serials(PhysicalPackage& package) {
     return found;
 }
 
-test::Node withoutSerial(test::Node chassis) {
-    chassis.properties.erase(50);
-    return chassis;
-}
-
 TEST(PhysicalPackage, IsFalseAtOnceOnAHostWithoutChassis) {
     test::simulate({test::computer(0, "node7")});
     EXPECT_FALSE(PhysicalPackage());
@@ -36,7 +31,7 @@ TEST(PhysicalPackage, WalksEveryChassisInTableOrder) {
 }
 
 TEST(PhysicalPackage, HasNoTagWithoutASerialNumber) {
-    test::simulate({withoutSerial(test::chassis(0, 0, ""))});
+    test::simulate({test::without(test::chassis(0, 0, ""), 50)});
     const PhysicalPackage package;
     std::string tag = "untouched";
     EXPECT_FALSE(package.getTag(tag));
@@ -44,7 +39,7 @@ TEST(PhysicalPackage, HasNoTagWithoutASerialNumber) {
 }
 
 TEST(PhysicalPackage, IsNotExcludedByATagFilterWithoutASerialNumber) {
-    test::simulate({withoutSerial(test::chassis(0, 0, "")), test::chassis(0, 1, "A"), test::chassis(0, 2, "B")});
+    test::simulate({test::without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "A"), test::chassis(0, 2, "B")});
     PhysicalPackage package;
     package.setFilter(PhysicalPackage::FilterType::TAG, "B");
     EXPECT_THAT(serials(package), testing::ElementsAre("(none)", "B"));

@@ -25,11 +25,6 @@ om::ObjectPath association(const std::string& tag, const std::string& name) {
     return test::associationPath(className, {{"Antecedent", chassisPath(tag)}, {"Dependent", computerPath(name)}});
 }
 
-test::Node without(test::Node node, unsigned property) {
-    node.properties.erase(property);
-    return node;
-}
-
 std::vector<std::string> namedEnds() {
     const om::Answer names = test::names(className);
     EXPECT_EQ(test::ends(test::pathsOfInstances(test::instances(className))), test::ends(test::paths(names)));
@@ -66,7 +61,7 @@ TEST(CMPIComputerSystemPackage, IsNotFoundOnAHostWithoutComputer) {
 }
 
 TEST(CMPIComputerSystemPackage, PairsAChassisWithoutSerialNumberByItsClassAlone) {
-    test::simulate({test::computer(0, "a"), without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
+    test::simulate({test::computer(0, "a"), test::without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
     EXPECT_THAT(namedEnds(),
                 ElementsAre("Antecedent=VESKA_PhysicalPackage -> Dependent=a", "Antecedent=B -> Dependent=a"));
 }
@@ -79,7 +74,7 @@ TEST(CMPIComputerSystemPackage, CarriesThePlatformGUIDOfTheFirstComputerEverywhe
 }
 
 TEST(CMPIComputerSystemPackage, HasNoPlatformGUIDWithoutAUUID) {
-    test::simulate({without(test::computer(0, "a"), 64), test::chassis(0, 0, "A")});
+    test::simulate({test::without(test::computer(0, "a"), 64), test::chassis(0, 0, "A")});
     EXPECT_THAT(test::namesOf(test::instancesOf(test::instances(className))[0].properties),
                 ElementsAre("Antecedent", "Dependent"));
 }
@@ -123,7 +118,7 @@ TEST(CMPIComputerSystemPackage, ReachesOnlyTheClassAtTheOtherEndInAnyLetterCase)
 }
 
 TEST(CMPIComputerSystemPackage, FailsOnAChassisWithoutSerialNumberBeforeTheOneAskedFor) {
-    test::simulate({test::computer(0, "a"), without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
+    test::simulate({test::computer(0, "a"), test::without(test::chassis(0, 0, ""), 50), test::chassis(0, 1, "B")});
     test::takeLog();
     const om::Answer answer = test::associatorNames(chassisPath("B"), className);
     EXPECT_THAT(answer.results, IsEmpty());
@@ -133,7 +128,7 @@ TEST(CMPIComputerSystemPackage, FailsOnAChassisWithoutSerialNumberBeforeTheOneAs
 }
 
 TEST(CMPIComputerSystemPackage, FindsTheChassisBeforeOneWithoutSerialNumber) {
-    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), without(test::chassis(0, 1, ""), 50)});
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::without(test::chassis(0, 1, ""), 50)});
     EXPECT_EQ(test::associatorNames(chassisPath("A"), className).results.size(), 1U);
 }
 

@@ -90,6 +90,11 @@ Node chassis(unsigned index, unsigned number, const std::string& serial) {
     return node;
 }
 
+Node without(Node node, unsigned property) {
+    node.properties.erase(property);
+    return node;
+}
+
 void simulate(const std::vector<Node>& nodes) {
     simulate(nodes, {{"architecture", "x86_64"}, {"uid", "uid-1"}, {"kvm", false}});
 }

@@ -33,6 +33,9 @@ Node computer(unsigned index, const std::string& name);
 /// A chassis at `/computer/<index>/chassis/<number>` with that serial number.
 Node chassis(unsigned index, unsigned number, const std::string& serial);
 
+/// The same node without one of its properties.
+Node without(Node node, unsigned property);
+
 /// Makes the process's host this one. `product` is fixed to architecture `x86_64`, uid `uid-1` and no KVM.
 void simulate(const std::vector<Node>& nodes);
 /// The same with these facts of the product, which the libraries read once per process.
