@@ -2,6 +2,7 @@
 
 #include "objectmanager/vkcim/Commands.h"
 #include "objectmanager/vkcim/FaultText.h"
+#include "objectmanager/vkcim/PathText.h"
 
 #include <CLI/CLI.hpp>
 
@@ -15,6 +16,7 @@ namespace {
 constexpr int unusable = 2;
 constexpr std::size_t mostThreads = 1024;
 constexpr std::size_t mostRuns = 1000000000;
+constexpr std::size_t mostTimes = 100000000; // each is kept until the end: 8 bytes
 
 const std::map<std::string, Format> formats = {{"text", Format::Text}, {"mof", Format::Mof}, {"json", Format::Json}};
 
@@ -154,7 +156,13 @@ private:
         if (!command->operation && repeat->count() + threads->count() + fault->count() > 0) {
             throw CLI::ValidationError("report", "--repeat, --threads and --fault do not go with it");
         }
+        if (arguments.timing && arguments.repeat > mostTimes / arguments.threads) {
+            throw CLI::ValidationError("--timing", "at most " + std::to_string(mostTimes) + " runs can be timed");
+        }
         if (fault->count() > 0) arguments.fault = readFault();
+        if (const auto problem = nameSpaceProblem(arguments.nameSpace)) {
+            throw CLI::ValidationError("--namespace", *problem);
+        }
         if (command->takes != Takes::Nothing && arguments.subject.empty()) {
             throw CLI::ValidationError(name, "what it works on is empty");
         }

@@ -15,6 +15,10 @@ std::string shown(char c) {
     return c > ' ' && c < 0x7f ? fmt::format("'{}'", c) : fmt::format("byte 0x{:02x}", static_cast<unsigned char>(c));
 }
 
+bool isNameSpaceByte(char c) {
+    return isNameByte(c) || c == '/' || c == '-';
+}
+
 class PathParser {
 public:
     PathParser(const SourceText& source, const std::string& nameSpace, const om::Schema& knownClasses)
@@ -45,14 +49,12 @@ private:
 
     void readNameSpace() {
         std::size_t colon = 0;
-        while (colon < text.size() && (isNameByte(text[colon]) || text[colon] == '/' || text[colon] == '-')) ++colon;
+        while (colon < text.size() && isNameSpaceByte(text[colon])) ++colon;
         if (colon == text.size() || text[colon] != ':') return;
         const std::string_view name = text.text().substr(0, colon);
         if (name.empty()) fail(0, "the namespace before ':' is empty");
         if (name.substr(0, 2) == "//") fail(0, "a path here names no host");
-        if (name.front() == '/' || name.back() == '/' || name.find("//") != std::string_view::npos) {
-            fail(0, fmt::format("namespace \"{}\" has an empty part", name));
-        }
+        if (const auto problem = nameSpaceProblem(name)) fail(0, *problem);
         path.nameSpace = name;
         at = colon + 1;
     }
@@ -161,6 +163,16 @@ std::string keyText(const om::ObjectPath& path, const om::NamedValue& key, const
 }
 
 } // namespace
+
+std::optional<std::string> nameSpaceProblem(std::string_view name) {
+    if (name.empty()) return "the namespace is empty";
+    const auto* bad = std::find_if_not(name.begin(), name.end(), isNameSpaceByte);
+    if (bad != name.end()) return fmt::format("a namespace cannot hold {}", shown(*bad));
+    if (name.front() == '/' || name.back() == '/' || name.find("//") != std::string_view::npos) {
+        return fmt::format("namespace \"{}\" has an empty part", name);
+    }
+    return std::nullopt;
+}
 
 om::ObjectPath parsePath(const SourceText& text, const std::string& nameSpace, const om::Schema& schema) {
     return PathParser(text, nameSpace, schema).parse();

@@ -4,6 +4,7 @@
 #include "objectmanager/model/Values.h"
 #include "objectmanager/vkcim/SourceText.h"
 
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -16,6 +17,9 @@ namespace vkcim {
 /// Throws ParseError.
 om::ObjectPath parsePath(std::string_view text, const std::string& nameSpace, const om::Schema& schema);
 om::ObjectPath parsePath(const SourceText& text, const std::string& nameSpace, const om::Schema& schema);
+
+/// Why no object can lie in a namespace of that name; nothing where one can.
+std::optional<std::string> nameSpaceProblem(std::string_view name);
 
 /// Class and keys, so that parsePath reads them back; references in the keys carry their namespace where it differs
 /// from `nameSpace`. Keys of a type that no path can hold (reals, date-times) become quoted texts.

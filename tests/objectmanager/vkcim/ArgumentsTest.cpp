@@ -108,6 +108,8 @@ TEST(Arguments, UnusableOnesAreRefusedWithStatusTwo) {
                                Words{"report", "--repeat", "1"},
                                Words{"--format", "json", "--format", "mof", "report"},
                                Words{"--namespace"},
+                               Words{"--namespace=", "names", "A"},
+                               Words{"--repeat", "1000000001", "names", "A"},
                                Words{"--properties", "A,,B", "names", "A"},
                                Words{"--timing=", "names", "A"}}) {
         const Parsed parsed = parseArguments(words);
@@ -115,6 +117,41 @@ TEST(Arguments, UnusableOnesAreRefusedWithStatusTwo) {
         EXPECT_EQ(parsed.exitStatus, 2) << testing::PrintToString(words);
         EXPECT_THAT(parsed.error, HasSubstr("vkcim: ")) << testing::PrintToString(words);
         EXPECT_THAT(parsed.output, IsEmpty());
+    }
+}
+
+TEST(Arguments, ANamespaceThatNoObjectCanLieInIsRefused) {
+    struct {
+        const char* nameSpace;
+        const char* what;
+    } const bad[] = {{"", "the namespace is empty"},
+                     {"root/", "has an empty part"},
+                     {"/root", "has an empty part"},
+                     {"root//cimv2", "has an empty part"},
+                     {"root/cimv2:VESKA_TimeService", "cannot hold ':'"},
+                     {"root cimv2", "cannot hold byte 0x20"},
+                     {"root\x1b", "cannot hold byte 0x1b"}};
+    for (const auto& each : bad) {
+        const Parsed parsed = parseArguments({"--namespace", each.nameSpace, "report"});
+        EXPECT_EQ(parsed.exitStatus, 2) << each.nameSpace;
+        EXPECT_THAT(parsed.error, HasSubstr(std::string("vkcim: --namespace: "))) << each.nameSpace;
+        EXPECT_THAT(parsed.error, HasSubstr(each.what)) << each.nameSpace;
+    }
+    for (const char* nameSpace : {"interop", "root/PG_InterOp", "root/x-1", "r\xc3\xb6\xc3\xb6t"}) {
+        EXPECT_EQ(good({"--namespace", nameSpace, "report"}).nameSpace, nameSpace);
+    }
+}
+
+TEST(Arguments, NoMoreRunsAreTimedThanTimesCanBeKept) {
+    EXPECT_EQ(good({"--timing", "--repeat", "100000000", "names", "A"}).repeat, 100000000u);
+    EXPECT_EQ(good({"--repeat", "1000000000", "--threads", "1024", "names", "A"}).repeat, 1000000000u);
+    for (const Words& runs : {Words{"--repeat", "100000001"}, Words{"--repeat", "1000000000", "--threads", "1024"},
+                              Words{"--repeat", "50000000", "--threads", "3"}}) {
+        Words words = {"--timing", "names", "A"};
+        words.insert(words.end(), runs.begin(), runs.end());
+        const Parsed parsed = parseArguments(words);
+        EXPECT_EQ(parsed.exitStatus, 2) << testing::PrintToString(runs);
+        EXPECT_THAT(parsed.error, HasSubstr("--timing: at most 100000000 runs"));
     }
 }
 
