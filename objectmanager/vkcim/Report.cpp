@@ -19,9 +19,24 @@ constexpr Direction directions[] = {{"VESKA_ComputerSystemPackage", "Antecedent"
                                     {"VESKA_ComputerCapabilities", "ManagedElement", "Capabilities"},
                                     {"VESKA_TimeServiceAffectsElement", "AffectingElement", "AffectedElement"}};
 
-std::string hostName() {
+std::string kernelsHostName() {
     utsname names{};
     return uname(&names) == 0 ? names.nodename : "";
+}
+
+/// The described host's, which a snapshot's or a simulated one's is not the kernel's; that stands for a provider that
+/// does not serve computer systems, and so describes no other host.
+std::string hostName(const om::Answer& computers) {
+    if (computers.code != CMPI_RC_OK) return kernelsHostName();
+    for (const auto& result : computers.results) {
+        const auto* computer = std::get_if<om::Instance>(&result);
+        if (!computer) continue;
+        for (const auto& [name, value] : computer->path.keys) {
+            const auto* text = std::get_if<std::string>(&value.data);
+            if (text && om::sameName(name, "Name")) return *text;
+        }
+    }
+    return "without a name";
 }
 
 std::string referenceText(const om::Instance& instance, const char* name, const std::string& nameSpace,
@@ -58,8 +73,8 @@ Report makeReport(const std::string& nameSpace, const std::optional<std::vector<
         return answers;
     };
     Report report;
-    report.host = hostName();
     report.classes = ask(reportClasses);
+    report.host = hostName(report.classes.front().second);
     report.associations = ask(reportAssociations);
     report.notes = notes();
     return report;

@@ -17,7 +17,7 @@ extern const std::vector<std::string> reportAssociations;
 struct Report {
     using Answers = std::vector<std::pair<std::string, om::Answer>>;
 
-    std::string host;
+    std::string host; ///< the name of the host that is described, for people
     Answers classes;
     Answers associations;
     std::vector<std::string> notes;

@@ -3,6 +3,7 @@
 #include "tests/objectmanager/vkcim/TestSchema.h"
 
 #include <gmock/gmock.h>
+#include <sys/utsname.h>
 
 namespace vkcim {
 namespace {
@@ -56,7 +57,28 @@ TEST(Report, AsksEveryClassAndAssociationInTheOrderOfTheirIdentifiers) {
     EXPECT_EQ(report.classes.size(), 5u);
     EXPECT_EQ(report.associations.size(), 3u);
     EXPECT_THAT(report.notes, ElementsAre("a note"));
-    EXPECT_FALSE(report.host.empty());
+}
+
+std::string hostOf(const om::Answer& computers) {
+    const auto run = [&](const om::Request& request) {
+        return request.path.className == "VESKA_ComputerSystem" ? computers : om::Answer();
+    };
+    return makeReport(nameSpace, {}, run, [] { return std::vector<std::string>(); }).host;
+}
+
+TEST(Report, IsHeadedByTheNameOfTheHostThatIsDescribed) {
+    om::Answer computers;
+    EXPECT_EQ(hostOf(computers), "without a name");
+    computers.results.emplace_back(om::Instance{computer, {}});
+    EXPECT_EQ(hostOf(computers), "node7");
+}
+
+TEST(Report, IsHeadedByThisHostsNameWhereNoComputerIsServed) {
+    utsname names{};
+    ASSERT_EQ(uname(&names), 0);
+    om::Answer unserved;
+    unserved.code = CMPI_RC_ERR_INVALID_CLASS;
+    EXPECT_EQ(hostOf(unserved), names.nodename);
 }
 
 TEST(Report, IsReadableForPeople) {
@@ -108,6 +130,15 @@ TEST(TextOutput, ColoursHeadingsOnlyWhenAsked) {
     EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema(), false}), "VESKA_ComputerSystem.Name=\"node7\"\n");
     EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema(), true}),
               "\x1b[1mVESKA_ComputerSystem.Name=\"node7\"\x1b[0m\n");
+}
+
+TEST(TextOutput, HandsNoControlCharactersToTheTerminal) {
+    om::Answer answer;
+    const om::ObjectPath bad = path("VESKA_ComputerSystem", "Name", "a\x1b[2J\nb\x7f\xc2\x9b");
+    answer.results.emplace_back(bad);
+    answer.results.emplace_back(om::Instance{bad, {reference("\x1b", bad)}});
+    const std::string shown = R"(VESKA_ComputerSystem.Name="a\x1b[2J\nb\x7f\x9b")";
+    EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema()}), shown + "\n\n" + shown + "\n  \\x1b  " + shown + "\n");
 }
 
 TEST(TextOutput, SaysSoWhenNothingWasReturned) {
