@@ -62,7 +62,7 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
         problem = found == current.nodes.end() ? "the node is gone" : refusal(*found, property, value);
         if (!problem.empty()) return {};
         std::string changed = changeTreeText(text, node.path, property, value);
-        if (changed.empty()) problem = "the text is not UTF-8";
+        if (changed.empty()) problem = "the text is not UTF-8, or has a zero byte";
         return changed;
     };
     const std::string problem = replaceTreeFile(file, LARGEST_FILE, change);

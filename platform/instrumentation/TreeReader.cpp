@@ -70,6 +70,7 @@ bool TreeReader::number_unsigned(std::uint64_t value) {
 }
 
 bool TreeReader::string(std::string& text) {
+    if (hasZeroByte(text)) return refuse("text with a zero byte");
     if (where == Properties) {
         node.properties[property] = text;
         return true;

@@ -45,6 +45,10 @@ OrderedJson* findNode(OrderedJson& document, const std::string& path) {
 
 } // namespace
 
+bool hasZeroByte(const std::string& text) {
+    return text.find('\0') != std::string::npos;
+}
+
 TreeText readTreeText(std::string_view text) {
     TreeText result;
     std::size_t readSoFar = 0;
@@ -59,6 +63,7 @@ TreeText readTreeText(std::string_view text) {
 }
 
 std::string changeTreeText(std::string_view text, const std::string& path, unsigned int property, const Value& value) {
+    if (const auto* content = std::get_if<std::string>(&value); content != nullptr && hasZeroByte(*content)) return {};
     OrderedJson document = OrderedJson::parse(text, nullptr, false);
     if (document.is_discarded()) return {};
     OrderedJson* node = findNode(document, path);

@@ -104,6 +104,9 @@ TEST(TreeText, RefusesWhatIsNoNode) {
         {",\"readOnly\":[[]]", "array where it does not belong"},
         {",\"readOnly\":[\"108\"]", "text where it does not belong"},
         {",\"failWrites\":[-108]", "negative number -108"},
+        {",\"description\":\"a\\u0000b\"", "text with a zero byte at byte "},
+        {",\"parent\":\"\\u0000\"", "text with a zero byte at byte "},
+        {",\"properties\":{\"108\":\"node7\\u0000\"}", "text with a zero byte at byte 66"},
     };
     for (const Refused& each : refused) {
         EXPECT_THAT(readTreeText(node(each.text)).problem, StartsWith(each.problem)) << each.text;
@@ -114,6 +117,7 @@ TEST(TreeText, RefusesWhatIsNoNode) {
 TEST(TreeText, RefusesNodesWithoutTypeOrPathAndPathsGivenTwice) {
     EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1}]})").problem, "node without \"path\" at byte 20");
     EXPECT_EQ(readTreeText(R"({"nodes":[{"path":"/"}]})").problem, "node without \"type\" at byte 22");
+    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":"/\u0000"}]})").problem, "text with a zero byte at byte 36");
     EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":""}]})").problem, "empty path at byte 29");
     EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":"/a"},{"type":2,"path":"/a"}]})").problem,
               "path \"/a\" is given twice at byte 54");
@@ -158,6 +162,7 @@ TEST(TreeText, RefusesChangesThatCannotBeWritten) {
     const std::string text = R"({"nodes":[{"type":1,"path":"/a"}]})";
     EXPECT_EQ(changeTreeText(text, "/b", 1, Value("x")), "");
     EXPECT_EQ(changeTreeText(text, "/a", 1, Value("\xFF")), "");
+    EXPECT_EQ(changeTreeText(text, "/a", 1, Value(std::string("x\0y", 3))), "");
     EXPECT_EQ(changeTreeText("{", "/a", 1, Value("x")), "");
 }
 
