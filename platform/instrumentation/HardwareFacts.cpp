@@ -197,7 +197,8 @@ std::vector<ChassisFacts> withoutTables(const Root& root, const Sysinfo& sysinfo
     return told ? std::vector<ChassisFacts>{facts} : std::vector<ChassisFacts>();
 }
 
-/// Of a snapshot what its own kernel said, where it is there to be read; else this kernel's machine.
+} // namespace
+
 std::string architectureOf(const Root& root) {
     if (!root.isLive()) {
         const std::string told = cleanText(firstLine(root.read("/proc/sys/kernel/arch").text));
@@ -206,8 +207,6 @@ std::string architectureOf(const Root& root) {
     utsname name{};
     return uname(&name) == 0 ? static_cast<const char*>(name.machine) : std::string();
 }
-
-} // namespace
 
 HardwareFacts readHardware(const Root& root) {
     HardwareFacts facts;

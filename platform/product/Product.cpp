@@ -3,12 +3,9 @@
 #include "product/UniqueIdentifier.h"
 #include "product/Widen.h"
 #include "vk/HostFacts.h"
-#include "vk/HostSource.h"
-#include "vk/Instrumentation.h"
 #include "vk/Root.h"
 
 #include <string_view>
-#include <sys/utsname.h>
 
 namespace VK {
 
@@ -27,27 +24,9 @@ std::string readWord(const std::string& path) {
     return text.substr(0, text.find_first_of(END));
 }
 
-std::string readArchitecture() {
-    if (HostSource::current().kind == HostSource::Snapshot) {
-        if (const std::string word = readWord("/proc/sys/kernel/arch"); !word.empty()) return word;
-    }
-    utsname names{};
-    return uname(&names) == 0 ? names.machine : "";
-}
-
 std::string readMachineId() {
     const std::string id = readWord("/etc/machine-id");
     return id == "uninitialized" ? "" : id; // what it holds while the host boots for the first time
-}
-
-std::string readSystemUuid() {
-    // A simulated computer's UUID is not this host's.
-    if (HostSource::current().kind == HostSource::Simulated) return {};
-    std::string uuid;
-    Instrumentation computer;
-    computer.selectNode(NodeLexicon::ComputerSystemNode);
-    computer.getProperty(NodeLexicon::UUIDProperty, uuid);
-    return uuid;
 }
 
 std::string withFinalSlash(std::string path) {
@@ -57,13 +36,12 @@ std::string withFinalSlash(std::string path) {
 
 std::string readUid() {
     const std::string machineId = readMachineId();
-    return uniqueIdentifier(!machineId.empty() ? machineId : readSystemUuid());
+    return uniqueIdentifier(!machineId.empty() ? machineId : hostUuid());
 }
 
 Facts readFacts() {
     const ProductOverrides& given = productOverrides();
-    return {given.architecture ? *given.architecture : readArchitecture(),
-            withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
+    return {hostArchitecture(), withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
             given.uid ? *given.uid : readUid()};
 }
 

@@ -18,6 +18,14 @@ struct ProductOverrides {
 /// not a simulated one (vk/HostSource.h), or its file cannot be read.
 const ProductOverrides& productOverrides();
 
+/// The machine as its kernel names it, found out once per process. A simulated host's file may say it; of a snapshot
+/// what its own kernel said, where that is there to be read; else this kernel's.
+const std::string& hostArchitecture();
+
+/// The system's UUID as this machine's or the snapshot's files tell it; empty where they do not. What a simulated
+/// host's file holds of its computer does not count.
+const std::string& hostUuid();
+
 /// Whether the host is a KVM virtual machine; found out once per process. A simulated host's file may say so. This
 /// machine: CPUID says KVMKVMKVM (x86), or the firmware's system product name starts with KVM, or its system
 /// manufacturer with QEMU. A snapshot: the firmware's names alone.

@@ -1,0 +1,52 @@
+// What a simulated host's file leaves out of the product comes from this host, made of a few files here.
+
+#include "product/UniqueIdentifier.h"
+#include "support/InChild.h"
+#include "support/TemporaryDirectory.h"
+#include "system/Namespaces.h"
+#include "vk/Product.h"
+#include "vk/make_string.h"
+
+#include <gmock/gmock.h>
+
+#include <filesystem>
+#include <fstream>
+
+namespace {
+
+constexpr const char* UUID = "4c4c4544-0042-4a10-8053-b4c04f4d3132";
+
+void write(const std::filesystem::path& file, const std::string& text) {
+    std::filesystem::create_directories(file.parent_path());
+    std::ofstream(file) << text;
+}
+
+class SimulatedProduct : public test::NamespaceTest {
+protected:
+    /// The identifier on a host that a file describes, which holds a computer with a UUID of its own.
+    std::string identifier() const {
+        support::TemporaryDirectory folder;
+        folder.write("tree.json", R"({"nodes":[{"type":40,"path":"/c",)"
+                                  R"("properties":{"64":"00112233-4455-6677-8899-aabbccddeeff"}}]})");
+        return support::inChild([&] {
+            unsetenv("VK_INSTRUMENTATION_ROOT");
+            setenv("VK_INSTRUMENTATION_TREE", folder.path("tree.json").c_str(), 1);
+            return VK::make_string(VK::Product::getUid());
+        });
+    }
+};
+
+TEST_F(SimulatedProduct, IsIdentifiedByThisHostsMachineId) {
+    const test::CoveredFolder etc("/etc"), sys("/sys");
+    write("/etc/machine-id", "0123456789abcdef0123456789abcdef\n");
+    write("/sys/class/dmi/id/product_uuid", UUID);
+    EXPECT_EQ(identifier(), VK::uniqueIdentifier("0123456789abcdef0123456789abcdef"));
+}
+
+TEST_F(SimulatedProduct, IsIdentifiedByThisHostsUuidWithoutAMachineId) {
+    const test::CoveredFolder etc("/etc"), sys("/sys");
+    write("/sys/class/dmi/id/product_uuid", UUID);
+    EXPECT_EQ(identifier(), VK::uniqueIdentifier(UUID));
+}
+
+} // namespace
