@@ -1,3 +1,4 @@
+# shellcheck shell=sh
 # Puts back the time zone that the provider replaced when daylight saving was switched off or an offset was set. What was
 # there before is kept in one file: the line "vk-zone 1", then for /etc/localtime and for /etc/timezone a line "absent 0",
 # "link LENGTH" or "file LENGTH", that many bytes, and a line end. A file that is not of that form is left alone.

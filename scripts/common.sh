@@ -1,6 +1,8 @@
 # What run.sh and test.sh share: the packages they need, and building a tree with its output in a log file.
 # Sourced by bash from the repository's root.
+# shellcheck shell=bash
 
+# shellcheck disable=SC2034 # for those that source this
 build_packages="cmake ninja-build g++ pkg-config libcli11-dev nlohmann-json3-dev libfmt-dev libgtest-dev libgmock-dev libbenchmark-dev tzdata python3"
 
 die() {
