@@ -21,6 +21,10 @@ constexpr int answeredError = 1;
 constexpr int unusableArguments = 2;
 constexpr int unusableLibrary = 3;
 
+bool isAssociation(om::Operation operation) {
+    return operation == om::Operation::Associators || operation == om::Operation::AssociatorNames;
+}
+
 class Runner {
 public:
     Runner(const Arguments& given, const Streams& where)
@@ -45,7 +49,7 @@ public:
         print(arguments.format == Format::Json  ? jsonText(repeated.answer, nameSpace, schema) + '\n'
               : arguments.format == Format::Mof ? mofText(repeated.answer, nameSpace, schema)
                                                 : plainAnswer(repeated.answer, {nameSpace, schema, streams.colours}));
-        if (repeated.worst != 0) complain(repeated, request.path.className);
+        if (repeated.worst != 0) complain(repeated, request);
         if (request.fault && !repeated.answer.faulted)
             streams.error << "vkcim: the fault did not happen, as there were fewer such calls\n";
         printTiming(repeated.timing);
@@ -72,15 +76,20 @@ private:
             [&] { return hostNotes(arguments.provider); });
     }
 
-    void complain(const Repeated& repeated, const std::string& className) const {
+    void complain(const Repeated& repeated, const om::Request& request) const {
         streams.error << "vkcim: " << statusName(repeated.worst) << " (" << repeated.worst << ')';
         if (repeated.worstMessage) streams.error << ": " << printable(*repeated.worstMessage);
         streams.error << '\n';
         if (repeated.worst != CMPI_RC_ERR_INVALID_CLASS) return;
-        if (const auto nearest = nearestClass(className, schema)) {
-            streams.error << "vkcim: there is no class " << printable(className) << "; did you mean " << *nearest
-                          << "?\n";
+        for (const std::string& className : {request.path.className, request.assocClass.value_or("")}) {
+            if (const auto nearest = nearestClass(className, schema)) {
+                streams.error << "vkcim: there is no class " << printable(className) << "; did you mean " << *nearest
+                              << "?\n";
+                return;
+            }
         }
+        if (isAssociation(request.operation) && !request.assocClass)
+            streams.error << "vkcim: the association's class may have to be named: --assoc-class\n";
     }
 
     void print(const std::string& text) const { streams.output << text << std::flush; }
