@@ -1,4 +1,5 @@
 #include "Linux/ComputerSystem.h"
+#include "Linux/OneComputer.h"
 #include "support/SimulatedHost.h"
 
 #include <gmock/gmock.h>
@@ -14,14 +15,6 @@ using VK::BaseServerProvider::ComputerSystem;
 using Filter = ComputerSystem::FilterType;
 using Texts = std::vector<std::string>;
 using Numbers = std::vector<unsigned short>;
-
-/// The host of one computer, changed by `change`.
-template <class Change>
-void simulateOne(Change change) {
-    test::Node node = test::computer(0, "node7");
-    change(node);
-    test::simulate({node, test::chassis(0, 0, "CZ1")});
-}
 
 Texts remainingNames(ComputerSystem& system) {
     Texts names;
@@ -141,7 +134,7 @@ TEST(ComputerSystem, TracesTheFilterItIsGiven) {
 }
 
 TEST(ComputerSystem, ReadsItsTexts) {
-    simulateOne([](test::Node& node) {
+    test::simulateOne([](test::Node& node) {
         node.properties[115] = "ops@example.org";
         node.properties[116] = "Operations";
     });
@@ -164,7 +157,7 @@ TEST(ComputerSystem, ReadsItsTexts) {
 }
 
 TEST(ComputerSystem, SuppliesNoTextThatTheNodeLacks) {
-    simulateOne([](test::Node& node) { node.properties.clear(); });
+    test::simulateOne([](test::Node& node) { node.properties.clear(); });
     const ComputerSystem system;
     std::string text = "before";
     EXPECT_FALSE(system.getName(text));
@@ -175,96 +168,8 @@ TEST(ComputerSystem, SuppliesNoTextThatTheNodeLacks) {
     EXPECT_EQ(text, "before");
 }
 
-TEST(ComputerSystem, TellsHealthFromTheNodeStatus) {
-    for (unsigned status = 0; status <= 30; ++status) {
-        simulateOne([&](test::Node& node) { node.status = status; });
-        unsigned short health = 0;
-        std::string text;
-        Numbers states;
-        Numbers expectedStates = {0};
-        std::string expectedText = "Unknown";
-        unsigned short expectedHealth = 0;
-        if (status == 1) {
-            expectedStates = {2, 11};
-            expectedText = "OK";
-            expectedHealth = 5;
-        } else if (status == 20) {
-            expectedStates = {3, 5};
-            expectedText = "Pred Fail";
-            expectedHealth = 10;
-        } else if (status >= 21 && status <= 26) {
-            expectedStates = {3};
-            expectedText = "Degraded";
-            expectedHealth = 10;
-        }
-        const ComputerSystem system;
-        EXPECT_TRUE(system.getHealthState(health) && system.getStatus(text) && system.getOperationalStatus(states));
-        EXPECT_EQ(health, expectedHealth) << "status " << status;
-        EXPECT_EQ(text, expectedText) << "status " << status;
-        EXPECT_EQ(states, expectedStates) << "status " << status;
-    }
-}
-
-TEST(ComputerSystem, TellsAPredictiveFailure) {
-    simulateOne([](test::Node& node) { node.status = 20; });
-    const ComputerSystem system;
-    unsigned short health = 0;
-    std::string text;
-    Numbers states;
-    EXPECT_TRUE(system.getHealthState(health) && system.getStatus(text) && system.getOperationalStatus(states));
-    EXPECT_EQ(health, 10);
-    EXPECT_EQ(text, "Pred Fail");
-    EXPECT_THAT(states, ElementsAre(3, 5));
-}
-
-TEST(ComputerSystem, AppendsTheOperationalStatusToWhatTheCallerHas) {
-    simulateOne([](test::Node&) {});
-    const ComputerSystem system;
-    Numbers states = {9};
-    EXPECT_TRUE(system.getOperationalStatus(states));
-    EXPECT_THAT(states, ElementsAre(9, 2, 11));
-}
-
-TEST(ComputerSystem, TellsTheEnabledStateFromThePowerState) {
-    struct Case {
-        unsigned powerState;
-        unsigned short enabledState;
-    };
-    for (const Case expected : {Case{0, 0}, Case{1, 2}, Case{16, 4}}) {
-        simulateOne([&](test::Node& node) { node.properties[123] = expected.powerState; });
-        unsigned short state = 77;
-        EXPECT_TRUE(ComputerSystem().getEnabledState(state));
-        EXPECT_EQ(state, expected.enabledState) << "power state " << expected.powerState;
-    }
-}
-
-TEST(ComputerSystem, SuppliesTheEnabledStateUnchangedForOtherPowerStates) {
-    for (const unsigned powerState : {7U, 2U, 15U, 17U, 4294967295U}) {
-        simulateOne([&](test::Node& node) { node.properties[123] = powerState; });
-        unsigned short state = 77;
-        EXPECT_TRUE(ComputerSystem().getEnabledState(state)) << "power state " << powerState;
-        EXPECT_EQ(state, 77) << "power state " << powerState;
-    }
-}
-
-TEST(ComputerSystem, SuppliesNoEnabledStateWithoutAPowerState) {
-    unsigned short state = 77;
-    simulateOne([](test::Node& node) { node.properties.erase(123); });
-    EXPECT_FALSE(ComputerSystem().getEnabledState(state));
-    simulateOne([](test::Node& node) { node.properties[123] = "1"; });
-    EXPECT_FALSE(ComputerSystem().getEnabledState(state));
-    EXPECT_EQ(state, 77);
-}
-
-TEST(ComputerSystem, IsNotDedicatedToAnything) {
-    simulateOne([](test::Node&) {});
-    Numbers purposes = {4, 5};
-    EXPECT_TRUE(ComputerSystem().getDedicated(purposes));
-    EXPECT_THAT(purposes, ElementsAre(0));
-}
-
 TEST(ComputerSystem, IdentifiesItselfPairByPair) {
-    simulateOne([](test::Node&) {});
+    test::simulateOne([](test::Node&) {});
     Texts descriptions;
     Texts values;
     EXPECT_TRUE(ComputerSystem().getIdentifyingInfo(descriptions, values));
@@ -288,7 +193,7 @@ TEST(ComputerSystem, FillsWhatIdentifiesItButAnswersFalseWithoutAChassis) {
 }
 
 TEST(ComputerSystem, LeavesOutOnlyTheGuidPairsWithoutAUuid) {
-    simulateOne([](test::Node& node) { node.properties.erase(64); });
+    test::simulateOne([](test::Node& node) { node.properties.erase(64); });
     Texts descriptions;
     Texts values;
     EXPECT_TRUE(ComputerSystem().getIdentifyingInfo(descriptions, values));
@@ -299,7 +204,7 @@ TEST(ComputerSystem, LeavesOutOnlyTheGuidPairsWithoutAUuid) {
 
 TEST(ComputerSystem, LeavesOutTheModelPairsWithoutSerialNumberOrModelOfItsOwn) {
     for (const unsigned missing : {50U, 39U}) {
-        simulateOne([&](test::Node& node) { node.properties.erase(missing); });
+        test::simulateOne([&](test::Node& node) { node.properties.erase(missing); });
         Texts descriptions;
         Texts values;
         EXPECT_TRUE(ComputerSystem().getIdentifyingInfo(descriptions, values)) << "the chassis alone decides";
@@ -310,7 +215,7 @@ TEST(ComputerSystem, LeavesOutTheModelPairsWithoutSerialNumberOrModelOfItsOwn) {
 }
 
 TEST(ComputerSystem, AppendsWhatIdentifiesItAndClearsBeforeEitherHalf) {
-    simulateOne([](test::Node&) {});
+    test::simulateOne([](test::Node&) {});
     const ComputerSystem system;
     Texts values = {"mine"};
     Texts descriptions = {"mine"};
@@ -334,7 +239,7 @@ void expectUntouched(const ComputerSystem& system, bool (ComputerSystem::*getter
 }
 
 TEST(ComputerSystem, LeavesTheOutputOfWhatTheHostCannotSupply) {
-    simulateOne([](test::Node&) {});
+    test::simulateOne([](test::Node&) {});
     const ComputerSystem system;
     for (const auto getter :
          {&ComputerSystem::getCaption, &ComputerSystem::getInstallDate, &ComputerSystem::getOtherEnabledState,
