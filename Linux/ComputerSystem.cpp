@@ -157,6 +157,9 @@ bool ComputerSystem::getDedicated(std::vector<unsigned short>& purposes) const {
 bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
                                         std::vector<std::string>& values) const {
     const TraceScope scope(source);
+    constexpr std::size_t most = 6;
+    descriptions.reserve(most);
+    values.reserve(most);
     const auto add = [&](std::string value, const char* description) {
         values.push_back(std::move(value));
         descriptions.emplace_back(description);

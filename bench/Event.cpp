@@ -24,7 +24,7 @@ void methodEvent() {
 }
 void methodLine() {
     char text[512];
-    std::snprintf(text, sizeof text, "METHOD: %s() was invoked in %s [Line: %d]", function, source.file,
+    std::snprintf(text, sizeof text, "METHOD: %s() was invoked in %s [Line: %d]", function, source.file.data(),
                   static_cast<int>(line));
     benchmark::DoNotOptimize(text);
 }
@@ -34,7 +34,7 @@ void variableEvent() {
 void variableLine() {
     char text[512];
     std::snprintf(text, sizeof text, "VARIABLE: '%s' has Value '%d' at line %d in %s", "classId", 161,
-                  static_cast<int>(line), source.file);
+                  static_cast<int>(line), source.file.data());
     benchmark::DoNotOptimize(text);
 }
 void scopeEvents() {
@@ -43,7 +43,7 @@ void scopeEvents() {
 void scopeLines() {
     for (const char* word : {"ENTERING", "EXITING"}) {
         char text[512];
-        std::snprintf(text, sizeof text, "%s: %s() in %s [Line: %d]", word, function, source.file,
+        std::snprintf(text, sizeof text, "%s: %s() in %s [Line: %d]", word, function, source.file.data(),
                       static_cast<int>(line));
         benchmark::DoNotOptimize(text);
     }
@@ -56,7 +56,7 @@ void pointerLines() {
     for (const char* word : {"ENTERING", "EXITING"}) {
         char text[512];
         std::snprintf(text, sizeof text, "%s: %s() in %s [Line: %d],Parameters List:  objectPath=%p", word, function,
-                      source.file, static_cast<int>(line), static_cast<const void*>(&object));
+                      source.file.data(), static_cast<int>(line), static_cast<const void*>(&object));
         benchmark::DoNotOptimize(text);
     }
 }

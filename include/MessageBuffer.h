@@ -1,9 +1,9 @@
 #pragma once
 
-#include <algorithm>
 #include <charconv>
 #include <cstddef>
 #include <cstring>
+#include <string_view>
 
 namespace VK {
 
@@ -21,23 +21,26 @@ struct MessageBuffer {
     }
 
     /// Appends a text; null prints as printf prints it.
-    MessageBuffer& add(const char* part) {
-        if (part == nullptr) part = "(null)";
-        return add(part, std::strlen(part));
-    }
+    MessageBuffer& add(const char* part) { return add(textOrNull(part)); }
 
-    MessageBuffer& add(const char* part, std::size_t partLength) {
-        partLength = std::min(partLength, size - 1 - length);
-        std::memcpy(text + length, part, partLength);
-        length += partLength;
+    /// Inline, so that a literal is appended with its length known: a few moves instead of two calls.
+    MessageBuffer& add(std::string_view part) {
+        if (__builtin_expect(part.size() > room(), false)) return cut(part);
+        std::memcpy(text + length, part.data(), part.size());
+        length += part.size();
         return *this;
     }
 
     /// Appends a number as a signed decimal, as these lines have always shown numbers: 4294967295 prints as -1.
     MessageBuffer& addSigned(unsigned int number) {
-        char digits[12];
-        const auto end = std::to_chars(digits, digits + sizeof digits, static_cast<int>(number)).ptr;
-        return add(digits, static_cast<std::size_t>(end - digits));
+        constexpr std::size_t longest = 11; // -2147483648
+        char digits[longest];
+        char* const place = room() < longest ? digits : text + length;
+        const auto end = std::to_chars(place, place + longest, static_cast<int>(number)).ptr;
+        const auto written = static_cast<std::size_t>(end - place);
+        if (place == digits) return add({digits, written});
+        length += written;
+        return *this;
     }
 
     /// Clears what is left behind the line, so that all bytes not written are zero.
@@ -45,6 +48,14 @@ struct MessageBuffer {
         std::memset(text + length, 0, size - length);
         return text;
     }
+
+    /// A text as it is printed.
+    static std::string_view textOrNull(const char* part) { return part != nullptr ? part : "(null)"; }
+
+private:
+    std::size_t room() const { return size - 1 - length; }
+
+    __attribute__((noinline, cold)) MessageBuffer& cut(std::string_view part) { return add(part.substr(0, room())); }
 };
 
 } // namespace VK

@@ -17,7 +17,7 @@ void swallowing(Step step) noexcept {
 }
 
 void hand(const TracePoint& at, int level, const char* text) {
-    logAndTrace(at.function, at.source.file, at.line, at.source.category, level, text);
+    logAndTrace(at.function.data(), at.source.file.data(), at.line, at.source.category, level, text);
 }
 
 void writeLine(const TracePoint& at, int level, MessageType type) {
@@ -78,15 +78,15 @@ void traceMethod(const TracePoint& at, int level) {
 }
 
 void traceMessage(const TracePoint& at, const char* message, int level) {
-    hand(at, level, trace(at.source.file, message, at.line, MESSAGE));
+    hand(at, level, trace(at.source.file, MessageBuffer::textOrNull(message), at.line, MESSAGE));
 }
 
 void traceVariable(const TracePoint& at, const char* name, const char* value, int level) {
-    hand(at, level, trace(name, at.source.file, at.line, value));
+    hand(at, level, trace(name, at.source.file.data(), at.line, value));
 }
 
 void traceVariable(const TracePoint& at, const char* name, unsigned int value, int level) {
-    hand(at, level, trace(name, at.source.file, at.line, value));
+    hand(at, level, trace(name, at.source.file.data(), at.line, value));
 }
 
 void traceDestructor(const TracePoint& at) noexcept {

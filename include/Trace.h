@@ -6,6 +6,7 @@
 
 #include <ostream>
 #include <string>
+#include <string_view>
 #include <type_traits>
 
 namespace NVLog {
@@ -33,7 +34,7 @@ enum TraceLevel : int { NoticeLevel = 3000, DebugLevel = 4000, FailureLevel = 60
 
 namespace detail {
 
-inline MessageBuffer& format(MessageBuffer& buffer, const char* file, const char* function, unsigned int line,
+inline MessageBuffer& format(MessageBuffer& buffer, std::string_view file, std::string_view function, unsigned int line,
                              MessageType type) {
     buffer.start();
     switch (type) {
@@ -71,18 +72,27 @@ inline char* finishVariable(MessageBuffer& buffer, const char* file, unsigned in
 } // namespace detail
 
 /// The line of `type` for a function (for MESSAGE: a message text) in a file.
-inline char* trace(const char* file, const char* function, unsigned int line, MessageType type) {
+inline char* trace(std::string_view file, std::string_view function, unsigned int line, MessageType type) {
     static thread_local MessageBuffer messageBuffer;
     return detail::format(messageBuffer, file, function, line, type).finish();
 }
 
+inline char* trace(const char* file, const char* function, unsigned int line, MessageType type) {
+    return trace(MessageBuffer::textOrNull(file), MessageBuffer::textOrNull(function), line, type);
+}
+
 /// The same, followed by a list of parameters.
-inline char* tracepara(const char* file, const char* function, unsigned int line, const char* parameters,
+inline char* tracepara(std::string_view file, std::string_view function, unsigned int line, const char* parameters,
                        MessageType type) {
     static thread_local MessageBuffer messageBuffer;
     detail::format(messageBuffer, file, function, line, type);
     if (type <= MESSAGE) messageBuffer.add(",Parameters List: ").add(parameters);
     return messageBuffer.finish();
+}
+
+inline char* tracepara(const char* file, const char* function, unsigned int line, const char* parameters,
+                       MessageType type) {
+    return tracepara(MessageBuffer::textOrNull(file), MessageBuffer::textOrNull(function), line, parameters, type);
 }
 
 /// A variable's value. The name comes first and the file second, unlike above; the value prints before the line.
@@ -114,7 +124,7 @@ void markProviderExit(const std::string& logger, const char* file, const char* f
 /// Whose lines they are: a source file's logger category and its bare name.
 struct TraceSource {
     const std::string& category;
-    const char* file;
+    std::string_view file; ///< ends in a zero byte
 };
 
 /// A place in a source file; converts from the file's source, standing where the conversion stands.
@@ -124,7 +134,7 @@ struct TracePoint {
         : source(theSource), function(theFunction), line(theLine) {}
 
     const TraceSource& source;
-    const char* function;
+    std::string_view function; ///< ends in a zero byte; its length is known when the place is compiled
     unsigned int line;
 };
 

@@ -32,7 +32,7 @@ public:
     template <class Work, class OnException>
     void run(Work work, OnException onException, unsigned int line = __builtin_LINE()) const {
         try {
-            markProviderEntry(frameSource.category, frameSource.file, function, line);
+            markProviderEntry(frameSource.category, frameSource.file.data(), function, line);
             work();
         } catch (const std::exception& exception) {
             contained([&] { traceMessage(here(line), exception.what(), NoticeLevel); });
@@ -46,7 +46,7 @@ public:
     CMPIStatus runMarked(Work work, unsigned int line = __builtin_LINE()) const {
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         run([&] { work(status); }, [](const std::exception&) {}, line);
-        contained([&] { markProviderExit(frameSource.category, frameSource.file, function, line); });
+        contained([&] { markProviderExit(frameSource.category, frameSource.file.data(), function, line); });
         return status;
     }
 

@@ -3,25 +3,30 @@
 namespace VK {
 namespace Inside {
 
+void Cursor::standOn(const Node* node) {
+    current = node;
+    knownStatus.reset();
+}
+
 void Cursor::selectType(unsigned int type) {
     tree = host.tree();
     sameType = &tree->ofType(type);
     rank = 0;
     filtered = false;
-    current = sameType->empty() ? nullptr : sameType->front();
+    standOn(sameType->empty() ? nullptr : sameType->front());
 }
 
 void Cursor::selectPath(const std::string& path) {
     tree = host.tree();
     sameType = nullptr;
     filtered = false;
-    current = tree->find(path).node;
+    standOn(tree->find(path).node);
 }
 
 void Cursor::advance() {
     if (current == nullptr) return;
     // Paths are unique: behind the one node that a filter lets pass, or that was selected by its path, there is none.
-    current = filtered || sameType == nullptr || ++rank >= sameType->size() ? nullptr : (*sameType)[rank];
+    standOn(filtered || sameType == nullptr || ++rank >= sameType->size() ? nullptr : (*sameType)[rank]);
 }
 
 void Cursor::filterByPath(const std::string& path) {
@@ -29,7 +34,7 @@ void Cursor::filterByPath(const std::string& path) {
     const NodeTree::Place place = tree->find(path);
     const bool reached = place.node == current || (!filtered && sameType != nullptr && place.node != nullptr &&
                                                    place.node->type == current->type && place.rank >= rank);
-    current = reached ? place.node : nullptr;
+    standOn(reached ? place.node : nullptr);
     rank = place.rank;
     filtered = true;
 }
@@ -45,7 +50,7 @@ bool Cursor::write(unsigned int property, const Value& value) {
     const NodeTree::Place place = now->find(current->path);
     if (place.node == nullptr || place.node->type != current->type) return true; // taken away since: the old one stays
     if (sameType != nullptr) sameType = &now->ofType(place.node->type);
-    current = place.node;
+    standOn(place.node);
     rank = place.rank;
     tree = std::move(now);
     return true;
@@ -56,7 +61,9 @@ std::optional<bool> Cursor::isReadOnly(unsigned int property) const {
 }
 
 unsigned int Cursor::status() const {
-    return current != nullptr ? host.status(*current) : 0;
+    if (current == nullptr) return 0;
+    if (!knownStatus) knownStatus = host.status(*current);
+    return *knownStatus;
 }
 
 } // namespace Inside

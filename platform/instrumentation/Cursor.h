@@ -3,6 +3,7 @@
 #include "instrumentation/Host.h"
 
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace VK {
@@ -22,20 +23,25 @@ public:
     void advance();
     void filterByPath(const std::string& path);
     /// Moves off the end, for filters that no node passes.
-    void finish() { current = nullptr; }
+    void finish() { standOn(nullptr); }
 
     std::optional<Value> read(unsigned int property) const;
     bool write(unsigned int property, const Value& value);
     std::optional<bool> isReadOnly(unsigned int property) const;
+    /// Read once while the cursor stands where it does: what one answer tells of the health is of one moment, and a
+    /// host that reads it from files does so once.
     unsigned int status() const;
 
 private:
+    void standOn(const Node* node);
+
     Host& host;
     std::shared_ptr<const NodeTree> tree;
     const NodeTree::Nodes* sameType = nullptr; ///< what ++ walks along; null after selectPath
     std::size_t rank = 0;
     const Node* current = nullptr;
     bool filtered = false;
+    mutable std::optional<unsigned int> knownStatus; ///< of the current node
 };
 
 } // namespace Inside

@@ -5,8 +5,6 @@
 
 #include <array>
 #include <charconv>
-#include <memory>
-#include <new>
 
 namespace NVLog {
 
@@ -23,8 +21,8 @@ NVMessageBuffer::NVMessageBuffer() : storage(Storage::pool.take()) {
 }
 
 NVMessageBuffer::~NVMessageBuffer() {
-    std::unique_ptr<Storage> unused(storage);
-    if (unused->reset() && Storage::pool.put(unused.get())) static_cast<void>(unused.release());
+    storage->reset();
+    if (!Storage::pool.give(storage)) delete storage;
 }
 
 NVMessageBuffer& NVMessageBuffer::operator<<(const char* text) {

@@ -9,47 +9,54 @@
 
 namespace NVLog {
 
-/// Objects that nobody uses just now, for all threads, without locks: one takes any of them, or finds none and
-/// makes its own; what finds no place when put back is the caller's to delete.
+/// Objects that wait to be used, for all threads, without locks: one takes any that nobody uses and gives it back, or
+/// finds none and makes its own. Taking costs one atomic exchange, giving back a store. The objects go with the pool,
+/// but for those in use then, which stay for good: threads may log while the process ends.
 template <typename Object>
 class Pool {
 public:
-    Pool() = default;
-    ~Pool() {
-        for (auto& place : places) delete place.exchange(nullptr);
-    }
-    Pool(const Pool&) = delete;
-    Pool& operator=(const Pool&) = delete;
-
     Object* take() noexcept {
         const std::size_t first = firstPlace();
         for (std::size_t i = 0; i < places.size(); ++i) {
-            auto& place = places[(first + i) % places.size()];
-            if (place.load(std::memory_order_relaxed) == nullptr) continue;
-            if (Object* const found = place.exchange(nullptr, std::memory_order_acquire)) return found;
+            Place& place = places[(first + i) % places.size()];
+            if (!place.taken.load(std::memory_order_relaxed) && !place.taken.exchange(true, std::memory_order_acquire))
+                return &place.object;
         }
         return nullptr;
     }
 
-    bool put(Object* object) noexcept {
-        const std::size_t first = firstPlace();
-        for (std::size_t i = 0; i < places.size(); ++i) {
-            Object* none = nullptr;
-            auto& place = places[(first + i) % places.size()];
-            if (place.compare_exchange_strong(none, object, std::memory_order_release, std::memory_order_relaxed))
-                return true;
-        }
-        return false;
+    /// False for an object that did not come from here.
+    bool give(Object* object) noexcept {
+        const auto address = reinterpret_cast<std::uintptr_t>(object);
+        const auto start = reinterpret_cast<std::uintptr_t>(places.data());
+        if (address < start || address >= start + sizeof places) return false;
+        places[(address - start) / sizeof(Place)].taken.store(false, std::memory_order_release);
+        return true;
     }
 
 private:
+    /// On cache lines of its own, so that threads do not slow each other down.
+    struct alignas(64) Place {
+        Place() : object() {}
+        ~Place() {
+            if (!taken.exchange(true)) object.~Object();
+        }
+        Place(const Place&) = delete;
+        Place& operator=(const Place&) = delete;
+
+        std::atomic<bool> taken{false};
+        union {
+            Object object;
+        };
+    };
+
     /// Threads start at different places, told apart by where their stacks lie.
     static std::size_t firstPlace() noexcept {
         const auto stack = reinterpret_cast<std::uintptr_t>(__builtin_frame_address(0));
         return stack / (64 * 1024);
     }
 
-    std::array<std::atomic<Object*>, 32> places{};
+    std::array<Place, 32> places{};
 };
 
 } // namespace NVLog

@@ -1,6 +1,7 @@
 #include "logger/Settings.h"
 
 #include <algorithm>
+#include <atomic>
 #include <charconv>
 #include <cstdlib>
 #include <pthread.h>
@@ -75,10 +76,12 @@ void setChannels(Settings& settings, std::string_view list) noexcept {
 }
 
 Settings theSettings;
+std::atomic<bool> settingsAreRead{false};
 
 void readEnvironment() {
     theSettings =
         parseSettings(secure_getenv("NVLOG_SINK"), secure_getenv("NVLOG_LEVELS"), secure_getenv("NVLOG_CHANNELS"));
+    settingsAreRead.store(true, std::memory_order_release);
 }
 
 } // namespace
@@ -93,6 +96,7 @@ Settings parseSettings(const char* sink, const char* levels, const char* channel
 }
 
 const Settings& currentSettings() noexcept {
+    if (settingsAreRead.load(std::memory_order_acquire)) return theSettings;
     // Other than a static local's guard, this is right also in the child of a fork in the middle of it.
     static pthread_once_t once = PTHREAD_ONCE_INIT;
     pthread_once(&once, &readEnvironment);

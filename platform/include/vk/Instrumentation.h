@@ -26,9 +26,10 @@ private:
 ///
 /// The tree comes from this host, a snapshot of one, or a simulated host's file (vk/HostSource.h). A source that
 /// cannot be read is an empty tree and one log line at level 6000; a simulated host's file may have 16 MiB. What cannot
-/// change while a host runs is read once per process, the rest (host name, power state, clock, zone, memory errors) at
-/// each call; a simulated host's file as it stands when nodes are selected. No operation throws but for std::bad_alloc.
-/// Cursors are independent of each other; one cursor belongs to one thread at a time.
+/// change while a host runs is read once per process, the rest (host name, power state, clock, zone) at each call, and
+/// memory errors when a cursor is first asked for its node's status; a simulated host's file as it stands when nodes
+/// are selected. No operation throws but for std::bad_alloc. Cursors are independent of each other; one cursor belongs
+/// to one thread at a time.
 class Instrumentation {
 public:
     /// A cursor that stands on nothing.
@@ -72,7 +73,7 @@ public:
     bool isPropertyReadOnly(NodeLexicon::Properties property, bool& readOnly) const;
 
     /// Status of the current node: 1 normal, 20 predictive failure, 21 to 26 degraded or failed, else unknown.
-    /// 0 on nothing.
+    /// 0 on nothing. The same until the cursor moves or writes.
     unsigned int getNodeStatus() const;
     /// The current node's description for people; empty on nothing.
     std::string getNodeDescription() const;

@@ -101,6 +101,39 @@ TEST_F(CursorTest, SeesWhatItWroteAndGoesOnFromThere) {
     EXPECT_THAT(rest(), ElementsAre("/b", "/c"));
 }
 
+/// Tells another status at each look.
+class AgeingHost : public Host {
+public:
+    explicit AgeingHost(SimulatedHost& theNodes) : nodes(theNodes) {}
+    std::shared_ptr<const NodeTree> tree() override { return nodes.tree(); }
+    std::optional<Value> read(const Node& node, unsigned int property) override { return nodes.read(node, property); }
+    bool write(const Node&, unsigned int, const Value&) override { return true; }
+    std::optional<bool> isReadOnly(const Node&, unsigned int) override { return std::nullopt; }
+    unsigned int status(const Node&) override { return ++looks; }
+
+private:
+    SimulatedHost& nodes;
+    unsigned int looks = 0;
+};
+
+TEST_F(CursorTest, LooksAtTheStatusOnceUntilItMovesOrWrites) {
+    AgeingHost ageing(host);
+    Cursor place(ageing);
+    place.selectType(40);
+    EXPECT_EQ(place.status(), 1U);
+    EXPECT_EQ(place.status(), 1U);
+    place.advance();
+    EXPECT_EQ(place.status(), 2U);
+    EXPECT_TRUE(place.write(108, Value("other")));
+    EXPECT_EQ(place.status(), 3U);
+    place.filterByPath("/b");
+    EXPECT_EQ(place.status(), 4U);
+    place.selectPath("/a");
+    EXPECT_EQ(place.status(), 5U);
+    place.finish();
+    EXPECT_EQ(place.status(), 0U);
+}
+
 } // namespace
 
 } // namespace VK::Inside
