@@ -5,12 +5,12 @@
 #include "instrumentation/Placeholder.h"
 #include "instrumentation/Smbios.h"
 #include "instrumentation/TextFiles.h"
+#include "vk/Architecture.h"
 
 #include <cerrno>
 #include <initializer_list>
 #include <map>
 #include <optional>
-#include <sys/utsname.h>
 
 namespace VK {
 namespace Inside {
@@ -198,15 +198,6 @@ std::vector<ChassisFacts> withoutTables(const Root& root, const Sysinfo& sysinfo
 }
 
 } // namespace
-
-std::string architectureOf(const Root& root) {
-    if (!root.isLive()) {
-        const std::string told = cleanText(firstLine(root.read("/proc/sys/kernel/arch").text));
-        if (!told.empty()) return told;
-    }
-    utsname name{};
-    return uname(&name) == 0 ? static_cast<const char*>(name.machine) : std::string();
-}
 
 HardwareFacts readHardware(const Root& root) {
     HardwareFacts facts;

@@ -44,12 +44,9 @@ struct HardwareFacts {
     Fact firmwareModel;
     Fact ownerContact;
     Fact ownerName;
-    std::string architecture; ///< see architectureOf
+    std::string architecture; ///< see vk/Architecture.h
     std::vector<ChassisFacts> chassis;
 };
-
-/// The kernel's name of the machine; of a snapshot what its own kernel said, where it is there to be read.
-std::string architectureOf(const Root& root);
 
 /// Reads the facts of the host below `root`, each from the first source that tells it: /etc/machine-info, the
 /// SMBIOS tables, the kernel's reading of them, the device tree, s390's system information, Xen.

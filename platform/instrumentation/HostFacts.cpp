@@ -31,12 +31,6 @@ const ProductOverrides& productOverrides() {
     return overrides;
 }
 
-const std::string& hostArchitecture() {
-    static const std::string architecture =
-        productOverrides().architecture.value_or(Inside::architectureOf(Root::host()));
-    return architecture;
-}
-
 const std::string& hostUuid() {
     return Inside::realHost().hardware().uuid.text;
 }

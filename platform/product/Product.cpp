@@ -2,6 +2,7 @@
 
 #include "product/UniqueIdentifier.h"
 #include "product/Widen.h"
+#include "vk/Architecture.h"
 #include "vk/HostFacts.h"
 #include "vk/Root.h"
 
@@ -36,12 +37,13 @@ std::string withFinalSlash(std::string path) {
 
 std::string readUid() {
     const std::string machineId = readMachineId();
-    return uniqueIdentifier(!machineId.empty() ? machineId : hostUuid());
+    return uniqueIdentifier(machineId.empty() && hostUuid != nullptr ? hostUuid() : machineId);
 }
 
 Facts readFacts() {
-    const ProductOverrides& given = productOverrides();
-    return {hostArchitecture(), withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
+    const ProductOverrides given = productOverrides != nullptr ? productOverrides() : ProductOverrides();
+    return {given.architecture ? *given.architecture : architectureOf(Root::host()),
+            withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
             given.uid ? *given.uid : readUid()};
 }
 

@@ -5,7 +5,7 @@
 namespace VK {
 
 bool ProviderUtilities::isKVM() {
-    return hostIsKVM();
+    return hostIsKVM != nullptr && hostIsKVM();
 }
 
 } // namespace VK

@@ -217,6 +217,15 @@ TEST_F(ReplacedLibraries, AnswerAsEverWhereTheyOnlyPassOn) {
     expectIntact(ask(getOne, preloading(REPLACED_OPERATIONS)), "operations that pass on");
 }
 
+TEST_F(ReplacedLibraries, NeedOfTheInstrumentationNoMoreThanItsOperations) {
+    const nlohmann::json answer = ask({"instances", "VESKA_ComputerSystem"}, preloading(REPLACED_INSTRUMENTATION));
+    ASSERT_THAT(answer["results"], SizeIs(1));
+    const nlohmann::json& properties = answer["results"][0]["properties"];
+    EXPECT_EQ(properties["Name"]["value"], "replaced");
+    EXPECT_EQ(properties["Description"]["value"], "Replaced");
+    EXPECT_EQ(ask({"names", "VESKA_CIMServiceConfig"}, preloading(REPLACED_INSTRUMENTATION))["status"]["code"], 0);
+}
+
 TEST_F(ReplacedLibraries, NameTheTimeServiceWithoutAHostNameThatCannotBeRead) {
     const nlohmann::json answer = ask({"names", "VESKA_TimeService"},
                                       preloading(REPLACED_HOSTNAME) + Environment{{"REPLACEMENT_HOSTNAME", "fails"}});
