@@ -40,8 +40,11 @@ if(VK_FUZZ)
     target_compile_options(vk_settings INTERFACE -fsanitize=fuzzer-no-link)
 endif()
 if(VK_COVERAGE)
-    target_compile_options(vk_settings INTERFACE --coverage -fprofile-update=prefer-atomic -O0)
-    target_link_options(vk_settings INTERFACE --coverage)
+    # The counters lie in files that are mapped (%c): so they outlive children that are killed or leave by _exit. One
+    # file holds those of a program or library, from all of its runs (%m); scripts/coverage reads them.
+    target_compile_options(vk_settings INTERFACE -O0 -fcoverage-mapping -fprofile-update=atomic
+        -fprofile-instr-generate=${CMAKE_BINARY_DIR}/profiles/%m%c.profraw "SHELL:-mllvm -runtime-counter-relocation=true")
+    target_link_options(vk_settings INTERFACE -fprofile-instr-generate)
 endif()
 if(NOT CMAKE_BUILD_TYPE STREQUAL "Debug" AND NOT VK_COVERAGE AND NOT VK_SANITIZE)
     # Some distributions' compilers set a level of their own. It wants optimisation, which test programs do without.

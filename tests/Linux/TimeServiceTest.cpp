@@ -5,6 +5,7 @@
 
 #include <gmock/gmock.h>
 
+#include <fstream>
 #include <unistd.h>
 
 namespace {
@@ -25,7 +26,7 @@ std::string hostName() {
     return name;
 }
 
-/// A simulated host with one computer, on which no NTP daemon runs. The init script is never started by these tests.
+/// A simulated host with one computer, on which no NTP daemon runs. The machine's own init script is never started.
 class TimeServiceTest : public testing::Test {
 protected:
     TimeServiceTest() {
@@ -36,10 +37,20 @@ protected:
         test::takeShellCalls();
         test::takeLog();
     }
-    ~TimeServiceTest() override { test::refuseToStart(""); }
+    ~TimeServiceTest() override {
+        test::refuseToStart("");
+        test::startInstead("", "");
+    }
 
     void runDaemon(const std::string& line = "ntp 812 1 /usr/sbin/ntpd -g") {
         commands.add("ps", test::printing({"root 1 0 /sbin/init", line}));
+    }
+
+    /// Gives the host an init script.
+    void addInitScript(const std::string& script) {
+        test::refuseToStart("");
+        test::startInstead("/etc/init.d/", commands.path("init.d/").string());
+        commands.add(commands.path("init.d/ntp"), script);
     }
 
     test::FakeCommands commands;
@@ -197,6 +208,58 @@ TEST_F(TimeServiceTest, SynchronisesByTheFirstLineWhereNoDaemonRuns) {
         EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps, synchronise));
         EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "ntpd [-xgq]"));
     }
+}
+
+TEST_F(TimeServiceTest, BelievesTheFirstLineOfTheInitScriptAlone) {
+    const struct {
+        std::vector<std::string> printed;
+        unsigned int result;
+    } table[] = {
+        {{"Stopping NTP server: ntpd."}, 2},
+        {{"Stopping NTP server: done"}, 0},
+        {{"done."}, 0},
+        {{"Done"}, 2},
+        {{"Stopping NTP server", "done"}, 2},
+        {{}, 2},
+    };
+    for (const auto& row : table) {
+        addInitScript(test::printing(row.printed) + "exit 1");
+        commands.add("ps");
+        EXPECT_EQ(TimeService().StartService(), row.result) << testing::PrintToString(row.printed);
+        runDaemon();
+        EXPECT_EQ(TimeService().StopService(), row.result) << testing::PrintToString(row.printed);
+        EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "init.d/ntp [start]", "ps [-ef]", "init.d/ntp [stop]"));
+    }
+}
+
+TEST_F(TimeServiceTest, AnswersARunningDaemonsRestartWhateverTheSynchronisationDid) {
+    const std::string running = commands.path("running").string();
+    commands.add("ps", "test ! -e " + running + " || echo ntp 812 1 /usr/sbin/ntpd");
+    const struct {
+        const char* synchronisation;
+        const char* start;
+        unsigned int result;
+    } table[] = {
+        {"ntpd: no servers found", "done", 0},
+        {"ntpd: time slew +0.0s", "failed", 2},
+        {"ntpd: time slew +0.0s", "done", 0},
+    };
+    for (const auto& row : table) {
+        addInitScript("rm -f " + running + "; test $1 = start && echo " + row.start + " || echo done");
+        commands.add("ntpd", test::printing({row.synchronisation}));
+        std::ofstream(running).close();
+        EXPECT_EQ(TimeService().SyncClock(), row.result) << row.synchronisation << ", start: " << row.start;
+        EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "ps [-ef]", "init.d/ntp [stop]", "ntpd [-xgq]", "ps [-ef]",
+                                                 "init.d/ntp [start]"));
+    }
+}
+
+TEST_F(TimeServiceTest, SynchronisesWithADaemonThatWouldNotStopAndStartsNoOther) {
+    addInitScript("echo failed");
+    runDaemon();
+    commands.add("ntpd", test::printing({"ntpd: no servers found"}));
+    EXPECT_EQ(TimeService().SyncClock(), 0U);
+    EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]", "ps [-ef]", "init.d/ntp [stop]", "ntpd [-xgq]", "ps [-ef]"));
 }
 
 TEST_F(TimeServiceTest, FailsWhenTheSynchronisationCannotBeStarted) {

@@ -1,7 +1,9 @@
+#include "cmpi/CMPIComputerSystemPackage.h"
 #include "support/Associations.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
+#include <cmpimacs.h>
 #include <gmock/gmock.h>
 
 namespace {
@@ -130,6 +132,67 @@ TEST(CMPIComputerSystemPackage, FailsOnAChassisWithoutSerialNumberBeforeTheOneAs
 TEST(CMPIComputerSystemPackage, FindsTheChassisBeforeOneWithoutSerialNumber) {
     test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::without(test::chassis(0, 1, ""), 50)});
     EXPECT_EQ(test::associatorNames(chassisPath("A"), className).results.size(), 1U);
+}
+
+TEST(CMPIComputerSystemPackage, IsNotGivenByAChassisThatSaysAnotherComputersNode) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
+    const om::ObjectPath elsewhere = test::path("VESKA_PhysicalPackage", {{"Tag", "A"}, {"SystemName", "/computer/1"}});
+    const om::Answer answer =
+        test::get(test::associationPath(className, {{"Antecedent", elsewhere}, {"Dependent", computerPath("a")}}));
+    EXPECT_THAT(answer.results, IsEmpty());
+    EXPECT_EQ(answer.code, CMPI_RC_OK);
+}
+
+// The adapter itself, asked for what the provider does not ask it for.
+
+class CMPIComputerSystemPackageAdapter : public testing::Test {
+protected:
+    CMPIComputerSystemPackageAdapter() { test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")}); }
+
+    CMPIObjectPath* requestPath(const char* name, const char* key = nullptr, const char* value = nullptr) const {
+        CMPIObjectPath* const path = CMNewObjectPath(broker, "root/cimv2", name, nullptr);
+        if (key != nullptr) CMAddKey(path, key, reinterpret_cast<const CMPIValue*>(value), CMPI_chars);
+        return path;
+    }
+
+    const CMPIBroker* const broker = test::provider().broker();
+};
+
+using VK::BaseServerProvider::CMPIComputerSystemPackage;
+
+TEST_F(CMPIComputerSystemPackageAdapter, NamesNothingBehindItsLastElement) {
+    for (CMPIObjectPath* const source : {requestPath("VESKA_ComputerSystem", "Name", "a"),
+                                         requestPath("VESKA_PhysicalPackage", "Tag", "A"), requestPath(className)}) {
+        CMPIComputerSystemPackage adapter(broker, nullptr, source);
+        ASSERT_TRUE(adapter);
+        EXPECT_NE(adapter.getObjectPath(), nullptr);
+        for (int step = 0; step < 3; ++step) {
+            ++adapter;
+            EXPECT_FALSE(adapter) << step;
+            EXPECT_EQ(adapter.getObjectPath(), nullptr);
+            EXPECT_EQ(adapter.getCMPIInstance(nullptr), nullptr);
+        }
+    }
+}
+
+TEST_F(CMPIComputerSystemPackageAdapter, LeavesOutReferencesThatTheBrokerDoesNotTell) {
+    static CMPIObjectPathFT forgetful;
+    forgetful = *requestPath(className)->ft;
+    forgetful.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) { return CMPIData{0, CMPI_nullValue, {}}; };
+    forgetful.getKeyAt = nullptr;
+    CMPIBrokerEncFT table = *broker->eft;
+    table.newInstance = [](const CMPIBroker* theBroker, const CMPIObjectPath* path, CMPIStatus* status) {
+        CMPIInstance* const instance = test::provider().broker()->eft->newInstance(theBroker, path, status);
+        const_cast<CMPIObjectPath*>(path)->ft = &forgetful;
+        return instance;
+    };
+    CMPIBroker spoiled = *broker;
+    spoiled.eft = &table;
+    CMPIInstance* const whole = CMPIComputerSystemPackage(broker, nullptr, requestPath(className)).getCMPIInstance({});
+    EXPECT_EQ(CMGetPropertyCount(whole, nullptr), 3U);
+    CMPIInstance* const part = CMPIComputerSystemPackage(&spoiled, nullptr, requestPath(className)).getCMPIInstance({});
+    ASSERT_NE(part, nullptr);
+    EXPECT_EQ(CMGetPropertyCount(part, nullptr), 1U) << "the platform's GUID alone";
 }
 
 } // namespace

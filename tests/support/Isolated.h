@@ -8,8 +8,6 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-extern "C" void __gcov_dump() __attribute__((weak)); // there in a tree built for coverage
-
 namespace test {
 
 /// Runs a part of a test in a process of its own, for what the libraries read once per process and for what changes the
@@ -25,7 +23,6 @@ inline void isolated(const std::function<void()>& body) {
             ADD_FAILURE() << "an exception came out: " << exception.what();
         }
         std::fflush(nullptr);
-        if (__gcov_dump != nullptr) __gcov_dump();
         _exit(testing::Test::HasFailure() ? 1 : 0); // the parent's objects are not the child's to destroy
     }
     int status = 0;

@@ -5,6 +5,7 @@
 #include <cstdlib>
 #include <dlfcn.h>
 #include <mutex>
+#include <optional>
 #include <utility>
 
 namespace {
@@ -13,6 +14,8 @@ struct Calls {
     std::mutex mutex;
     std::vector<std::string> made;
     std::string refused;
+    std::string replaced;
+    std::string replacement;
 };
 
 Calls& calls() {
@@ -20,14 +23,20 @@ Calls& calls() {
     return one;
 }
 
-/// Keeps a call; whether the command may be started.
-bool keep(const std::string& how, const std::string& command) {
+/// Keeps a call: the command to start for it, or nothing where it cannot be started.
+std::optional<std::string> keep(const std::string& how, std::string command) {
     const std::lock_guard lock(calls().mutex);
     calls().made.push_back(how + ": " + command);
-    const std::string& refused = calls().refused;
-    if (refused.empty() || command.find(refused) == std::string::npos) return true;
-    errno = EMFILE;
-    return false;
+    const auto contains = [&](const std::string& text) {
+        return !text.empty() && command.find(text) != std::string::npos;
+    };
+    if (contains(calls().refused)) {
+        errno = EMFILE;
+        return std::nullopt;
+    }
+    const std::string& replaced = calls().replaced;
+    if (contains(replaced)) command.replace(command.find(replaced), replaced.size(), calls().replacement);
+    return command;
 }
 
 /// The C library's own function, which ours stands before.
@@ -40,12 +49,14 @@ Function* original(const char* name) {
 
 extern "C" FILE* popen(const char* command, const char* mode) {
     static const auto real = original<FILE*(const char*, const char*)>("popen");
-    return keep("popen " + std::string(mode), command) ? real(command, mode) : nullptr;
+    const auto started = keep("popen " + std::string(mode), command);
+    return started ? real(started->c_str(), mode) : nullptr;
 }
 
 extern "C" int system(const char* command) {
     static const auto real = original<int(const char*)>("system");
-    return keep("system", command) ? real(command) : -1;
+    const auto started = keep("system", command);
+    return started ? real(started->c_str()) : -1;
 }
 
 namespace test {
@@ -58,6 +69,12 @@ std::vector<std::string> takeShellCalls() {
 void refuseToStart(const std::string& text) {
     const std::lock_guard lock(calls().mutex);
     calls().refused = text;
+}
+
+void startInstead(const std::string& text, const std::string& replacement) {
+    const std::lock_guard lock(calls().mutex);
+    calls().replaced = text;
+    calls().replacement = replacement;
 }
 
 } // namespace test

@@ -13,4 +13,7 @@ std::vector<std::string> takeShellCalls();
 /// all can.
 void refuseToStart(const std::string& text);
 
+/// From now on `replacement` stands for `text` in every command that is started. After an empty text none is replaced.
+void startInstead(const std::string& text, const std::string& replacement);
+
 } // namespace test
