@@ -1,11 +1,33 @@
 #pragma once
 
-#include <charconv>
 #include <cstddef>
 #include <cstring>
+#include <initializer_list>
 #include <string_view>
 
 namespace VK {
+
+/// A number as a signed decimal, as these lines have always shown numbers: 4294967295 prints as -1.
+class SignedDecimal {
+public:
+    explicit SignedDecimal(unsigned int number) : first(digits + sizeof digits) {
+        const bool negative = static_cast<int>(number) < 0;
+        unsigned int rest = negative ? 0U - number : number;
+        do {
+            *--first = static_cast<char>('0' + rest % 10);
+            rest /= 10;
+        } while (rest != 0);
+        if (negative) *--first = '-';
+    }
+    SignedDecimal(const SignedDecimal&) = delete;
+    SignedDecimal& operator=(const SignedDecimal&) = delete;
+
+    operator std::string_view() const { return {first, static_cast<std::size_t>(digits + sizeof digits - first)}; }
+
+private:
+    char digits[11]; ///< of -2147483648
+    char* first;
+};
 
 /// Room for one formatted line: 511 characters, what goes beyond is cut. Trivial, so that it can be thread-local in a
 /// library that gets unloaded.
@@ -15,31 +37,15 @@ struct MessageBuffer {
     char text[size];
     std::size_t length;
 
+    /// Appends pieces: texts, views and numbers. Inline, so that a literal is appended with its length known: a few
+    /// moves instead of two calls.
+    template <class... Pieces>
+    __attribute__((always_inline)) MessageBuffer& add(const Pieces&... pieces) {
+        return append(view(pieces)...);
+    }
+
     MessageBuffer& start() {
         length = 0;
-        return *this;
-    }
-
-    /// Appends a text; null prints as printf prints it.
-    MessageBuffer& add(const char* part) { return add(textOrNull(part)); }
-
-    /// Inline, so that a literal is appended with its length known: a few moves instead of two calls.
-    MessageBuffer& add(std::string_view part) {
-        if (__builtin_expect(part.size() > room(), false)) return cut(part);
-        std::memcpy(text + length, part.data(), part.size());
-        length += part.size();
-        return *this;
-    }
-
-    /// Appends a number as a signed decimal, as these lines have always shown numbers: 4294967295 prints as -1.
-    MessageBuffer& addSigned(unsigned int number) {
-        constexpr std::size_t longest = 11; // -2147483648
-        char digits[longest];
-        char* const place = room() < longest ? digits : text + length;
-        const auto end = std::to_chars(place, place + longest, static_cast<int>(number)).ptr;
-        const auto written = static_cast<std::size_t>(end - place);
-        if (place == digits) return add({digits, written});
-        length += written;
         return *this;
     }
 
@@ -49,13 +55,29 @@ struct MessageBuffer {
         return text;
     }
 
-    /// A text as it is printed.
-    static std::string_view textOrNull(const char* part) { return part != nullptr ? part : "(null)"; }
-
 private:
-    std::size_t room() const { return size - 1 - length; }
+    /// Null prints as printf prints it.
+    static std::string_view view(const char* piece) { return piece != nullptr ? piece : "(null)"; }
+    static std::string_view view(std::string_view piece) { return piece; }
 
-    __attribute__((noinline, cold)) MessageBuffer& cut(std::string_view part) { return add(part.substr(0, room())); }
+    template <class... Views>
+    __attribute__((always_inline)) MessageBuffer& append(Views... views) {
+        if (__builtin_expect((views.size() + ...) < size - length, true)) {
+            (copy(views), ...);
+            return *this;
+        }
+        return cut({views...});
+    }
+
+    __attribute__((always_inline)) void copy(std::string_view piece) {
+        std::memcpy(text + length, piece.data(), piece.size());
+        length += piece.size();
+    }
+
+    __attribute__((noinline, cold)) MessageBuffer& cut(std::initializer_list<std::string_view> views) {
+        for (const std::string_view piece : views) copy(piece.substr(0, size - 1 - length));
+        return *this;
+    }
 };
 
 } // namespace VK

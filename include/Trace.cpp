@@ -78,7 +78,7 @@ void traceMethod(const TracePoint& at, int level) {
 }
 
 void traceMessage(const TracePoint& at, const char* message, int level) {
-    hand(at, level, trace(at.source.file, MessageBuffer::textOrNull(message), at.line, MESSAGE));
+    hand(at, level, trace(at.source.file, detail::textOrNull(message), at.line, MESSAGE));
 }
 
 void traceVariable(const TracePoint& at, const char* name, const char* value, int level) {

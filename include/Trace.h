@@ -37,36 +37,29 @@ namespace detail {
 inline MessageBuffer& format(MessageBuffer& buffer, std::string_view file, std::string_view function, unsigned int line,
                              MessageType type) {
     buffer.start();
+    const SignedDecimal number(line);
     switch (type) {
     case ENTERING:
+        return buffer.add("ENTERING: ", function, "() in ", file, " [Line: ", number, "]");
     case EXITING:
-        return buffer.add(type == ENTERING ? "ENTERING: " : "EXITING: ")
-            .add(function)
-            .add("() in ")
-            .add(file)
-            .add(" [Line: ")
-            .addSigned(line)
-            .add("]");
+        return buffer.add("EXITING: ", function, "() in ", file, " [Line: ", number, "]");
     case METHOD_INVOKED:
-        return buffer.add("METHOD: ")
-            .add(function)
-            .add("() was invoked in ")
-            .add(file)
-            .add(" [Line: ")
-            .addSigned(line)
-            .add("]");
+        return buffer.add("METHOD: ", function, "() was invoked in ", file, " [Line: ", number, "]");
     case MESSAGE: // the second argument is the message and stands last
-        return buffer.add("MESSAGE [File: ").add(file).add(", Line: ").addSigned(line).add("]: ").add(function);
+        return buffer.add("MESSAGE [File: ", file, ", Line: ", number, "]: ", function);
     }
     return buffer;
 }
 
-inline MessageBuffer& startVariable(MessageBuffer& buffer, const char* name) {
-    return buffer.start().add("VARIABLE: '").add(name).add("' has Value '");
+template <class Value>
+char* formatVariable(MessageBuffer& buffer, const char* name, const char* file, unsigned int line, const Value& value) {
+    buffer.start().add("VARIABLE: '", name, "' has Value '", value, "' at line ", SignedDecimal(line), " in ", file);
+    return buffer.finish();
 }
 
-inline char* finishVariable(MessageBuffer& buffer, const char* file, unsigned int line) {
-    return buffer.add("' at line ").addSigned(line).add(" in ").add(file).finish();
+/// A text as it is printed.
+inline std::string_view textOrNull(const char* text) {
+    return text != nullptr ? text : "(null)";
 }
 
 } // namespace detail
@@ -78,7 +71,7 @@ inline char* trace(std::string_view file, std::string_view function, unsigned in
 }
 
 inline char* trace(const char* file, const char* function, unsigned int line, MessageType type) {
-    return trace(MessageBuffer::textOrNull(file), MessageBuffer::textOrNull(function), line, type);
+    return trace(detail::textOrNull(file), detail::textOrNull(function), line, type);
 }
 
 /// The same, followed by a list of parameters.
@@ -86,24 +79,24 @@ inline char* tracepara(std::string_view file, std::string_view function, unsigne
                        MessageType type) {
     static thread_local MessageBuffer messageBuffer;
     detail::format(messageBuffer, file, function, line, type);
-    if (type <= MESSAGE) messageBuffer.add(",Parameters List: ").add(parameters);
+    if (type <= MESSAGE) messageBuffer.add(",Parameters List: ", parameters);
     return messageBuffer.finish();
 }
 
 inline char* tracepara(const char* file, const char* function, unsigned int line, const char* parameters,
                        MessageType type) {
-    return tracepara(MessageBuffer::textOrNull(file), MessageBuffer::textOrNull(function), line, parameters, type);
+    return tracepara(detail::textOrNull(file), detail::textOrNull(function), line, parameters, type);
 }
 
 /// A variable's value. The name comes first and the file second, unlike above; the value prints before the line.
 inline char* trace(const char* variable, const char* file, unsigned int line, const char* value) {
     static thread_local MessageBuffer messageBuffer;
-    return detail::finishVariable(detail::startVariable(messageBuffer, variable).add(value), file, line);
+    return detail::formatVariable(messageBuffer, variable, file, line, value);
 }
 
 inline char* trace(const char* variable, const char* file, unsigned int line, unsigned int value) {
     static thread_local MessageBuffer messageBuffer;
-    return detail::finishVariable(detail::startVariable(messageBuffer, variable).addSigned(value), file, line);
+    return detail::formatVariable(messageBuffer, variable, file, line, SignedDecimal(value));
 }
 
 // --- Handing lines to the logger.

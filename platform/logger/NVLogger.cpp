@@ -63,7 +63,11 @@ void writeToSyslog(const Event& event) noexcept {
     if (!line.failed()) syslog(priorityOf(event.level), "%s", line.text().data());
 }
 
-void write(const Settings& settings, const Event& event) noexcept {
+/// Out of line, so that a dropped line costs its caller nothing of this.
+__attribute__((noinline)) void write(Channel channel, const char* function, const char* file, int line,
+                                     const std::string& category, int level, const std::string& text) noexcept {
+    const Settings& settings = currentSettings();
+    const Event event = {channel, function, file, line, category, level, text};
     const CallerState state;
     if (writeToSink(settings, event)) return;
     if (event.channel == Channel::Log || settings.sink == Settings::Syslog || settings.traceInSyslog)
@@ -74,16 +78,13 @@ void write(const Settings& settings, const Event& event) noexcept {
 
 void NVLogger::logLevelMessage(const char* function, const char* file, int line, const std::string& category, int level,
                                char*, int, int, const std::string& text) {
-    const Settings& settings = currentSettings();
-    if (settings.keeps(Channel::Log, level))
-        write(settings, {Channel::Log, function, file, line, category, level, text});
+    if (currentSettings().keeps(Channel::Log, level)) write(Channel::Log, function, file, line, category, level, text);
 }
 
 void NVLogger::traceLevelMessage(const char* function, const char* file, int line, const std::string& category,
                                  int level, char*, int, int, const std::string& text) {
-    const Settings& settings = currentSettings();
-    if (settings.keeps(Channel::Trace, level))
-        write(settings, {Channel::Trace, function, file, line, category, level, text});
+    if (currentSettings().keeps(Channel::Trace, level))
+        write(Channel::Trace, function, file, line, category, level, text);
 }
 
 } // namespace NVLog

@@ -12,6 +12,7 @@ namespace NVLog {
 /// and makes no stream; the pool, and with it whatever is unused, goes when the library is unloaded.
 struct __attribute__((visibility("hidden"))) NVMessageBuffer::Storage : MessageText {
     static Pool<Storage> pool;
+    std::atomic<bool>* taken = nullptr;
 };
 
 Pool<NVMessageBuffer::Storage> NVMessageBuffer::Storage::pool;
@@ -22,7 +23,7 @@ NVMessageBuffer::NVMessageBuffer() : storage(Storage::pool.take()) {
 
 NVMessageBuffer::~NVMessageBuffer() {
     storage->reset();
-    if (!Storage::pool.give(storage)) delete storage;
+    Storage::pool.give(storage);
 }
 
 NVMessageBuffer& NVMessageBuffer::operator<<(const char* text) {

@@ -12,6 +12,8 @@ namespace NVLog {
 /// Objects that wait to be used, for all threads, without locks: one takes any that nobody uses and gives it back, or
 /// finds none and makes its own. Taking costs one atomic exchange, giving back a store. The objects go with the pool,
 /// but for those in use then, which stay for good: threads may log while the process ends.
+///
+/// An Object knows where it was taken from: its `std::atomic<bool>* taken`, null for one that came from elsewhere.
 template <typename Object>
 class Pool {
 public:
@@ -25,19 +27,18 @@ public:
         return nullptr;
     }
 
-    /// False for an object that did not come from here.
-    bool give(Object* object) noexcept {
-        const auto address = reinterpret_cast<std::uintptr_t>(object);
-        const auto start = reinterpret_cast<std::uintptr_t>(places.data());
-        if (address < start || address >= start + sizeof places) return false;
-        places[(address - start) / sizeof(Place)].taken.store(false, std::memory_order_release);
-        return true;
+    /// Deletes an object that did not come from a pool.
+    static void give(Object* object) noexcept {
+        if (object->taken != nullptr)
+            object->taken->store(false, std::memory_order_release);
+        else
+            delete object;
     }
 
 private:
     /// On cache lines of its own, so that threads do not slow each other down.
     struct alignas(64) Place {
-        Place() : object() {}
+        Place() : object() { object.taken = &taken; }
         ~Place() {
             if (!taken.exchange(true)) object.~Object();
         }

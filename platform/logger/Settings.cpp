@@ -1,7 +1,6 @@
 #include "logger/Settings.h"
 
 #include <algorithm>
-#include <atomic>
 #include <charconv>
 #include <cstdlib>
 #include <pthread.h>
@@ -75,13 +74,10 @@ void setChannels(Settings& settings, std::string_view list) noexcept {
     settings.traceInSyslog = trace;
 }
 
-Settings theSettings;
-std::atomic<bool> settingsAreRead{false};
-
 void readEnvironment() {
-    theSettings =
+    knownSettings.settings =
         parseSettings(secure_getenv("NVLOG_SINK"), secure_getenv("NVLOG_LEVELS"), secure_getenv("NVLOG_CHANNELS"));
-    settingsAreRead.store(true, std::memory_order_release);
+    knownSettings.known.store(true, std::memory_order_release);
 }
 
 } // namespace
@@ -95,12 +91,13 @@ Settings parseSettings(const char* sink, const char* levels, const char* channel
     return settings;
 }
 
-const Settings& currentSettings() noexcept {
-    if (settingsAreRead.load(std::memory_order_acquire)) return theSettings;
+KnownSettings knownSettings;
+
+const Settings& readSettings() noexcept {
     // Other than a static local's guard, this is right also in the child of a fork in the middle of it.
     static pthread_once_t once = PTHREAD_ONCE_INIT;
     pthread_once(&once, &readEnvironment);
-    return theSettings;
+    return knownSettings.settings;
 }
 
 } // namespace NVLog

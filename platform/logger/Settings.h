@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <atomic>
 #include <climits>
 #include <cstddef>
 
@@ -39,8 +40,19 @@ struct Settings {
 /// More than MAX_LEVELS levels keep all.
 Settings parseSettings(const char* sink, const char* levels, const char* channels) noexcept;
 
+/// This process's settings, once they are read.
+struct KnownSettings {
+    std::atomic<bool> known{false};
+    Settings settings;
+};
+extern KnownSettings knownSettings;
+
+const Settings& readSettings() noexcept;
+
 /// This process's settings, read from the environment by the first caller.
-const Settings& currentSettings() noexcept;
+inline const Settings& currentSettings() noexcept {
+    return knownSettings.known.load(std::memory_order_acquire) ? knownSettings.settings : readSettings();
+}
 
 } // namespace NVLog
 

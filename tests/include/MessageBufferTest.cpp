@@ -9,14 +9,19 @@ namespace {
 
 TEST(MessageBuffer, PrintsNumbersAsSignedDecimals) {
     VK::MessageBuffer buffer{};
-    EXPECT_STREQ(buffer.start().addSigned(0).add(" ").addSigned(2147483647U).add(" ").addSigned(2147483648U).finish(),
-                 "0 2147483647 -2147483648");
-    EXPECT_STREQ(buffer.start().addSigned(UINT_MAX).finish(), "-1");
+    const auto printed = [&](unsigned int number) {
+        return std::string(buffer.start().add(VK::SignedDecimal(number)).finish());
+    };
+    EXPECT_EQ(printed(0), "0");
+    EXPECT_EQ(printed(10), "10");
+    EXPECT_EQ(printed(2147483647U), "2147483647");
+    EXPECT_EQ(printed(2147483648U), "-2147483648");
+    EXPECT_EQ(printed(UINT_MAX), "-1");
 }
 
 TEST(MessageBuffer, PrintsANullTextAsPrintfDoes) {
     VK::MessageBuffer buffer{};
-    EXPECT_STREQ(buffer.start().add("<").add(nullptr).add(">").finish(), "<(null)>");
+    EXPECT_STREQ(buffer.start().add("<", static_cast<const char*>(nullptr), ">").finish(), "<(null)>");
 }
 
 TEST(MessageBuffer, CutsAt511Characters) {
