@@ -32,6 +32,21 @@ TEST(MessageBuffer, CutsAt511Characters) {
     EXPECT_EQ(buffer.text[511], '\0');
 }
 
+TEST(MessageBuffer, TakesALineThatJustFillsIt) {
+    VK::MessageBuffer buffer{};
+    for (const std::size_t length : {510U, 511U, 512U}) {
+        const std::string text(length, 'x');
+        EXPECT_EQ(std::string(buffer.start().add(text.c_str()).finish(), 512),
+                  std::string(511, 'x').substr(0, length) + std::string(length < 511 ? 2 : 1, '\0'));
+    }
+}
+
+TEST(MessageBuffer, CutsWithinAPieceAndDropsTheRest) {
+    VK::MessageBuffer buffer{};
+    const std::string text(509, 'x');
+    EXPECT_EQ(std::string(buffer.start().add(text.c_str(), VK::SignedDecimal(123), "end").finish()), text + "12");
+}
+
 TEST(MessageBuffer, LeavesNothingOfALongerLineBehind) {
     VK::MessageBuffer buffer{};
     buffer.start().add(std::string(600, 'x').c_str()).finish();
