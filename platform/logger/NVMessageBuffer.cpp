@@ -12,7 +12,7 @@ namespace NVLog {
 /// and makes no stream; the pool, and with it whatever is unused, goes when the library is unloaded.
 struct __attribute__((visibility("hidden"))) NVMessageBuffer::Storage : MessageText {
     static Pool<Storage> pool;
-    std::atomic<bool>* taken = nullptr;
+    std::atomic<bool>* free = nullptr;
 };
 
 Pool<NVMessageBuffer::Storage> NVMessageBuffer::Storage::pool;

@@ -11,9 +11,10 @@ namespace NVLog {
 
 /// Objects that wait to be used, for all threads, without locks: one takes any that nobody uses and gives it back, or
 /// finds none and makes its own. Taking costs one atomic exchange, giving back a store. The objects go with the pool,
-/// but for those in use then, which stay for good: threads may log while the process ends.
+/// but for those in use then, which stay for good: threads may log while the process ends. Before the pool is made
+/// there is nothing to take: other objects' constructors may log.
 ///
-/// An Object knows where it was taken from: its `std::atomic<bool>* taken`, null for one that came from elsewhere.
+/// An Object knows where it goes back to: its `std::atomic<bool>* free`, null for one that came from elsewhere.
 template <typename Object>
 class Pool {
 public:
@@ -21,7 +22,7 @@ public:
         const std::size_t first = firstPlace();
         for (std::size_t i = 0; i < places.size(); ++i) {
             Place& place = places[(first + i) % places.size()];
-            if (!place.taken.load(std::memory_order_relaxed) && !place.taken.exchange(true, std::memory_order_acquire))
+            if (place.free.load(std::memory_order_relaxed) && place.free.exchange(false, std::memory_order_acquire))
                 return &place.object;
         }
         return nullptr;
@@ -29,8 +30,8 @@ public:
 
     /// Deletes an object that did not come from a pool.
     static void give(Object* object) noexcept {
-        if (object->taken != nullptr)
-            object->taken->store(false, std::memory_order_release);
+        if (object->free != nullptr)
+            object->free->store(true, std::memory_order_release);
         else
             delete object;
     }
@@ -38,14 +39,17 @@ public:
 private:
     /// On cache lines of its own, so that threads do not slow each other down.
     struct alignas(64) Place {
-        Place() : object() { object.taken = &taken; }
+        Place() : object() {
+            object.free = &free;
+            free.store(true, std::memory_order_release);
+        }
         ~Place() {
-            if (!taken.exchange(true)) object.~Object();
+            if (free.exchange(false)) object.~Object();
         }
         Place(const Place&) = delete;
         Place& operator=(const Place&) = delete;
 
-        std::atomic<bool> taken{false};
+        std::atomic<bool> free{false};
         union {
             Object object;
         };
