@@ -1,4 +1,5 @@
 #include "include/Trace.h"
+#include "support/Allocations.h"
 #include "support/SimulatedHost.h"
 
 #include <gmock/gmock.h>
@@ -150,6 +151,21 @@ TEST(TraceLines, CarryTheLevelAskedFor) {
     EXPECT_THAT(lines[0], StartsWith("LOG 6000 Norvane.BaseServerProvider Sample "));
     EXPECT_THAT(lines[0], EndsWith("]: failed"));
     EXPECT_THAT(lines[2], StartsWith("LOG 4000 Norvane.BaseServerProvider Sample "));
+}
+
+TEST(Trace, CostsNoMemoryAllocationALine) {
+    const int object = 5;
+    const auto lines = [&object] {
+        const TraceScope scope(source);
+        const ParameterTraceScope parameters(source, " object=", &object, " number=", 7U);
+        traceVariable(source, "name", "a value that is longer than a short string is inside");
+        traceMessage(source, "a message that is longer than a short string is inside", DebugLevel);
+    };
+    lines(); // the first of a thread makes what the others use
+    EXPECT_EQ(support::allocationsDuring([&] {
+                  for (int i = 0; i < 100; ++i) lines();
+              }),
+              0U);
 }
 
 } // namespace
