@@ -101,12 +101,23 @@ std::vector<Case> cases(bool live) {
 /// Mean nanoseconds of the cases measured so far, by name.
 using Means = std::map<std::string, double>;
 
+/// A host need not have an element of every class: such a case is left out, and said to be.
+std::optional<Prepared> prepare(benchmark::State& state, Bench& bench, const Case& measured) {
+    try {
+        return std::optional<Prepared>(std::in_place, bench, measured);
+    } catch (const std::exception& exception) {
+        state.SkipWithError(exception.what());
+        return std::nullopt;
+    }
+}
+
 void measure(benchmark::State& state, Bench& bench, const Case& measured, Means& means) {
-    Prepared prepared(bench, measured);
+    std::optional<Prepared> prepared = prepare(state, bench, measured);
+    if (!prepared) return;
     std::chrono::nanoseconds sum{0};
     for (auto iteration : state) {
         static_cast<void>(iteration);
-        const auto elapsed = prepared.run();
+        const auto elapsed = prepared->run();
         if (!elapsed) {
             state.SkipWithError("the answer changed");
             return;
