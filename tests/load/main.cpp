@@ -1,4 +1,5 @@
 #include "load/Requests.h"
+#include "load/Resources.h"
 #include "load/Runs.h"
 
 #include <cstdio>
@@ -60,6 +61,9 @@ Options parse(int count, char** words) {
 void run(const Options& options) {
     const std::string& library = options.texts.at("--library");
     const std::string& sink = options.texts.at("--log");
+    if (options.mode != "threads" && load::memoryTells() && !load::heapTells())
+        std::printf("%s: the heap is not checked, for GLIBC_TUNABLES is set without glibc.malloc.tcache_count=0\n",
+                    options.mode.c_str());
     load::makeHost(!sink.empty() ? sink : options.mode == "soak" ? "none" : "file:/dev/null");
     if (options.mode == "threads")
         load::runThreads(library, options.number("--threads"), options.number("--seconds"));
