@@ -1,4 +1,5 @@
-// The host's files change while they are read: they vanish, shrink, grow and are replaced. Nobody locks them.
+// The host's files change while they are read: they vanish, shrink, grow and are replaced. Nobody locks them. What is
+// read is what stood there at some time, or nothing; and all of that is read some time.
 #include "instrumentation/HardwareFacts.h"
 #include "instrumentation/HostState.h"
 #include "instrumentation/SimulatedHost.h"
@@ -8,10 +9,14 @@
 #include <gmock/gmock.h>
 
 #include <atomic>
+#include <chrono>
+#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <functional>
+#include <set>
 #include <thread>
+#include <utmp.h>
 
 namespace VK::Inside {
 
@@ -20,7 +25,11 @@ namespace {
 using support::SmbiosChassisImage;
 using support::SmbiosImage;
 using support::SmbiosSystemImage;
+using testing::AllOf;
 using testing::AnyOf;
+using testing::Contains;
+using testing::Ge;
+using testing::Le;
 
 /// Does one after the other of these things to the files, again and again, until it is destroyed.
 class Churn {
@@ -37,8 +46,19 @@ public:
         thread.join();
     }
 
-    /// Whether everything has been done often enough while somebody read.
-    bool isEnough() const { return done >= 50; }
+    /// Reads until everything has been done often enough and every one of these answers has come, which is waited for;
+    /// no other may come.
+    template <class Answer, class Read>
+    void expectOnly(const std::set<Answer>& answers, const Read& read) const {
+        const auto end = std::chrono::steady_clock::now() + std::chrono::minutes(1);
+        std::set<Answer> seen;
+        while ((done < 50 || seen != answers) && std::chrono::steady_clock::now() < end) {
+            const Answer answer = read();
+            ASSERT_THAT(answers, Contains(answer));
+            seen.insert(answer);
+        }
+        EXPECT_EQ(seen, answers);
+    }
 
 private:
     std::atomic<bool> ended{false};
@@ -71,13 +91,15 @@ TEST(ChangingFiles, OfTheFirmwareGiveWholeTextsOrNone) {
                        [&] { machine("SECOND", 60).writeTo(host); }, [&] { append(table, std::string(100000, 'x')); },
                        [&] { std::filesystem::remove(table); }, [&] { machine("FIRST", 200).writeTo(host); },
                        [&] { cut(entryPoint, 7); }, [&] { std::filesystem::remove(entryPoint); }});
-    while (!churn.isEnough()) {
+    std::size_t mostChassis = 0;
+    churn.expectOnly<std::string>({"", "FIRST", "SECOND"}, [&] {
         const HardwareFacts facts = readHardware(Root(host.path()));
-        EXPECT_THAT(facts.serial.text, AnyOf("", "FIRST", "SECOND"));
-        EXPECT_LE(facts.chassis.size(), 200u);
+        mostChassis = std::max(mostChassis, facts.chassis.size());
         for (const ChassisFacts& chassis : facts.chassis)
             EXPECT_THAT(chassis.serial.text, AnyOf("", "FIRST", "SECOND"));
-    }
+        return facts.serial.text;
+    });
+    EXPECT_THAT(mostChassis, AllOf(Ge(1u), Le(200u)));
 }
 
 TEST(ChangingFiles, OfTheZoneAreOneZoneOrUtc) {
@@ -86,9 +108,10 @@ TEST(ChangingFiles, OfTheZoneAreOneZoneOrUtc) {
     const std::string kolkata = host.read("usr/share/zoneinfo/Asia/Kolkata");
     const Churn churn({[&] { host.write("etc/localtime", kolkata); }, [&] { cut(zone, 50); }, [&] { cut(zone, 0); },
                        [&] { append(zone, kolkata); }, [&] { host.remove("etc/localtime"); },
+                       [&] { host.write("etc/localtime", makeZoneFile(-210)); }, [&] { host.remove("etc/localtime"); },
                        [&] { host.link("/usr/share/zoneinfo/Asia/Kolkata", "etc/localtime"); },
                        [&] { host.remove("etc/localtime"); }});
-    while (!churn.isEnough()) EXPECT_THAT(offsetInForce(Root(host.path())), AnyOf(0, 330));
+    churn.expectOnly<int>({0, 330, -210}, [&] { return offsetInForce(Root(host.path())); });
 }
 
 TEST(ChangingFiles, OfASimulatedHostAreOneOfItsTreesOrNone) {
@@ -100,15 +123,120 @@ TEST(ChangingFiles, OfASimulatedHostAreOneOfItsTreesOrNone) {
                        [&] { folder.write("tree.json", two); }, [&] { append(file, std::string(70000, ' ') + "x"); },
                        [&] { std::filesystem::remove(file); }});
     SimulatedHost host(file);
-    while (!churn.isEnough()) {
+    churn.expectOnly<Value>({Value(""), Value("one"), Value("two")}, [&] {
         const auto tree = host.tree();
         const NodeTree::Place place = tree->find("/c");
-        if (place.node == nullptr) continue;
-        const auto name = host.read(*place.node, 108);
-        if (!name) continue;
-        EXPECT_THAT(*name, AnyOf(Value("one"), Value("two")));
-    }
+        return place.node != nullptr ? host.read(*place.node, 108).value_or("nameless") : Value("");
+    });
     folder.write("tree.json", one);
+}
+
+/// Puts a file in the place of another at one stroke, as system tools do.
+void exchange(const support::TemporaryDirectory& host, const std::string& name, const std::string& bytes) {
+    host.write(name + ".new", bytes);
+    std::filesystem::rename(host.path(name + ".new"), host.path(name));
+}
+
+std::function<void()> exchanging(const support::TemporaryDirectory& host, const char* name, const std::string& bytes) {
+    return [&host, name, bytes] { exchange(host, name, bytes); };
+}
+
+std::function<void()> removing(const support::TemporaryDirectory& host, const char* name) {
+    return [&host, name] { std::filesystem::remove_all(host.path(name)); };
+}
+
+std::function<void()> emptying(const support::TemporaryDirectory& host, const char* name) {
+    return [&host, name] { cut(host.path(name), 0); };
+}
+
+TEST(ChangingFiles, OfMemoryControllersTellErrorsOnlyWhereTheyAreCounted) {
+    const char* const count = "sys/devices/system/edac/mc/mc1/ue_count";
+    const support::TemporaryDirectory host;
+    const auto read = [&] { return hasUncorrectableMemoryErrors(Root(host.path())); };
+    const auto none = exchanging(host, count, "0\n");
+    const auto gone = removing(host, "sys/devices/system/edac/mc/mc1");
+    {
+        const Churn churn({none, exchanging(host, count, "12\n"), emptying(host, count), gone});
+        churn.expectOnly<bool>({false, true}, read);
+    }
+    none();
+    const Churn churn({none, emptying(host, count), gone, exchanging(host, count, "00000\n")});
+    churn.expectOnly<bool>({false}, read);
+}
+
+TEST(ChangingFiles, OfTheHostsNameAreOneNameOrNone) {
+    const char* const file = "etc/hostname";
+    const support::TemporaryDirectory host;
+    const Churn churn({exchanging(host, file, "node7\n"), emptying(host, file),
+                       exchanging(host, file, "# " + std::string(9000, '-') + "\na-much-longer-name.example\n"),
+                       removing(host, file)});
+    churn.expectOnly<std::string>({"", "node7", "a-much-longer-name.example"},
+                                  [&] { return hostName(Root(host.path())).value_or(""); });
+}
+
+std::string runLevel(char level) {
+    utmp entry{};
+    entry.ut_type = RUN_LVL;
+    entry.ut_pid = level;
+    std::string bytes(sizeof entry, '\0');
+    std::memcpy(bytes.data(), &entry, sizeof entry);
+    return bytes;
+}
+
+TEST(ChangingFiles, OfShutdownsTellOneOnlyWhereItIsDue) {
+    const char* const utmpFile = "run/utmp";
+    const char* const scheduled = "run/systemd/shutdown/scheduled";
+    const support::TemporaryDirectory host;
+    const auto read = [&] { return powerState(Root(host.path())); };
+    const auto normal = exchanging(host, utmpFile, runLevel('5'));
+    const auto halfARecord = [&] { append(host.path(utmpFile), runLevel('6').substr(0, 100)); };
+    const auto dryRun = exchanging(host, scheduled, "USEC=1\nMODE=dry-reboot\n");
+    {
+        const Churn churn({normal, exchanging(host, utmpFile, runLevel('5') + runLevel('0')), emptying(host, utmpFile),
+                           removing(host, utmpFile)});
+        churn.expectOnly<unsigned int>({1, 16}, read);
+    }
+    exchange(host, utmpFile, runLevel('5'));
+    {
+        const Churn churn({dryRun, exchanging(host, scheduled, "USEC=1\nMODE=reboot\n"), emptying(host, scheduled),
+                           removing(host, scheduled)});
+        churn.expectOnly<unsigned int>({1, 16}, read);
+    }
+    exchange(host, scheduled, "USEC=1\nMODE=dry-reboot\n");
+    const Churn churn({normal, halfARecord, emptying(host, utmpFile), dryRun, emptying(host, scheduled),
+                       removing(host, utmpFile), removing(host, scheduled)});
+    churn.expectOnly<unsigned int>({1}, read);
+}
+
+/// More than what is read at once, so that the last line comes from a later read than the others.
+std::string sysinfo(const std::string& maker, const std::string& type, const std::string& serial) {
+    return "Manufacturer: " + maker + "\nType: " + type + "\nComment: " + std::string(9000, '-') +
+           "\nSequence Code: " + serial + "\n";
+}
+
+TEST(ChangingFiles, OfSystemInformationGiveTheFactsOfOneSystem) {
+    using Facts = std::array<std::string, 3>;
+    const char* const file = "proc/sysinfo";
+    const support::TemporaryDirectory host;
+    const Churn churn({exchanging(host, file, sysinfo("Veska", "2964", "FIRST")), removing(host, file),
+                       exchanging(host, file, sysinfo("Another maker", "3906 model B", "SECOND")),
+                       removing(host, file)});
+    churn.expectOnly<Facts>({{"", "", ""}, {"Veska", "2964", "FIRST"}, {"Another maker", "3906 model B", "SECOND"}},
+                            [&] {
+                                const HardwareFacts facts = readHardware(Root(host.path()));
+                                return Facts{facts.manufacturer.text, facts.model.text, facts.serial.text};
+                            });
+}
+
+TEST(ChangingFiles, OfADeviceTreeGiveWholeTextsOrNone) {
+    const char* const model = "proc/device-tree/model";
+    const std::string zero(1, '\0');
+    const support::TemporaryDirectory host;
+    const Churn churn({exchanging(host, model, "Board" + zero), emptying(host, model),
+                       exchanging(host, model, "Another board" + zero + "rest" + zero), removing(host, model),
+                       [&] { std::filesystem::create_directories(host.path(model)); }, removing(host, model)});
+    churn.expectOnly<std::string>({"", "Board", "Another board"},
+                                  [&] { return readHardware(Root(host.path())).model.text; });
 }
 
 } // namespace
