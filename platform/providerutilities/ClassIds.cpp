@@ -17,6 +17,7 @@ bool isDerivedFrom(const CMPIBroker* broker, const std::string& nameSpace, const
     if (path == nullptr) return false;
     CMPIStatus status = Cmpi::freshStatus();
     const CMPIBoolean isA = broker->eft->classPathIsA(broker, path, base, &status);
+    Cmpi::noteUntold("areClassesRelated", __LINE__, "whether a class is derived from another", status);
     return Cmpi::succeeded(status) && isA != 0;
 }
 
@@ -26,7 +27,11 @@ unsigned short ProviderUtilities::getClassId(const CMPIObjectPath* objectPath) {
     if (!Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getClassName)) return CLASS_ID_UNKNOWN;
     CMPIStatus status = Cmpi::freshStatus();
     const CMPIString* const name = objectPath->ft->getClassName(objectPath, &status);
-    return Cmpi::succeeded(status) ? findClassId(Cmpi::textOf(name)) : CLASS_ID_UNKNOWN;
+    const char* const text = Cmpi::succeeded(status) ? Cmpi::textOf(name, status) : nullptr;
+    if (text != nullptr) return findClassId(text);
+    if (Cmpi::succeeded(status) || Cmpi::isAbsent(status)) status.rc = CMPI_RC_ERR_FAILED; // every path has a class
+    Cmpi::noteUntold("getClassId", __LINE__, "the class of a path", status);
+    return CLASS_ID_UNKNOWN;
 }
 
 unsigned short ProviderUtilities::getClassId(const char* className) {

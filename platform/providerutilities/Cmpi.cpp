@@ -8,14 +8,39 @@
 
 namespace VK::Cmpi {
 
+namespace {
+
+std::string withCode(const std::string& text, const CMPIStatus& status) {
+    return text + ", return code " + std::to_string(static_cast<int>(status.rc));
+}
+
+std::string untold(const char* what, const CMPIStatus& status) {
+    return withCode(std::string("The broker could not tell ") + what, status);
+}
+
+void logFailure(const char* function, int line, const std::string& text) {
+    try {
+        NVLog::NVLogger::logLevelMessage(function, "ProviderUtilities", line, "Norvane.ProviderUtilities", 6000,
+                                         nullptr, 0, 0, text);
+    } catch (const abi::__forced_unwind&) { // a cancelled thread
+        throw;
+    } catch (...) { // NOLINT(bugprone-empty-catch): another logger's failure is no reason to fail
+    }
+}
+
+} // namespace
+
 bool hasValue(const CMPIData& data, const CMPIStatus& status) {
     return succeeded(status) && (data.state & (CMPI_nullValue | CMPI_notFound | CMPI_badValue)) == 0;
 }
 
 void requireTold(const CMPIStatus& status, const char* what) {
     if (succeeded(status) || isAbsent(status)) return;
-    throw std::runtime_error(std::string("The broker could not tell ") + what + ", return code " +
-                             std::to_string(static_cast<int>(status.rc)));
+    throw std::runtime_error(untold(what, status));
+}
+
+void noteUntold(const char* function, int line, const char* what, const CMPIStatus& status) {
+    if (!succeeded(status) && !isAbsent(status)) logFailure(function, line, untold(what, status));
 }
 
 const char* textOf(const CMPIString* string, CMPIStatus& status) {
@@ -52,15 +77,8 @@ const CMPIValue* asChars(const char* text) {
 }
 
 bool refused(const char* function, int line, const std::string& what, const char* name, const CMPIStatus& status) {
-    const std::string text = "The broker refused " + what + " " + (name != nullptr ? name : "(null)") +
-                             ", return code " + std::to_string(static_cast<int>(status.rc));
-    try {
-        NVLog::NVLogger::logLevelMessage(function, "ProviderUtilities", line, "Norvane.ProviderUtilities", 6000,
-                                         nullptr, 0, 0, text);
-    } catch (const abi::__forced_unwind&) { // a cancelled thread
-        throw;
-    } catch (...) { // NOLINT(bugprone-empty-catch): another logger's failure is no reason to fail
-    }
+    logFailure(function, line,
+               withCode("The broker refused " + what + " " + (name != nullptr ? name : "(null)"), status));
     return false;
 }
 

@@ -57,6 +57,10 @@ const char* textOf(const CMPIData& data);
 /// How a text is handed to a slot with the type CMPI_chars: as itself, not as a value that points to it.
 const CMPIValue* asChars(const char* text);
 
+/// Logs at level 6000 that the broker could not tell `what`, where that is taken for its absence. Nothing for a status
+/// that says success or absence.
+void noteUntold(const char* function, int line, const char* what, const CMPIStatus& status);
+
 /// Logs at level 6000 that the broker refused something, and is false.
 bool refused(const char* function, int line, const std::string& what, const char* name, const CMPIStatus& status);
 

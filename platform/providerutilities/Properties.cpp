@@ -13,6 +13,7 @@ bool read(const Object* object, Slot Table::*slot, const char* name, CMPIType ty
     if (name == nullptr || !Cmpi::hasSlot(object, slot)) return false;
     CMPIStatus status = Cmpi::freshStatus();
     const CMPIData data = (object->ft->*slot)(object, name, &status);
+    Cmpi::noteUntold("getProperty", __LINE__, "a value that a request brings", status);
     if (!Cmpi::hasValue(data, status) || data.type != type) return false;
     value = static_cast<Value>(data.value.*member);
     return true;

@@ -1,17 +1,24 @@
 #include "vk/ProviderUtilities.h"
 
 #include "platform/providerutilities/FakeBroker.h"
+#include "platform/providerutilities/RecordedLog.h"
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
+using testing::ElementsAre;
+using testing::IsEmpty;
 using VK::ProviderUtilities;
 
 namespace {
 
 constexpr unsigned short UNKNOWN = ProviderUtilities::CLASS_ID_UNKNOWN;
+const std::string UNTOLD = "LOG 6000 Norvane.ProviderUtilities The broker could not tell ";
 
 class ClassIds : public testing::Test {
 protected:
+    ClassIds() { takeLog(); }
+    ~ClassIds() override { EXPECT_THAT(takeLog(), IsEmpty()); }
+
     unsigned short idOf(const std::string& name) {
         const unsigned short id = ProviderUtilities::getClassId(name.c_str());
         EXPECT_EQ(ProviderUtilities::getClassId(fake.makePath("root/cimv2", name)), id);
@@ -28,7 +35,10 @@ protected:
                      {"VESKA_ComputerCapabilities", "CIM_ElementCapabilities"},
                      {"VESKA_Special", "VESKA_ComputerCapabilities"},
                      {"CIM_System", ""}};
+        takeLog();
     }
+    ~ClassRelations() override { EXPECT_THAT(takeLog(), IsEmpty()); }
+
     bool related(const char* one, const char* other) {
         return ProviderUtilities::areClassesRelated(fake.get(), "root/cimv2", one, other);
     }
@@ -67,13 +77,17 @@ TEST_F(ClassIds, AreUnknownWithoutAName) {
 
 TEST_F(ClassIds, AreUnknownWhereTheBrokerDoesNotTellTheName) {
     const CMPIObjectPath* const path = fake.makePath("root/cimv2", "VESKA_ComputerSystem");
-    fake.refusals = {{"getClassName", CMPI_RC_ERR_FAILED}};
-    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
-    fake.refusals = {{"getCharPtr", CMPI_RC_ERR_FAILED}};
-    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    for (const char* const slot : {"getClassName", "getCharPtr"}) {
+        for (const CMPIrc code : {CMPI_RC_ERR_FAILED, CMPI_RC_ERR_NOT_FOUND}) {
+            fake.refusals = {{slot, code}};
+            EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+            EXPECT_THAT(takeLog(), ElementsAre(UNTOLD + "the class of a path, return code 1")) << slot << code;
+        }
+    }
     fake.refusals = {};
     fake.nullAnswers = {"getClassName"};
     EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    EXPECT_THAT(takeLog(), ElementsAre(UNTOLD + "the class of a path, return code 1"));
     fake.nullAnswers = {};
     fake.writesStatus = false;
     EXPECT_EQ(ProviderUtilities::getClassId(path), 1);
@@ -112,11 +126,17 @@ TEST_F(ClassRelations, DoNotHoldWhereTheBrokerDoesNotAnswer) {
     EXPECT_FALSE(ProviderUtilities::areClassesRelated(nullptr, "root/cimv2", name, name));
     fake.refusals = {{"classPathIsA", CMPI_RC_ERR_FAILED}};
     EXPECT_FALSE(related(name, name));
+    const std::string untold = UNTOLD + "whether a class is derived from another, return code 1";
+    EXPECT_THAT(takeLog(), ElementsAre(untold, untold)) << "one for each direction";
+    fake.refusals = {{"classPathIsA", CMPI_RC_ERR_NOT_FOUND}};
+    EXPECT_FALSE(related(name, name));
+    EXPECT_THAT(takeLog(), IsEmpty()) << "a class that is not there is related to none";
     fake.refusals = {{"newObjectPath", CMPI_RC_ERR_INVALID_NAMESPACE}};
     EXPECT_FALSE(related(name, name));
     fake.refusals = {};
     fake.nullAnswers = {"newObjectPath"};
     EXPECT_FALSE(related(name, name));
+    EXPECT_EQ(takeLog().size(), 4U) << "one for each path that was refused";
     fake.nullAnswers = {};
     EXPECT_TRUE(related(name, name));
     fake.encapsulated.classPathIsA = nullptr;

@@ -1,9 +1,12 @@
 #include "vk/ProviderUtilities.h"
 
 #include "platform/providerutilities/FakeBroker.h"
+#include "platform/providerutilities/RecordedLog.h"
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
+using testing::ElementsAre;
+using testing::IsEmpty;
 using VK::ProviderUtilities;
 
 namespace {
@@ -20,7 +23,9 @@ protected:
         add("S32", CMPI_sint32, &CMPIValue::sint32, 5);
         fake.put(entries(instance), "Null", nullptr, CMPI_uint16);
         fake.put(entries(arguments), "Null", nullptr, CMPI_uint32);
+        takeLog();
     }
+    ~Properties() override { EXPECT_THAT(takeLog(), IsEmpty()) << "where nothing failed"; }
 
     template <typename Object>
     static std::vector<FakeBroker::Entry>& entries(const Object* object) {
@@ -79,8 +84,17 @@ TEST_F(Properties, OfAnotherTypeAreAbsent) {
 
 TEST_F(Properties, AreAbsentWhereTheBrokerFails) {
     fake.refusals = {{"getProperty", CMPI_RC_ERR_FAILED}, {"getArg", CMPI_RC_ERR_FAILED}};
+    const std::string untold = "LOG 6000 Norvane.ProviderUtilities The broker could not tell a value that a request "
+                               "brings, return code 1";
     EXPECT_EQ(getUint16("U16"), -1);
+    EXPECT_THAT(takeLog(), ElementsAre(untold));
     EXPECT_EQ(getUint32("U32"), -1);
+    EXPECT_THAT(takeLog(), ElementsAre(untold));
+    for (const CMPIrc absence : {CMPI_RC_ERR_NO_SUCH_PROPERTY, CMPI_RC_ERR_NOT_FOUND}) {
+        fake.refusals = {{"getProperty", absence}};
+        EXPECT_EQ(getUint16("U16"), -1);
+        EXPECT_THAT(takeLog(), IsEmpty());
+    }
     fake.refusals = {};
     fake.writesStatus = false;
     EXPECT_EQ(getUint16("U16"), 65535);
