@@ -33,9 +33,10 @@ public:
         if (requestedClassId == ProviderUtilities::CLASS_ID_UNKNOWN) return nullptr;
         if (!computer || !partner) return nullptr;
         CMPIObjectPath* const computerPath = computer.getObjectPath();
+        if (computerPath == nullptr) return nullptr; // what was refused is logged
         CMPIObjectPath* const partnerPath = partner.getObjectPath();
-        if (computerPath == nullptr || partnerPath == nullptr) return nullptr; // what was refused is logged
-        CMPIObjectPath* path = createPath(Self::className);
+        if (partnerPath == nullptr) return nullptr;
+        CMPIObjectPath* path = keylessPath(Self::className);
         if (path == nullptr) return nullptr;
         for (const char* role : roles())
             if (!ProviderUtilities::setKeyProperty(path, role, role == Self::computerRole ? computerPath : partnerPath))
@@ -82,22 +83,33 @@ protected:
           computer(theBroker, context, nameSpace) {}
     ~AssociationAdapter() = default;
 
-    /// A new path of `className` without keys. Throws InstrumentationException when the broker makes none.
-    CMPIObjectPath* keylessPath(const char* className) const { return required(createPath(className)); }
+    /// A new path of `className` without keys; null when the broker makes none.
+    CMPIObjectPath* keylessPath(const char* className) const {
+        return ProviderUtilities::createObjectPath(broker, className, nameSpace);
+    }
 
     /// A new path of `className`: keyless for a keyless path, else with the keys into which `resolve` turns those of
-    /// `objectPath`. What `resolve` throws passes; a path that the broker does not make whole throws, too, since
-    /// without its keys it would name every element.
+    /// `objectPath`. Null for null, and when the broker refuses the path or one of its keys, which is logged: without
+    /// its keys it would name every element. What `resolve` throws passes; keys that the broker does not tell throw
+    /// InstrumentationException.
     template <class Resolve>
     CMPIObjectPath* locate(const char* className, const CMPIObjectPath* objectPath, Resolve resolve) const {
-        required(objectPath);
+        if (objectPath == nullptr) return nullptr;
         CMPIObjectPath* path = keylessPath(className);
-        if (ProviderUtilities::getKeyCount(objectPath) == 0) return path;
+        if (path == nullptr || ProviderUtilities::getKeyCount(objectPath) == 0) return path;
         Moniker moniker;
         const bool read = ProviderUtilities::transformObjectPathToMoniker(objectPath, moniker);
         resolve(moniker);
-        const bool written = ProviderUtilities::transformMonikerToObjectPath(moniker, &path);
-        return required(read && written ? path : nullptr);
+        if (!read) throw InstrumentationException("Could not make the path of the other end");
+        return ProviderUtilities::transformMonikerToObjectPath(moniker, &path) ? path : nullptr;
+    }
+
+    /// Narrows the walk of an end by a path. False for the null of one that was refused: there is nothing to walk then,
+    /// while an end that is left as it is would go over all elements.
+    template <class End>
+    static bool narrow(End& end, const CMPIObjectPath* path) {
+        if (path != nullptr) end.setObjectPath(path);
+        return path != nullptr;
     }
 
     void addProperties(CMPIInstance*) const {}
@@ -110,16 +122,6 @@ protected:
     CMPIComputerSystem computer;
 
 private:
-    CMPIObjectPath* createPath(const char* className) const {
-        return ProviderUtilities::createObjectPath(broker, className, nameSpace);
-    }
-
-    template <class Path>
-    static Path* required(Path* path) {
-        if (path == nullptr) throw InstrumentationException("Could not make the path of the other end");
-        return path;
-    }
-
     /// The reference names in the order in which they are set.
     struct Roles {
         const char* names[2];

@@ -15,11 +15,11 @@ CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* t
     const ParameterTraceScope scope(source, " _broker=", theBroker, " _context=", context, " objectPath=", objectPath);
     traceVariable(source, "requestedClassId", requestedClassId);
     if (requestedClassId == partnerClassId)
-        computer.setObjectPath(locateComputer(objectPath));
+        narrowed = narrow(computer, locateComputer(objectPath));
     else if (requestedClassId == associationClassId) // meant: all computers, whatever the path's keys
-        computer.setObjectPath(keylessPath(CMPIComputerSystem::className));
+        narrowed = narrow(computer, keylessPath(CMPIComputerSystem::className));
     else if (requestedClassId == ComputerSystemClassId)
-        partner.setObjectPath(locateTimeService(objectPath));
+        narrowed = narrow(partner, locateTimeService(objectPath));
 }
 
 CMPITimeServiceAffectsElement::~CMPITimeServiceAffectsElement() {
@@ -28,6 +28,7 @@ CMPITimeServiceAffectsElement::~CMPITimeServiceAffectsElement() {
 
 CMPITimeServiceAffectsElement::operator bool() const {
     const TraceScope scope(source);
+    if (!narrowed) return false;
     switch (requestedClassId) {
     case partnerClassId:
         return static_cast<bool>(computer);

@@ -31,6 +31,9 @@ public:
     static constexpr char partnerRole[] = "AffectingElement";
     static constexpr bool computerFirst = true;
     static const TraceSource& traceSource();
+
+private:
+    bool narrowed = true; ///< false when the broker refused the path that chooses the other end
 };
 
 } // namespace VK::BaseServerProvider

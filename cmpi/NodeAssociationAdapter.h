@@ -21,11 +21,9 @@ public:
                                         " _context=", context, " objectPath=", objectPath);
         traceVariable(TracePoint(Self::traceSource(), Self::adapterName), "requestedClassId", requestedClassId);
         if (requestedClassId == ComputerSystemClassId) {
-            partner.setObjectPath(self().locatePartner(objectPath));
-            valid = static_cast<bool>(partner);
+            valid = narrow(partner, self().locatePartner(objectPath)) && partner;
         } else if (requestedClassId == Self::partnerClassId) {
-            computer.setObjectPath(self().locateComputer(objectPath));
-            valid = static_cast<bool>(computer);
+            valid = narrow(computer, self().locateComputer(objectPath)) && computer;
         } else if (requestedClassId == Self::associationClassId) {
             if (!setObjectPath(objectPath)) throw InstrumentationException("Could not find instance");
         }
@@ -55,7 +53,8 @@ public:
     }
 
     /// Stands on the association that the path names, or for a path without keys on the first of all. False when there
-    /// is none: a reference missing, the two not belonging together, no computer at all.
+    /// is none: a reference missing, the two not belonging together, no computer at all. A path that the broker refused
+    /// on the way is no reason for that: true, and nothing to walk.
     bool setObjectPath(const CMPIObjectPath* objectPath) {
         const ParameterTraceScope scope(Self::traceSource(), " objectPath=", objectPath);
         return ProviderUtilities::getKeyCount(objectPath) == 0 ? selectFirst() : selectNamed(objectPath);
@@ -65,6 +64,7 @@ protected:
     ~NodeAssociationAdapter() { traceDestructor(TracePoint(Self::traceSource(), Self::destructorName)); }
 
     using Base::computer;
+    using Base::narrow;
     using Base::partner;
     using Base::requestedClassId;
 
@@ -73,8 +73,7 @@ private:
 
     bool selectFirst() {
         if (!computer) return false;
-        partner.setObjectPath(self().locatePartner(computer.getObjectPath()));
-        skipComputersWithoutPartner();
+        skipComputersWithoutPartner(narrow(partner, self().locatePartner(computer.getObjectPath())));
         return true;
     }
 
@@ -84,6 +83,10 @@ private:
         if (!ProviderUtilities::getKeyProperty(objectPath, Self::partnerRole, &partnerPath)) return false;
         partner.setObjectPath(partnerPath);
         CMPIObjectPath* const located = self().locateComputer(partnerPath);
+        if (located == nullptr) {
+            valid = false;
+            return true;
+        }
         CMPIObjectPath* computerPath = nullptr;
         if (!ProviderUtilities::getKeyProperty(objectPath, Self::computerRole, &computerPath)) return false;
         std::string name;
@@ -97,15 +100,16 @@ private:
     }
 
     /// Moves on to the next computer that has a partner, unless the current one has. Each computer's partners are a
-    /// walk of their own.
-    void skipComputersWithoutPartner() {
-        while (!partner && computer) {
+    /// walk of their own. `narrowed` is whether the current one's could be looked for: a computer whose path the broker
+    /// refused is passed over.
+    void skipComputersWithoutPartner(bool narrowed = true) {
+        while (!(narrowed && partner) && computer) {
             ++computer;
             if (!computer) break;
             partner.initialize();
-            partner.setObjectPath(self().locatePartner(computer.getObjectPath()));
+            narrowed = narrow(partner, self().locatePartner(computer.getObjectPath()));
         }
-        valid = static_cast<bool>(partner);
+        valid = narrowed && partner;
     }
 
     bool singleInstance = false;

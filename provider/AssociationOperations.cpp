@@ -95,7 +95,7 @@ CMPIStatus serve(const OperationFrame& frame, void (*AssociationRow::*column)(co
                 return;
             }
         }
-        CMReturnDone(request.result);
+        closeResult(request.result);
     });
 }
 

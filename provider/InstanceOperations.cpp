@@ -104,7 +104,7 @@ CMPIStatus serve(const OperationFrame& frame, const Column& column, const CMPICo
             return;
         }
         (classRow->*column.walk)({frame, context, result, ref, properties, classId}, service == DoneTracingEach);
-        if (service != Open) CMReturnDone(result);
+        if (service != Open) closeResult(result);
     });
 }
 

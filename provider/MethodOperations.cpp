@@ -70,8 +70,10 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, co
         status.rc = CMPI_RC_ERR_FAILED;
         status.msg = theBroker != nullptr ? CMNewString(theBroker, exception.what(), nullptr) : nullptr;
     });
-    CMReturnData(result, &returnCode, CMPI_uint32);
-    CMReturnDone(result);
+    const CMPIStatus returned = CMReturnData(result, &returnCode, CMPI_uint32);
+    contained([&] { noteRefusal(frameSource, returned); });
+    const CMPIStatus closed = CMReturnDone(result);
+    contained([&] { noteRefusal(frameSource, closed); });
     return status; // meant: there is no exit marker here
 }
 

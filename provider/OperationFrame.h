@@ -72,5 +72,9 @@ inline void returnPath(const CMPIResult* result, CMPIObjectPath* path) {
 inline void returnInstance(const CMPIResult* result, CMPIInstance* instance) {
     if (instance != nullptr) noteRefusal(frameSource, CMReturnInstance(result, instance));
 }
+/// Says that the answer is whole.
+inline void closeResult(const CMPIResult* result) {
+    noteRefusal(frameSource, CMReturnDone(result));
+}
 
 } // namespace VK::BaseServerProvider
