@@ -13,6 +13,6 @@ if [ "${1:-}" = --coverage ]; then
     exec scripts/coverage build-coverage
 fi
 # shellcheck disable=SC2086
-install_packages $build_packages
+install_packages $build_packages $test_packages
 build_tree release build
 exec ctest --test-dir build --output-on-failure -j "$(nproc)" "$@"

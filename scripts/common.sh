@@ -5,6 +5,10 @@
 # shellcheck disable=SC2034 # for those that source this
 build_packages="cmake ninja-build g++ pkg-config libcli11-dev nlohmann-json3-dev libfmt-dev libgtest-dev libgmock-dev libbenchmark-dev tzdata python3"
 
+# What single tests take; they are skipped without.
+# shellcheck disable=SC2034
+test_packages="python3-jsonschema groff bubblewrap strace iproute2 util-linux procps"
+
 die() {
     echo "$0: $*" >&2
     exit 3

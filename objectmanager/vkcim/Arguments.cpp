@@ -54,10 +54,11 @@ public:
         app.fallthrough();
         app.get_formatter()->label("SUBCOMMAND", "COMMAND");
         app.get_formatter()->label("REQUIRED", "");
-        app.footer("PATH is a class name or CLASS.KEY=\"TEXT\",KEY=NUMBER; - reads it from standard input.\n"
-                   "VALUE is TYPE:TEXT, null:TYPE, or TEXT alone with the type that the schema declares.\n"
-                   "'vkcim COMMAND --help' shows an example. Exit status: 0 done, 1 the provider answered an\n"
-                   "error, 2 unusable arguments, 3 the provider library cannot be used.");
+        app.footer(
+            "PATH is a class name or CLASS.KEY=\"TEXT\",KEY=NUMBER; - reads it from the first line of standard input.\n"
+            "VALUE is TYPE:TEXT, null:TYPE, or TEXT alone with the type that the schema declares.\n"
+            "'vkcim COMMAND --help' shows an example. Exit status: 0 done, 1 the provider answered an\n"
+            "error, 2 unusable arguments, 3 the provider library cannot be used.");
         addOptions();
         for (const Command& command : commands) addCommand(command);
     }
@@ -80,10 +81,14 @@ public:
 
 private:
     void addOptions() {
-        app.add_option("--library", arguments.library, "Provider library (the one beside vkcim)")->type_name("FILE");
+        const CLI::Validator notEmpty([](const std::string& text) { return text.empty() ? "is empty" : ""; }, "");
+        app.add_option("--library", arguments.library, "Provider library (the one beside vkcim)")
+            ->type_name("FILE")
+            ->check(notEmpty);
         app.add_option("--provider", arguments.provider, "Provider name, the prefix of the factory functions")
             ->capture_default_str()
-            ->type_name("NAME");
+            ->type_name("NAME")
+            ->check(notEmpty);
         app.add_option("--namespace", arguments.nameSpace, "Namespace")->capture_default_str()->type_name("NS");
         app.add_option("--format", formatName, "Output format: text, mof or json")
             ->capture_default_str()
@@ -137,7 +142,8 @@ private:
             sub->add_option(name, text, about)->required(required)->type_name("");
         };
         if (command.takes == Takes::Class) add("CLASS", arguments.subject, true, "Name of a class");
-        if (command.takes == Takes::Path) add("PATH", arguments.subject, true, "Path; - reads it from standard input");
+        if (command.takes == Takes::Path)
+            add("PATH", arguments.subject, true, "Path; - reads it from the first line of standard input");
         if (command.takes == Takes::Query) add("TEXT", arguments.subject, true, "The query");
         if (command.method) add("METHOD", arguments.method, true, "Name of the method");
         if (command.assignments) {

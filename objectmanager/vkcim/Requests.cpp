@@ -24,6 +24,9 @@ std::string readLine(std::istream& input) {
     std::getline(input, line);
     if (!line.empty() && line.back() == '\r') line.pop_back();
     if (line.empty()) throw std::runtime_error("standard input holds no path");
+    if (const std::size_t zero = line.find('\0'); zero != std::string::npos) {
+        throw std::runtime_error(fmt::format("the path on standard input holds a zero byte at {}", zero));
+    }
     return line;
 }
 

@@ -82,11 +82,11 @@ private:
         streams.error << '\n';
         if (repeated.worst != CMPI_RC_ERR_INVALID_CLASS) return;
         for (const std::string& className : {request.path.className, request.assocClass.value_or("")}) {
-            if (const auto nearest = nearestClass(className, schema)) {
-                streams.error << "vkcim: there is no class " << printable(className) << "; did you mean " << *nearest
-                              << "?\n";
-                return;
-            }
+            if (className.empty() || schema.find(className)) continue;
+            const auto nearest = nearestClass(className, schema);
+            streams.error << "vkcim: there is no class " << printable(className)
+                          << (nearest ? "; did you mean " + *nearest + "?\n" : " in the schema\n");
+            return;
         }
         if (isAssociation(request.operation) && !request.assocClass)
             streams.error << "vkcim: the association's class may have to be named: --assoc-class\n";

@@ -90,7 +90,9 @@ TEST(Arguments, EveryCommandsHelpHasItsExample) {
 }
 
 TEST(Arguments, UnusableOnesAreRefusedWithStatusTwo) {
-    for (const Words& words : {Words{},
+    for (const Words& words : {Words{"--library", "", "names", "A"},
+                               Words{"--provider", "", "names", "A"},
+                               Words{},
                                Words{"bogus"},
                                Words{"--bogus", "names", "A"},
                                Words{"names"},

@@ -41,6 +41,11 @@ TEST(Requests, APathMayComeFromStandardInput) {
     EXPECT_EQ(request({"get", "-"}, "root/x:Test_Thing\nignored").path.nameSpace, "root/x");
     EXPECT_EQ(request({"get", "-"}, "Test_Thing\r\n").path.className, "Test_Thing");
     EXPECT_THAT([] { request({"get", "-"}); }, ThrowsMessage<std::runtime_error>(HasSubstr("no path")));
+    EXPECT_THAT(
+        [] {
+            request({"get", "-"}, std::string("Test\0Thing\n", 11));
+        },
+        ThrowsMessage<std::runtime_error>(HasSubstr("a zero byte at 4")));
 }
 
 TEST(Requests, AQueryNamesItsClassInThePath) {

@@ -35,6 +35,8 @@ TEST(Vkcim, AMistypedClassNameIsAnsweredWithTheNearestOne) {
     EXPECT_EQ(outcome.status, 1);
     EXPECT_EQ(outcome.error, "vkcim: CMPI_RC_ERR_INVALID_CLASS (5)\n"
                              "vkcim: there is no class VESKA_ComputerSytsem; did you mean VESKA_ComputerSystem?\n");
+    EXPECT_EQ(vkcim({"names", "Something_Else"}).error, "vkcim: CMPI_RC_ERR_INVALID_CLASS (5)\n"
+                                                        "vkcim: there is no class Something_Else in the schema\n");
 }
 
 TEST(Vkcim, OneBadRunAmongManyExitsWithOne) {
