@@ -107,10 +107,12 @@ TEST(CMPIComputerSystemPackage, ReachesOnlyTheClassAtTheOtherEndInAnyLetterCase)
     const auto count = [](const om::ObjectPath& source, const char* resultClass) {
         return test::associatorNames(source, className, resultClass).results.size();
     };
-    for (const char* chassisClass : {"VESKA_PhysicalPackage", "CIM_PhysicalPackage", "cim_physicalpackage", ""}) {
+    for (const char* chassisClass :
+         {"VESKA_PhysicalPackage", "veska_physicalpackage", "CIM_PhysicalPackage", "cim_physicalpackage", ""}) {
         EXPECT_EQ(count(computerPath("a"), chassisClass), 1U) << chassisClass;
     }
-    for (const char* computerClass : {"VESKA_ComputerSystem", "CIM_ComputerSystem", "CIM_COMPUTERSYSTEM", ""}) {
+    for (const char* computerClass :
+         {"VESKA_ComputerSystem", "VESKA_COMPUTERSYSTEM", "CIM_ComputerSystem", "CIM_COMPUTERSYSTEM", ""}) {
         EXPECT_EQ(count(chassisPath("A"), computerClass), 1U) << computerClass;
     }
     // Meant: bases further up are not reached, nor is the class at this end.
@@ -173,6 +175,13 @@ TEST_F(CMPIComputerSystemPackageAdapter, NamesNothingBehindItsLastElement) {
             EXPECT_EQ(adapter.getCMPIInstance(nullptr), nullptr);
         }
     }
+}
+
+TEST_F(CMPIComputerSystemPackageAdapter, ReachesNoClassFromASourceThatIsNoEnd) {
+    const CMPIComputerSystemPackage adapter(broker, nullptr, requestPath("VESKA_TimeService"));
+    for (const char* resultClass : {"VESKA_PhysicalPackage", "CIM_PhysicalPackage", "VESKA_ComputerSystem",
+                                    "CIM_ComputerSystem", "VESKA_TimeService"})
+        EXPECT_TRUE(adapter.isNotTargetClass(resultClass)) << resultClass;
 }
 
 TEST_F(CMPIComputerSystemPackageAdapter, LeavesOutReferencesThatTheBrokerDoesNotTell) {

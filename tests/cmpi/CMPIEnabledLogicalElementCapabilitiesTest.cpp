@@ -1,3 +1,4 @@
+#include "cmpi/CMPIEnabledLogicalElementCapabilities.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
@@ -56,6 +57,30 @@ TEST(CMPIEnabledLogicalElementCapabilities, AreAllAnsweredForAPathWithoutInstanc
     test::simulate({test::computer(0, "a"), test::computer(1, "b")});
     EXPECT_EQ(test::get(test::path(className)).results.size(), 2U);
     EXPECT_EQ(test::get(test::path(className, {{"Name", "a"}})).results.size(), 2U);
+}
+
+TEST(CMPIEnabledLogicalElementCapabilities, StartAgainFromTheFirstComputerWithAMethodLine) {
+    test::simulate({test::computer(0, "a")});
+    VK::BaseServerProvider::CMPIEnabledLogicalElementCapabilities adapter(test::provider().broker(), nullptr,
+                                                                          "root/cimv2");
+    ++adapter;
+    EXPECT_FALSE(adapter);
+    test::takeLog();
+    adapter.initialize();
+    EXPECT_EQ(test::withoutPlaces(test::takeLog()).at(0),
+              "LOG 4000 Norvane.BaseServerProvider CMPIEnabledLogicalElementCapabilities initialize: METHOD: "
+              "initialize() was invoked in CMPIEnabledLogicalElementCapabilities [Line]");
+    EXPECT_TRUE(adapter);
+}
+
+TEST(CMPIEnabledLogicalElementCapabilities, TraceTheInstanceIDThatTheyAreAskedFor) {
+    test::simulate({test::computer(0, "a")});
+    test::takeLog();
+    test::get(test::path(className, {{"InstanceID", "/computer/0"}}));
+    EXPECT_THAT(test::withoutPlaces(test::takeLog()),
+                testing::Contains("LOG 4000 Norvane.BaseServerProvider CMPIEnabledLogicalElementCapabilities "
+                                  "setObjectPath: VARIABLE: 'instanceId' has Value '/computer/0' [Line] in "
+                                  "CMPIEnabledLogicalElementCapabilities"));
 }
 
 } // namespace

@@ -1,3 +1,4 @@
+#include "cmpi/CMPIPhysicalPackage.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
@@ -103,6 +104,37 @@ TEST(CMPIPhysicalPackage, AnswersAnUnknownTagWithNothingAndNoError) {
     EXPECT_THAT(answer.results, IsEmpty());
     EXPECT_EQ(answer.code, CMPI_RC_OK);
     EXPECT_TRUE(answer.done);
+}
+
+/// What the adapter's functions wrote into the log channel, from the function's name on.
+std::vector<std::string> linesOf(const std::string& function) {
+    const std::string head = "LOG 4000 Norvane.BaseServerProvider CMPIPhysicalPackage ";
+    std::vector<std::string> lines;
+    for (const std::string& line : test::withoutPlaces(test::takeLog()))
+        if (line.rfind(head + function, 0) == 0) lines.push_back(line.substr(head.size()));
+    return lines;
+}
+
+TEST(CMPIPhysicalPackage, FiltersByTagFirstAndTracesBoth) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
+    test::takeLog();
+    test::get(test::path("VESKA_PhysicalPackage", {{"SystemName", "/computer/0"}, {"Tag", "A"}}));
+    EXPECT_THAT(
+        linesOf("setObjectPath: VARIABLE"),
+        ElementsAre("setObjectPath: VARIABLE: 'tag' has Value 'A' [Line] in CMPIPhysicalPackage",
+                    "setObjectPath: VARIABLE: 'systemName' has Value '/computer/0' [Line] in CMPIPhysicalPackage"));
+}
+
+TEST(CMPIPhysicalPackage, StartsAgainFromTheFirstChassisWithAMethodLine) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
+    VK::BaseServerProvider::CMPIPhysicalPackage adapter(test::provider().broker(), nullptr, "root/cimv2");
+    ++adapter;
+    EXPECT_FALSE(adapter);
+    test::takeLog();
+    adapter.initialize();
+    EXPECT_THAT(linesOf("initialize"),
+                ElementsAre("initialize: METHOD: initialize() was invoked in CMPIPhysicalPackage [Line]"));
+    EXPECT_TRUE(adapter);
 }
 
 } // namespace

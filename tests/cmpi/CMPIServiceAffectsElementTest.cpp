@@ -1,6 +1,8 @@
+#include "cmpi/CMPIServiceAffectsElement.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
+#include <cmpimacs.h>
 #include <gmock/gmock.h>
 
 #include <unistd.h>
@@ -166,6 +168,21 @@ TEST(CMPITimeServiceAffectsElement, CannotBeGot) {
     EXPECT_EQ(answer.code, CMPI_RC_ERR_INVALID_CLASS);
     EXPECT_THAT(answer.results, IsEmpty());
     EXPECT_FALSE(answer.done);
+}
+
+TEST(CMPITimeServiceAffectsElement, AskedByItsOwnClassMovesOnAtBothEndsAndIsPassed) {
+    test::simulate({test::computer(0, hostName()), test::computer(1, "other")});
+    const CMPIBroker* const broker = test::provider().broker();
+    VK::BaseServerProvider::CMPITimeServiceAffectsElement adapter(
+        broker, nullptr, CMNewObjectPath(broker, "root/cimv2", association, nullptr));
+    EXPECT_TRUE(adapter);
+    test::takeLog();
+    ++adapter;
+    const std::vector<std::string> log = test::withoutPlaces(test::takeLog());
+    for (const std::string end : {"TimeService", "ComputerSystem"})
+        EXPECT_THAT(log, testing::Contains("LOG 4000 Norvane.BaseServerProvider CMPI" + end +
+                                           " operator++: ENTERING: operator++() in CMPI" + end + " [Line]"));
+    EXPECT_FALSE(adapter) << "there is one time service";
 }
 
 } // namespace

@@ -6,6 +6,7 @@
 namespace {
 
 using testing::Contains;
+using testing::ContainsRegex;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -115,6 +116,22 @@ TEST_F(AssociationOperations, LeaveRolesUnread) {
     request.role = "Antecedent"; // the computer is the Dependent
     request.resultRole = "Nothing";
     EXPECT_EQ(test::provider().run(request).results.size(), 1U);
+}
+
+TEST_F(AssociationOperations, TraceTheListOfPropertiesAndDoNotApplyIt) {
+    om::Request request;
+    request.operation = om::Operation::Associators;
+    request.path = node7;
+    for (const char* association : {"VESKA_ComputerCapabilities", "VESKA_ComputerSystemPackage"}) {
+        request.assocClass = association;
+        request.propertyList.reset();
+        const om::Answer without = test::provider().run(request);
+        request.propertyList = std::vector<std::string>{"ElementName"};
+        test::takeLog();
+        EXPECT_EQ(test::provider().run(request).results, without.results) << association;
+        EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(
+                                         " getCMPIInstance: ENTERING: .*,Parameters List:  properties=0x[0-9a-f]+$")));
+    }
 }
 
 } // namespace

@@ -178,6 +178,30 @@ TEST(GetInstance, LogsEachStepOnceToEitherChannel) {
     EXPECT_THAT(test::events(test::takeLog()), ElementsAreArray(expected));
 }
 
+/// The request with a list of properties, and what it left in the log.
+Events eventsWithPropertyList(Operation operation, const om::ObjectPath& path) {
+    om::Request request;
+    request.operation = operation;
+    request.path = path;
+    const om::Answer without = test::provider().run(request);
+    request.propertyList = std::vector<std::string>{"Name"};
+    test::takeLog();
+    const om::Answer with = test::provider().run(request);
+    EXPECT_EQ(with.results, without.results) << "the list is not applied";
+    return test::events(test::takeLog());
+}
+
+TEST(InstanceOperations, TraceTheListOfPropertiesAndDoNotApplyIt) {
+    simulateOneComputer();
+    const om::ObjectPath computer = test::path("VESKA_ComputerSystem", {{"Name", "node7"}});
+    const std::string traced = test::entering("CMPIComputerSystem", "getCMPIInstance", " properties=ADDRESS");
+    for (const Operation operation : {Operation::EnumInstances, Operation::GetInstance})
+        EXPECT_THAT(eventsWithPropertyList(operation, computer), testing::Contains(traced));
+    EXPECT_THAT(eventsWithPropertyList(Operation::ModifyInstance, test::path("VESKA_TimeService")),
+                testing::Contains(test::entering("CMPITimeService", "modifyInstance",
+                                                 " referenceInstance=ADDRESS properties=ADDRESS")));
+}
+
 TEST(EnumInstanceNames, TracesTheClassOnceMoreForEveryComputer) {
     test::simulate({test::computer(0, "node7"), test::computer(1, "node8"), test::chassis(0, 0, "CZ1")});
     const std::string operation = "BaseServer_EnumInstanceNames";
