@@ -184,6 +184,23 @@ TEST_F(CMPIComputerSystemPackageAdapter, ReachesNoClassFromASourceThatIsNoEnd) {
         EXPECT_TRUE(adapter.isNotTargetClass(resultClass)) << resultClass;
 }
 
+TEST_F(CMPIComputerSystemPackageAdapter, EndsWithItsTextWhereTheBrokerMakesNoPath) {
+    CMPIBrokerEncFT table = *broker->eft;
+    table.newObjectPath = [](const CMPIBroker*, const char*, const char*, CMPIStatus*) -> CMPIObjectPath* {
+        return nullptr;
+    };
+    CMPIBroker spoiled = *broker;
+    spoiled.eft = &table;
+    for (CMPIObjectPath* const source : {requestPath("VESKA_ComputerSystem"), requestPath("VESKA_PhysicalPackage")}) {
+        try {
+            const CMPIComputerSystemPackage adapter(&spoiled, nullptr, source);
+            ADD_FAILURE() << "nothing was thrown";
+        } catch (const VK::InstrumentationException& exception) {
+            EXPECT_STREQ(exception.what(), "Could not make the path of the other end");
+        }
+    }
+}
+
 TEST_F(CMPIComputerSystemPackageAdapter, LeavesOutReferencesThatTheBrokerDoesNotTell) {
     static CMPIObjectPathFT forgetful;
     forgetful = *requestPath(className)->ft;

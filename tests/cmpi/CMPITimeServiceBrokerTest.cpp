@@ -115,6 +115,28 @@ TEST_F(CMPITimeServiceBrokerTest, FailsWithoutOutArgumentsAndTouchesNothing) {
     expectUntouchedHost();
 }
 
+TEST_F(CMPITimeServiceBrokerTest, SaysToTheBrokerAloneWhichArgumentHasAWrongType) {
+    static std::vector<std::string> said;
+    said.clear();
+    CMPIBrokerEncFT table = *real->eft;
+    table.newString = [](const CMPIBroker*, const char* text, CMPIStatus*) -> CMPIString* {
+        said.emplace_back(text);
+        return nullptr;
+    };
+    CMPIBroker listening = *real;
+    listening.eft = &table;
+    broker = &listening;
+    for (const char* name : {"ManagedElement", "TimeData"}) {
+        CMPIArgs* const in = arguments(false);
+        CMPIValue value = {};
+        CMAddArg(in, name, &value, CMPI_boolean);
+        EXPECT_EQ(invoke(in), 1U) << name;
+    }
+    EXPECT_THAT(said, ElementsAre("ManagedElement Parameter is having Invalid type or is NULL",
+                                  "TimeData Parameter is having Invalid type or is NULL"));
+    expectUntouchedHost();
+}
+
 TEST_F(CMPITimeServiceBrokerTest, FailsWhenTheBrokerMakesNoDateTime) {
     for (const auto newDateTime : {noDateTime, emptyDateTime}) {
         CMPIBrokerEncFT table = *real->eft;
