@@ -89,6 +89,12 @@ TEST(CMPIComputerSystemPackage, GivesExactlyTheInstanceThatIsNamed) {
     EXPECT_THAT(test::get(association("C", "a")).results, IsEmpty());
 }
 
+TEST(CMPIComputerSystemPackage, IsGivenOnceWhereTwoChassisShareTheirSerialNumber) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::chassis(0, 1, "A")});
+    EXPECT_THAT(test::ends(test::pathsOfInstances(test::get(association("A", "a")))),
+                ElementsAre("Antecedent=A -> Dependent=a"));
+}
+
 TEST(CMPIComputerSystemPackage, LeadsFromAComputerToAllItsChassisAndBack) {
     test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A"), test::chassis(0, 1, "B"), test::computer(1, "b"),
                     test::chassis(1, 0, "C")});
