@@ -3,7 +3,6 @@
 #include <nlohmann/json.hpp>
 
 #include <algorithm>
-#include <set>
 
 namespace fuzz {
 namespace {
@@ -12,6 +11,8 @@ using nlohmann::json;
 
 constexpr unsigned computerNode = 40;
 constexpr unsigned chassisNode = 1;
+constexpr char nameProperty[] = "108";
+constexpr char serialProperty[] = "50";
 constexpr std::array<const char*, 3> types = {"40", "1", "7"};
 constexpr std::array<const char*, 5> paths = {"/computer/0", "/computer/1", "/chassis/0", "/chassis/1", "/fan"};
 constexpr std::array<const char*, 4> parents = {"/computer/0", "/computer/1", "", "/nowhere"};
@@ -55,7 +56,8 @@ json node(Choices& choices, const std::string& hostName) {
     made["description"] = text(choices, nodeNames);
     made["properties"] = json::object();
     // The one that elements are told by comes more often than chance would have it.
-    if (!choices.oneIn(4)) made["properties"][made["type"] == computerNode ? "108" : "50"] = value(choices, hostName);
+    if (!choices.oneIn(4))
+        made["properties"][made["type"] == computerNode ? nameProperty : serialProperty] = value(choices, hostName);
     for (std::size_t i = choices.below(6); i > 0; --i)
         made["properties"][choices.one(properties)] = value(choices, hostName);
     for (const char* list : {"readOnly", "unanswerable", "failWrites"})
@@ -63,13 +65,11 @@ json node(Choices& choices, const std::string& hostName) {
     return made;
 }
 
-/// Notes what a node is told by; false when it has nothing, or what another one has.
-bool isTold(const json& made, std::set<std::string>& names, std::set<std::string>& serials) {
-    const bool isComputer = made["type"] == computerNode;
-    if (!isComputer && made["type"] != chassisNode) return true;
-    const auto found = made["properties"].find(isComputer ? "108" : "50");
-    if (found == made["properties"].end() || !found->is_string()) return false;
-    return (isComputer ? names : serials).insert(found->get<std::string>()).second;
+/// What a node is told by.
+std::optional<std::string> identity(const json& made, const char* property) {
+    const auto found = made["properties"].find(property);
+    if (found == made["properties"].end() || !found->is_string()) return std::nullopt;
+    return found->get<std::string>();
 }
 
 } // namespace
@@ -77,11 +77,10 @@ bool isTold(const json& made, std::set<std::string>& names, std::set<std::string
 RandomHost randomHost(Choices& choices, const std::string& hostName) {
     RandomHost host;
     json nodes = json::array();
-    std::set<std::string> names;
-    std::set<std::string> serials;
     for (std::size_t i = choices.below(8); i > 0; --i) {
         json made = node(choices, hostName);
-        host.namesAreUnique = isTold(made, names, serials) && host.namesAreUnique;
+        if (made["type"] == computerNode) host.computers.push_back(identity(made, nameProperty));
+        if (made["type"] == chassisNode) host.chassis.push_back(identity(made, serialProperty));
         nodes.push_back(std::move(made));
     }
     host.json = dump({{"product", {{"architecture", "x86_64"}, {"uid", "1"}, {"kvm", false}}}, {"nodes", nodes}});

@@ -2,16 +2,20 @@
 
 #include "fuzz/Choices.h"
 
+#include <optional>
 #include <string>
+#include <vector>
 
 namespace fuzz {
 
+/// What each node of a type is told by, in order; nothing for a node that has no such text.
+using Identities = std::vector<std::optional<std::string>>;
+
 /// A simulated host of up to seven nodes.
 struct RandomHost {
-    std::string json; ///< its file
-    /// Whether every computer has a name and every chassis a serial number, no two the same: only then does every
-    /// path of an association name one.
-    bool namesAreUnique = true;
+    std::string json;     ///< its file
+    Identities computers; ///< their names
+    Identities chassis;   ///< their serial numbers
 };
 
 /// The names and serial numbers that hosts and requests have in common.

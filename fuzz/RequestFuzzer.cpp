@@ -79,21 +79,40 @@ const om::ObjectPath& pathOf(const std::variant<om::ObjectPath, om::Instance>& r
     return instance != nullptr ? instance->path : std::get<om::ObjectPath>(result);
 }
 
-bool hasKey(const om::ObjectPath& path, const char* name) {
-    return std::any_of(path.keys.begin(), path.keys.end(), [&](const auto& key) { return key.first == name; });
+const om::Value* keyOf(const om::ObjectPath& path, const char* name) {
+    const auto found =
+        std::find_if(path.keys.begin(), path.keys.end(), [&](const auto& key) { return key.first == name; });
+    return found != path.keys.end() ? &found->second : nullptr;
 }
 
-bool isAssociation(const om::ObjectPath& path) {
-    return !path.keys.empty() && path.keys.front().second.type == CMPI_ref;
+/// The node that an end of an association names by this key; `all.end()` when there is none, or several.
+fuzz::Identities::const_iterator theOnly(const fuzz::Identities& all, const om::ObjectPath& end, const char* key) {
+    const om::Value* const value = keyOf(end, key);
+    const auto* const text = value != nullptr ? std::get_if<std::string>(&value->data) : nullptr;
+    if (text == nullptr) return all.end();
+    const auto found = std::find(all.begin(), all.end(), *text);
+    return found == all.end() || std::find(found + 1, all.end(), *text) == all.end() ? found : all.end();
+}
+
+/// Whether an end of an association names one element that can be found from it. The search for a chassis fails at the
+/// first one without a serial number, which is meant: those behind it cannot be found.
+bool endCanBeFound(const om::ObjectPath& end, const fuzz::RandomHost& host) {
+    if (end.className == "VESKA_ComputerSystem") return theOnly(host.computers, end, "Name") != host.computers.end();
+    if (end.className != "VESKA_PhysicalPackage") return true;
+    const auto found = theOnly(host.chassis, end, "Tag");
+    return found != host.chassis.end() && std::find(host.chassis.begin(), found, std::nullopt) == found;
 }
 
 /// Whether the path names one element: that of a computer without a name or a chassis without a tag does not, nor that
-/// of an association of such. The time service's association cannot be got, which is meant.
+/// of an association with an end that cannot be found. The time service's association cannot be got, which is meant.
 bool canBeGot(const om::ObjectPath& path, const fuzz::RandomHost& host) {
     if (path.className == "VESKA_TimeServiceAffectsElement") return false;
-    if (path.className == "VESKA_ComputerSystem") return hasKey(path, "Name");
-    if (path.className == "VESKA_PhysicalPackage") return hasKey(path, "Tag");
-    return !isAssociation(path) || host.namesAreUnique;
+    if (path.className == "VESKA_ComputerSystem") return keyOf(path, "Name") != nullptr;
+    if (path.className == "VESKA_PhysicalPackage") return keyOf(path, "Tag") != nullptr;
+    return std::all_of(path.keys.begin(), path.keys.end(), [&](const auto& key) {
+        const auto* const end = std::get_if<std::shared_ptr<const om::ObjectPath>>(&key.second.data);
+        return end == nullptr || endCanBeFound(**end, host);
+    });
 }
 
 void checkThatItCanBeGot(const om::ObjectPath& path, const fuzz::RandomHost& host) {
