@@ -127,6 +127,22 @@ void checkThatItCanBeGot(const om::ObjectPath& path, const fuzz::RandomHost& hos
            "a path that was returned cannot be got: " + found());
 }
 
+void checkThatAllCanBeGot(const om::Answer& answer, const fuzz::RandomHost& host) {
+    for (const auto& result : answer.results)
+        if (canBeGot(pathOf(result), host)) checkThatItCanBeGot(pathOf(result), host);
+}
+
+/// Few requests are for associations, on which the shape of the host tells most: every host is asked for its own.
+void checkAssociations(const fuzz::RandomHost& host) {
+    for (const char* className : {"VESKA_ComputerCapabilities", "VESKA_ComputerSystemPackage"}) {
+        om::Request request;
+        request.operation = Operation::EnumInstanceNames;
+        request.path.nameSpace = "root/cimv2";
+        request.path.className = className;
+        checkThatAllCanBeGot(provider().run(request), host);
+    }
+}
+
 } // namespace
 
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
@@ -148,8 +164,8 @@ extern "C" int LLVMFuzzerTestOneInput(const unsigned char* data, std::size_t siz
     checkStatus(request, answer);
     test::takeCommands();
     if (request.fault) return 0;
-    for (const auto& result : answer.results)
-        if (canBeGot(pathOf(result), host)) checkThatItCanBeGot(pathOf(result), host);
+    checkThatAllCanBeGot(answer, host);
+    checkAssociations(host);
     test::takeCommands();
     return 0;
 }
