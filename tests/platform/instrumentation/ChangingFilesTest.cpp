@@ -177,7 +177,7 @@ TEST(ChangingFiles, OfTheHostsNameAreOneNameOrNone) {
 std::string runLevel(char level) {
     utmp entry{};
     entry.ut_type = RUN_LVL;
-    entry.ut_pid = level;
+    entry.ut_pid = static_cast<unsigned char>(level);
     std::string bytes(sizeof entry, '\0');
     std::memcpy(bytes.data(), &entry, sizeof entry);
     return bytes;
