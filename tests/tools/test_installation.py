@@ -30,8 +30,9 @@ class Contents(unittest.TestCase):
                      "share/man/man8/vk-provider-register.8", "share/man/man8/vk-provider-check.8",
                      "share/man/man8/vk-host-snapshot.8", "share/bash-completion/completions/vkcim",
                      "share/vk-baseserver/vk-baseserver.mof", "share/vk-baseserver/vk-baseserver-registration.mof",
-                     "share/vk-baseserver/vk-baseserver.reg", "share/vk-baseserver/register-openpegasus.sh",
-                     "share/vk-baseserver/register-sfcb.sh", "share/vk-baseserver/examples/rack-server.json",
+                     "share/vk-baseserver/vk-baseserver.reg", "share/vk-baseserver/register-links.sh",
+                     "share/vk-baseserver/register-openpegasus.sh", "share/vk-baseserver/register-sfcb.sh",
+                     "share/vk-baseserver/examples/rack-server.json",
                      "share/doc/vk-baseserver-tools/vkcim.schema.json",
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
         headers = (SOURCE / "platform/include").rglob("*.h")

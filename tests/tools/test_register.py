@@ -5,30 +5,8 @@ import shutil
 import unittest
 
 import fakes
-from support import LIBRARY, folder, install, run, snapshot_of
-
-PREFIX = folder() / "installed"
-install(PREFIX, component="provider")
-SHARE = PREFIX / "share/vk-baseserver"
-MODULE = "VKBaseServerModule"
-CLASSES = [f"VESKA_{name}" for name in (
-    "ComputerSystem", "PhysicalPackage", "EnabledLogicalElementCapabilities", "TimeService", "CIMServiceConfig",
-    "ComputerCapabilities", "ComputerSystemPackage", "TimeServiceAffectsElement")]
-
-
-class Register(unittest.TestCase):
-    def setUp(self):
-        self.root = folder()
-
-    def register(self, *words, prefix=PREFIX, status=0):
-        env = {"PATH": "/usr/sbin:/usr/bin:/sbin:/bin", "VK_REGISTER_ROOT": str(self.root)}
-        done = run(prefix / "sbin/vk-provider-register", *words, env=env)
-        self.assertEqual(done.returncode, status, done.stdout + done.stderr)
-        return done
-
-    def cimconfig_link(self):
-        found = [p for p in self.root.rglob("*") if p.name == "cimconfig" and p.is_symlink()]
-        return (str(found[0].relative_to(self.root)), os.readlink(found[0])) if found else None
+from registering import CLASSES, MODULE, PREFIX, SHARE, Register
+from support import LIBRARY, folder, snapshot_of
 
 
 class WithoutObjectManager(Register):
@@ -140,6 +118,66 @@ class OpenPegasus(Register):
             self.assertEqual(manager.calls(), [])
             self.assertEqual(snapshot_of(self.root), before)
 
+    def test_dry_run_of_remove_says_what_it_would_do_and_changes_nothing(self):
+        for up in (True, False):
+            self.root = folder()
+            manager = fakes.pegasus(self.root, up=up)
+            self.register("install")
+            manager.calls()
+            before = snapshot_of(self.root)
+            lines = self.register("--dry-run", "remove").stdout.splitlines()
+            self.assertEqual(manager.calls(), [])
+            self.assertEqual(snapshot_of(self.root), before)
+            sbin, started = f"would run: {self.root}/usr/sbin", [] if up else ["cimserver"]
+            self.assertEqual(lines, [
+                *[f"{sbin}/{command}" for command in started],
+                f"{sbin}/cimprovider -d -m {MODULE}", f"{sbin}/cimprovider -r -m {MODULE}",
+                *[f"{sbin}/cimcli dc -n root/cimv2 {name}" for name in reversed(CLASSES)],
+                *[f"{sbin}/{command} -s" for command in started],
+                f"would run: rm -f {self.root / self.link}",
+                f"would run: rm -f {self.root / self.cimconfig_link()[0]}"])
+
+    def test_a_server_that_never_answers_is_stopped_again(self):
+        for action in ("install", "remove"):
+            with self.subTest(action):
+                self.root = folder()
+                manager = fakes.pegasus(self.root, up=False)
+                if action == "remove":
+                    self.register("install")
+                    manager.calls()
+                manager.program("cimprovider", "exit 1")
+                programs = folder()
+                (programs / "sleep").symlink_to("/bin/true")
+                done = self.register(action, status=1, PATH=f"{programs}:/usr/bin:/bin")
+                self.assertIn("does not answer after its start", done.stderr)
+                self.assertEqual(manager.calls(), ["cimserver", "cimserver -s"])
+                self.assertFalse(manager.up)
+
+    def test_a_module_that_is_disabled_already_is_removed(self):
+        manager = fakes.pegasus(self.root, up=True)
+        whole = (self.root / "usr/sbin/cimprovider").read_text(encoding="ascii")
+        self.register("install")
+        refusing = whole.split("}\n", 1)[1].replace("-l)", "-d) echo disabled already >&2; exit 1 ;;\n-l)")
+        manager.program("cimprovider", refusing)
+        self.assertIn("was not disabled: disabled already", self.register("remove").stdout)
+        self.assertFalse((self.root / self.link).is_symlink())
+        self.assertEqual((self.root / "state/modules").read_text(encoding="ascii"), "")
+        self.assertFalse((self.root / "var/lib/vk").exists())
+
+    def test_status_notices_what_keeps_a_registration_from_serving(self):
+        prefix = folder() / "p"
+        shutil.copytree(PREFIX, prefix, symlinks=True)
+        fakes.pegasus(self.root, up=True)
+        stamp = self.root / "var/lib/vk/registration/openpegasus"
+        mof = prefix / "share/vk-baseserver/vk-baseserver.mof"
+        for harm, flaw in [((self.root / self.link).unlink, "does not lead to the library"),
+                           (stamp.unlink, "nothing is noted of it"),
+                           (lambda: mof.write_text(mof.read_text() + "// newer\n"), "other classes")]:
+            self.register("install", prefix=prefix)
+            self.assertNotIn("but", self.register("status", prefix=prefix).stdout)
+            harm()
+            self.assertIn(flaw, self.register("status", prefix=prefix, status=1).stdout)
+
     def test_status_tells_by_its_exit_status_too(self):
         fakes.pegasus(self.root, up=True)
         self.assertIn("is not registered", self.register("status", status=1).stdout)
@@ -165,22 +203,6 @@ class OpenPegasus(Register):
         classes, registration = self.registering()
         self.assertEqual(manager.calls(), [classes, classes.replace("cimmof", "cimmof -uC"), registration])
         self.register("status")
-
-    def test_what_is_not_ours_is_never_replaced_nor_removed(self):
-        fakes.pegasus(self.root, up=True)
-        (self.root / self.link).write_text("somebody else's", encoding="ascii")
-        self.assertIn("no link: not replaced", self.register("install", status=1).stderr)
-        self.register("remove")
-        self.assertEqual((self.root / self.link).read_text(encoding="ascii"), "somebody else's")
-
-    def test_a_named_provider_folder_wins(self):
-        fakes.pegasus(self.root, up=True)
-        where = folder()
-        self.register("--provider-dir", where, "install")
-        self.assertTrue((where / LIBRARY).is_symlink())
-        self.assertFalse((self.root / self.link).is_symlink())
-        self.register("remove")
-        self.assertFalse((where / LIBRARY).is_symlink())
 
     def test_remove_after_the_object_manager_went_takes_back_the_rest(self):
         fakes.pegasus(self.root, up=True)
@@ -227,6 +249,34 @@ class Sfcb(Register):
         self.assertEqual(manager.calls(), [
             "systemctl stop sfcb", "sfcbunstage -n root/cimv2 -r vk-baseserver.reg vk-baseserver.mof", "sfcbrepos -f",
             "systemctl start sfcb"])
+        self.assertEqual(snapshot_of(self.root), before)
+
+    def test_status_notices_that_the_link_is_gone(self):
+        fakes.sfcb(self.root, up=True)
+        self.register("install")
+        self.register("status")
+        (self.root / self.link).unlink()
+        self.assertIn("does not lead to the library", self.register("status", status=1).stdout)
+        self.register("install")
+        self.register("status")
+
+    def test_remove_takes_back_the_links_in_every_folder_that_was_named(self):
+        fakes.sfcb(self.root, up=True)
+        where = folder()
+        self.register("install")
+        self.register("--provider-dir", where, "install")
+        self.register("remove")
+        self.assertFalse((where / LIBRARY).is_symlink())
+        self.assertFalse((self.root / self.link).is_symlink())
+
+    def test_dry_run_of_remove_changes_nothing(self):
+        manager = fakes.sfcb(self.root, up=True)
+        self.register("install")
+        manager.calls()
+        before = snapshot_of(self.root)
+        for line in self.register("--dry-run", "remove").stdout.splitlines():
+            self.assertTrue(line.startswith("would run: "), line)
+        self.assertEqual(manager.calls(), [])
         self.assertEqual(snapshot_of(self.root), before)
 
     def test_the_server_runs_again_after_a_failure(self):
