@@ -2,6 +2,7 @@
 # Puts back the time zone that the provider replaced when daylight saving was switched off or an offset was set. What was
 # there before is kept in one file: the line "vk-zone 1", then for /etc/localtime and for /etc/timezone a line "absent 0",
 # "link LENGTH" or "file LENGTH", that many bytes, and a line end. A file that is not of that form is left alone.
+# There is no per cent sign in it: rpm would take that for one of its macros.
 
 # zone_entry NUMBER: sets kind, length and start (the first byte, counted from 1) of the first or second entry.
 zone_entry() {
@@ -9,9 +10,13 @@ zone_entry() {
     entry=1
     while :; do
         line=$(tail -c "+$start" "$kept" | head -n 1)
-        kind=${line%% *}
+        case $line in
+        "absent "*) kind="absent" ;;
+        "link "*) kind="link" ;;
+        "file "*) kind="file" ;;
+        *) return 1 ;;
+        esac
         length=${line#* }
-        case $kind in absent | link | file) ;; *) return 1 ;; esac
         case $length in "" | *[!0-9]*) return 1 ;; esac
         start=$((start + ${#line} + 1))
         [ "$entry" -lt "$1" ] || return 0

@@ -119,5 +119,11 @@ class BringZoneBack(unittest.TestCase):
             self.assert_nothing_is_left_over()
 
 
+class RpmScripts(unittest.TestCase):
+    def test_hold_nothing_that_rpm_would_expand(self):
+        for path in [SCRIPT, *(SOURCE / "packaging/rpm").glob("*.in")]:
+            self.assertNotIn("%", path.read_text(encoding="utf-8"), path)
+
+
 if __name__ == "__main__":
     unittest.main()
