@@ -8,7 +8,7 @@ from pathlib import Path
 from support import BUILD, folder, run
 
 CHECK = BUILD / "installed/vk-provider-check"
-COMMANDS = {"ps", "ntpd"}
+NOBODY = 65534
 
 
 def make_host(without=()):
@@ -91,18 +91,45 @@ class Check(unittest.TestCase):
         (root / "proc/device-tree/model").write_bytes(b"Board\0")
         self.assertNotIn("hardware tables", missing(check(root)))
 
+    def missing_for_nobody(self, root):
+        """What is missing for a user without rights."""
+        root.chmod(0o755)
+        done = run("setpriv", f"--reuid={NOBODY}", f"--regid={NOBODY}", "--clear-groups", "--inh-caps=-all", CHECK,
+                   "--root", root, "--format", "json", env={"PATH": "/bin:/usr/bin"})
+        if not done.stdout:
+            self.skipTest(f"the program cannot be run as another user here: {done.stderr}")
+        return missing(done)
+
     @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
     def test_knows_what_a_user_without_rights_cannot_do(self):
         root = make_host()
-        root.chmod(0o755)
         (root / "sys/firmware/dmi/tables/DMI").chmod(0o400)
-        done = run("setpriv", "--reuid=65534", "--regid=65534", "--clear-groups", "--inh-caps=-all", CHECK, "--root", root,
-                   "--format", "json", env={"PATH": "/bin:/usr/bin"})
-        if not done.stdout:
-            self.skipTest(f"the program cannot be run as another user here: {done.stderr}")
-        found = missing(done)
+        found = self.missing_for_nobody(root)
         self.assertEqual(set(found), {"hardware tables"} | self.RIGHTS)
         self.assertIn("no right to read it", found["hardware tables"]["detail"])
+
+    @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
+    def test_asks_for_the_right_to_keep_the_zone_that_is_replaced(self):
+        root = make_host()
+        (root / "var/lib").mkdir(parents=True)
+        zone = "right to change the zone"
+        self.assertEqual(self.missing_for_nobody(root)[zone]["detail"],
+                         "/etc and /var/lib/vk/instrumentation cannot be written")
+        os.chown(root / "etc", NOBODY, NOBODY)
+        self.assertEqual(self.missing_for_nobody(root)[zone]["detail"], "/var/lib/vk/instrumentation cannot be written")
+        os.chown(root / "var/lib", NOBODY, NOBODY)
+        self.assertNotIn(zone, self.missing_for_nobody(root))
+        (root / "var/lib/vk/instrumentation").mkdir(parents=True)
+        self.assertIn(zone, self.missing_for_nobody(root))
+        os.chown(root / "var/lib/vk/instrumentation", NOBODY, NOBODY)
+        self.assertNotIn(zone, self.missing_for_nobody(root))
+
+    def test_takes_a_file_for_no_folder_to_write_in(self):
+        root = make_host()
+        (root / "var/lib").mkdir(parents=True)
+        (root / "var/lib/vk").write_bytes(b"")
+        self.assertEqual(missing(check(root))["right to change the zone"]["detail"],
+                         "/var/lib/vk/instrumentation cannot be written")
 
     def test_prints_for_people(self):
         done = run(CHECK, "--root", make_host(without=["bin/ntpd"]), env={"PATH": "/bin"})
