@@ -150,12 +150,13 @@ void failEachCall(const FaultCase& each, Tally& tally, const Check& check) {
                 ++call;
             EXPECT_LE(call, mostCalls) << each.name << ": there is no end to the calls of " << kind;
             if (testing::Test::HasFailure()) return; // one fault's lines are enough
+            if (call == 1) break;                    // no call of that kind, with or without its status
         }
     }
 }
 
 void failAllCalls(const FaultCase& each, Tally& tally, const Check& check) {
-    for (const std::string& kind : om::faultNames()) {
+    for (const std::string& kind : std::set<std::string>(tally.kinds)) {
         runWith(each, {*om::faultKind(kind), 1, true, false}, kind, tally, check);
         if (testing::Test::HasFailure()) return;
     }

@@ -69,7 +69,7 @@ using Check = std::function<void(const std::string& kind, bool unstated, const O
 
 /// Runs the request with one call after the other failing, of every kind, with and without its status.
 void failEachCall(const FaultCase& each, Tally& tally, const Check& check);
-/// Runs the request with every call of a kind failing, for each kind that happens.
+/// Runs the request with every call of a kind failing, for each kind that has happened so far.
 void failAllCalls(const FaultCase& each, Tally& tally, const Check& check);
 
 } // namespace test
