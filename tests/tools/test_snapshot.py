@@ -1,69 +1,11 @@
-"""vk-host-snapshot: what is copied, and that a masked copy tells the same but for what names the machine."""
+"""vk-host-snapshot: what is copied, and where to."""
 
-import json
 import os
-import struct
+import resource
 import unittest
-import uuid
 
-from support import BUILD, folder, run
-
-SNAPSHOT = BUILD / "installed/vk-host-snapshot"
-VKCIM = BUILD / "bin/vkcim"
-SYSTEM_UUID = uuid.UUID("4c4c4544-0043-3010-8052-b4c04f564231")
-
-
-def structure(kind, handle, body, *strings):
-    return struct.pack("<BBH", kind, 4 + len(body), handle) + body + (
-        b"".join(s.encode() + b"\0" for s in strings) + b"\0" if strings else b"\0\0")
-
-
-def table(chassis_serial="CHAS0042", system_serial="CZJ1234567", uuid_bytes=SYSTEM_UUID.bytes_le):
-    system = bytes([1, 2, 0, 3]) + uuid_bytes + bytes([6, 0, 0])
-    chassis = bytes([1, 23, 0, 2, 3, 3, 3, 3, 2]) + bytes(4) + bytes([0, 0, 0, 0])
-    memory = bytearray(0x1C - 4)
-    memory[0x18 - 4], memory[0x19 - 4] = 1, 2
-    return b"".join([structure(1, 1, system, "Example", "RX200", system_serial),
-                     structure(3, 3, chassis, "Example", chassis_serial, "ASSET-77"),
-                     structure(11, 4, bytes([1]), f"service tag {system_serial}"),
-                     structure(17, 5, bytes(memory), "8F3A2B1C", "To Be Filled By O.E.M."),
-                     structure(221, 6, b"\x01hidden " + system_serial.encode(), "OEM 12345678"),
-                     structure(127, 7, b"")])
-
-
-def entry_point(length, version=(2, 7)):
-    inner = struct.pack("<5sBHIHB", b"_DMI_", 0, length, 0, 6, 0x27)
-    inner = inner[:5] + bytes([-sum(inner) & 0xFF]) + inner[6:]
-    outer = struct.pack("<4sBBBBHB5s", b"_SM_", 0, 31, *version, 200, 0, bytes(5)) + inner
-    return outer[:4] + bytes([-sum(outer) & 0xFF]) + outer[5:]
-
-
-def make_host(data=None, version=(2, 7), **files):
-    root = folder()
-    data = table() if data is None else data
-    contents = {"sys/firmware/dmi/tables/DMI": data,
-                "sys/firmware/dmi/tables/smbios_entry_point": entry_point(len(data), version),
-                "sys/class/dmi/id/product_serial": b"CZJ1234567\n",
-                "sys/class/dmi/id/product_uuid": f"{SYSTEM_UUID}\n".upper().encode(),
-                "etc/hostname": b"node7\n", "etc/machine-id": b"0123456789abcdef0123456789abcdef\n",
-                "etc/machine-info": b'PRIMARY_OWNER_NAME="Operations"\n', "usr/share/zoneinfo/Europe/Berlin": b"TZif2...",
-                "sys/devices/system/edac/mc/mc0/ue_count": b"0\n", **files}
-    for name, content in contents.items():
-        (root / name).parent.mkdir(parents=True, exist_ok=True)
-        (root / name).write_bytes(content)
-    os.symlink("/usr/share/zoneinfo/Europe/Berlin", root / "etc/localtime")
-    return root
-
-
-def take(root, *words):
-    target = folder() / "copy"
-    return target, run(SNAPSHOT, "--root", root, *words, target)
-
-
-def properties(root, name):
-    done = run(VKCIM, "--format", "json", "instances", name,
-               env={"VK_INSTRUMENTATION_ROOT": str(root), "NVLOG_SINK": "none", "PATH": "/usr/bin:/bin"})
-    return {k: v["value"] for k, v in json.loads(done.stdout)["results"][0]["properties"].items()}
+from hosts import SNAPSHOT, make_host, program, properties, take
+from support import files_below, folder, run, snapshot_of
 
 
 class Plain(unittest.TestCase):
@@ -104,82 +46,108 @@ class Plain(unittest.TestCase):
         self.assertIn("/sys/firmware/dmi/tables/DMI: Permission denied", done.stderr)
 
 
-class Masked(unittest.TestCase):
-    SECRETS = [b"CZJ1234567", b"CHAS0042", b"ASSET-77", b"8F3A2B1C", b"12345678", SYSTEM_UUID.bytes_le, SYSTEM_UUID.bytes,
-               str(SYSTEM_UUID).encode(), str(SYSTEM_UUID).upper().encode(), b"0123456789abcdef0123456789abcdef"]
+class Folder(unittest.TestCase):
+    """Where a snapshot is written to, and who can read it."""
 
-    def test_holds_nothing_that_names_the_machine(self):
-        target, done = take(make_host(), "--mask")
-        self.assertEqual(done.returncode, 0, done.stderr)
-        for path in target.rglob("*"):
-            if path.is_file():
-                for secret in self.SECRETS:
-                    self.assertNotIn(secret, path.read_bytes(), path)
+    def refused(self, target, *said):
+        done = run(SNAPSHOT, "--root", make_host(), target)
+        self.assertEqual(done.returncode, 2, done.stderr)
+        for text in said:
+            self.assertIn(text, done.stderr)
 
-    def test_keeps_lengths_shapes_and_checksums(self):
-        root = make_host()
-        target, _ = take(root, "--mask")
-        folder_of_tables = "sys/firmware/dmi/tables"
-        before, after = ((r / folder_of_tables / "DMI").read_bytes() for r in (root, target))
-        self.assertEqual(len(before), len(after))
-        point = (target / folder_of_tables / "smbios_entry_point").read_bytes()
-        self.assertEqual(sum(point[:31]) & 0xFF, 0)
-        self.assertEqual(sum(point[16:31]) & 0xFF, 0)
-        self.assertRegex(properties(target, "VESKA_PhysicalPackage")["SerialNumber"], r"^[A-Z]{4}\d{4}$")
+    @unittest.skipIf(os.geteuid() != 0, "takes root to give a folder to somebody else")
+    def test_somebody_elses_is_refused(self):
+        target = folder()
+        os.chown(target, 65534, 65534)
+        self.refused(target, f"{target} belongs to somebody else")
+        self.assertEqual(list(target.iterdir()), [])
 
-    def test_tells_the_same_but_for_serial_numbers_and_uuids(self):
-        root = make_host()
-        target, _ = take(root, "--mask")
-        for name, changed in [("VESKA_ComputerSystem", {"UUID", "OtherIdentifyingInfo"}),
-                              ("VESKA_PhysicalPackage", {"Tag", "SerialNumber"})]:
-            before, after = properties(root, name), properties(target, name)
-            self.assertEqual({k for k in before if before[k] != after[k]}, changed)
-            self.assertEqual(before.keys(), after.keys())
+    def test_one_open_to_others_is_refused(self):
+        for mode in (0o755, 0o750, 0o701, 0o733):
+            target = folder()
+            target.chmod(mode)
+            self.refused(target, f"{target} is open to others", "chmod 700")
+            self.assertEqual((list(target.iterdir()), target.stat().st_mode & 0o777), ([], mode))
 
-    def test_masks_the_same_by_the_same_in_every_source(self):
-        for version, data in [((2, 7), table()), ((2, 5), table(uuid_bytes=SYSTEM_UUID.bytes))]:
-            target, _ = take(make_host(data, version), "--mask")
-            told = properties(target, "VESKA_ComputerSystem")["UUID"]
-            in_file = (target / "sys/class/dmi/id/product_uuid").read_text(encoding="ascii").strip()
-            self.assertEqual(in_file, told.upper(), version)
-            serial = (target / "sys/class/dmi/id/product_serial").read_text(encoding="ascii").strip()
-            self.assertIn(serial.encode(), (target / "sys/firmware/dmi/tables/DMI").read_bytes())
+    def test_a_link_is_refused(self):
+        elsewhere, link = folder(), folder() / "link"
+        link.symlink_to(elsewhere)
+        self.refused(link, "link: Not a directory")
+        self.refused(f"{link}/", "link: Not a directory")
+        self.assertEqual(list(elsewhere.iterdir()), [])
 
-    def test_leaves_what_says_nothing(self):
-        data = table(chassis_serial="To Be Filled By O.E.M.", system_serial="0123456789", uuid_bytes=b"\xff" * 16)
-        root = make_host(data, **{"sys/class/dmi/id/product_serial": b"0123456789\n"})
-        target, _ = take(root, "--mask")
-        told = properties(target, "VESKA_PhysicalPackage")
-        self.assertNotIn("SerialNumber", told)
-        copy = (target / "sys/firmware/dmi/tables/DMI").read_bytes()
-        self.assertIn(b"To Be Filled By O.E.M.", copy)
-        self.assertIn(b"0123456789", copy)
-        self.assertIn(b"\xff" * 16, copy)
+    def test_what_others_put_into_it_meanwhile_is_not_followed(self):
+        for planted, written in [("etc", "etc/hostname"), ("proc", "proc/sys/kernel/arch"), ("file", "file")]:
+            place, elsewhere = folder() / "copy", folder()
+            target = program().Target(place)
+            (place / planted).symlink_to(elsewhere if planted != "file" else elsewhere / "made")
+            for write in (target.write, target.link):
+                with self.assertRaises(FileExistsError) as caught:
+                    write(written, b"secret")
+                self.assertEqual(caught.exception.filename, str(place / written))
+            self.assertEqual(list(elsewhere.iterdir()), [])
 
-    def test_survives_damaged_tables(self):
-        whole = table()
-        for cut in range(0, len(whole), 7):
-            target, done = take(make_host(whole[:cut]), "--mask")
+    def test_a_folder_made_before_is_not_taken_for_its_own(self):
+        place = folder() / "copy"
+        target = program().Target(place)
+        (place / "etc").mkdir()
+        self.assertRaises(FileExistsError, target.write, "etc/hostname", b"secret")
+        self.assertEqual(list((place / "etc").iterdir()), [])
+
+    def test_all_in_it_is_closed_to_others(self):
+        root = make_host(**{"sys/class/dmi/id/product_name": b"RX200\n"})
+        for parents, empty in [("copy", False), ("deep/copy", False), ("copy", True)]:
+            target = folder() / parents
+            if empty:
+                target.mkdir(mode=0o700)
+            done = run("sh", "-c", 'umask 0; exec "$@"', "sh", SNAPSHOT, "--root", root, target)
             self.assertEqual(done.returncode, 0, done.stderr)
-            self.assertEqual((target / "sys/firmware/dmi/tables/DMI").stat().st_size, cut)
+            found = {str(p.relative_to(target)): p.stat().st_mode & 0o777 for p in target.rglob("*") if not p.is_symlink()}
+            for name in ("etc/machine-id", "sys/class/dmi/id/product_serial", "sys/firmware/dmi/tables/DMI"):
+                self.assertEqual(found[name], 0o600)
+            self.assertEqual({m for n, m in found.items() if (target / n).is_dir()}, {0o700})
+            self.assertEqual({m for n, m in found.items() if not (target / n).is_dir()}, {0o600})
+            self.assertEqual({target.stat().st_mode & 0o777, target.parent.stat().st_mode & 0o777}, {0o700})
 
-    def test_writes_another_host_name_on_request(self):
-        target, _ = take(make_host(), "--host-name", "other")
-        self.assertEqual((target / "etc/hostname").read_text(encoding="ascii"), "other\n")
+    def test_the_example_is_not_where_everybody_writes(self):
+        self.assertNotIn("/tmp", run(SNAPSHOT, "--help").stdout)
 
 
-@unittest.skipUnless(os.environ.get("VK_TEST_HOSTS"), "VK_TEST_HOSTS names no snapshots of real machines")
-class RealMachines(unittest.TestCase):
-    def test_masked_ones_tell_the_same_but_for_serial_numbers_and_uuids(self):
-        for name in sorted(os.listdir(os.environ["VK_TEST_HOSTS"])):
-            with self.subTest(name):
-                root = os.path.join(os.environ["VK_TEST_HOSTS"], name)
-                target, done = take(root, "--mask")
-                self.assertEqual(done.returncode, 0, done.stderr)
-                before, after = (properties(r, "VESKA_ComputerSystem") for r in (root, target))
-                changed = {k for k in before if before[k] != after.get(k)}
-                self.assertLessEqual(changed, {"UUID", "OtherIdentifyingInfo"})
-                self.assertEqual(before.keys(), after.keys())
+class Failure(unittest.TestCase):
+    def test_a_root_that_is_no_folder_is_refused(self):
+        target = folder() / "copy"
+        for root in ("/nonexistent", SNAPSHOT):
+            done = run(SNAPSHOT, "--root", root, target)
+            self.assertEqual(done.returncode, 2)
+            self.assertIn(f"{root} is no folder", done.stderr)
+            self.assertFalse(target.exists())
+
+    def test_a_write_error_names_the_file_and_leaves_nothing(self):
+        root = make_host(**{"etc/timezone": b"x" * 5000})
+        for limit, name in [(0, "sys/firmware/dmi/tables/smbios_entry_point"), (4096, "etc/timezone")]:
+            for parent in (folder(), folder() / "deep"):
+                before = snapshot_of(parent.parent if parent.name == "deep" else parent)
+                target = parent / "copy"
+                done = run(SNAPSHOT, "--root", root, target,
+                           preexec_fn=lambda limit=limit: resource.setrlimit(resource.RLIMIT_FSIZE, (limit, limit)))
+                self.assertEqual(done.returncode, 1, done.stderr)
+                self.assertEqual(done.stderr, f"vk-host-snapshot: {target}/{name}: File too large; "
+                                              "nothing is left of the snapshot\n")
+                self.assertEqual(snapshot_of(parent.parent if parent.name == "deep" else parent), before)
+
+    def test_a_write_error_leaves_a_folder_that_was_there(self):
+        target = folder()
+        done = run(SNAPSHOT, "--root", make_host(), target,
+                   preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (0, 0)))
+        self.assertEqual((done.returncode, list(target.iterdir())), (1, []))
+
+    def test_what_cannot_be_removed_is_called_incomplete(self):
+        place = folder() / "copy"
+        target = program().Target(place)
+        target.write("etc/hostname", b"node7")
+        (place / "etc/other").write_bytes(b"")
+        self.assertFalse(target.remove())
+        self.assertEqual([p.name for p in files_below(place)], ["other"])
 
 
 if __name__ == "__main__":
