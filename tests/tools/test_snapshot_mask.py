@@ -222,7 +222,7 @@ class Texts(unittest.TestCase):
     def test_a_uuid_in_another_shape_is_masked(self):
         for text in (f"urn:uuid:{SYSTEM_UUID}", f"{{{SYSTEM_UUID}}}", SYSTEM_UUID.hex, "4c4c4544-0043-3010"):
             masked = self.of_file("sys/class/dmi/id/product_uuid", text.encode() + b"\n")
-            self.assertNotIn(b"3010", masked)
+            self.assertNotIn(b"4c4c4544", masked)
             self.assertEqual(len(masked), len(text) + 1)
 
     def test_sysinfo_keeps_what_many_machines_have(self):
@@ -240,7 +240,7 @@ class Texts(unittest.TestCase):
         self.assertEqual(done.returncode, 0, done.stderr)
         copy = (target / "proc/sysinfo").read_text(encoding="ascii")
         for secret in ("AB1C7", "PROD0815", "Payroll", "82038f2a", "2a7250be2076", "LINUX042", "ZSPECIAL", "acme",
-                       str(SYSTEM_UUID), "own", "  02", "  17"):
+                       str(SYSTEM_UUID), "a line of its own", "  02", "  17"):
             self.assertIn(secret, text)
             self.assertNotIn(secret, copy)
         masked = copy.split("\n")
