@@ -122,6 +122,14 @@ TEST(CMPIComputerSystemPackage, LeadsFromAComputerToAllItsChassisAndBack) {
     EXPECT_THAT(tags, ElementsAre("A", "B"));
 }
 
+TEST(CMPIComputerSystemPackage, LeadsFromAChassisNowhereOnAHostWithoutComputer) {
+    test::simulate({test::chassis(0, 0, "A")});
+    const om::Answer answer = test::associatorNames(test::path("VESKA_PhysicalPackage"), className);
+    EXPECT_THAT(answer.results, IsEmpty());
+    EXPECT_EQ(answer.code, CMPI_RC_OK);
+    EXPECT_TRUE(answer.done);
+}
+
 TEST(CMPIComputerSystemPackage, ReachesOnlyTheClassAtTheOtherEndInAnyLetterCase) {
     test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
     const auto count = [](const om::ObjectPath& source, const char* resultClass) {

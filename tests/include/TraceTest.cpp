@@ -51,6 +51,13 @@ TEST(Trace, PrintsANullValueAsNull) {
                  "VARIABLE: 'resultClass' has Value '(null)' at line 1 in f");
 }
 
+TEST(Trace, PrintsANullFileOrFunctionAsNull) {
+    const char* const none = nullptr;
+    EXPECT_STREQ(trace(none, none, 7U, ENTERING), "ENTERING: (null)() in (null) [Line: 7]");
+    EXPECT_STREQ(tracepara(none, none, 7U, none, EXITING),
+                 "EXITING: (null)() in (null) [Line: 7],Parameters List: (null)");
+}
+
 TEST(Trace, AnswersAnAllZeroBufferForAnUnknownType) {
     trace("file", "function", 1U, ENTERING);
     const char* text = trace("file", "function", 1U, static_cast<MessageType>(4));
