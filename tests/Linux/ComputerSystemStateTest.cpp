@@ -57,11 +57,13 @@ TEST(ComputerSystem, TellsAPredictiveFailure) {
 }
 
 TEST(ComputerSystem, AppendsTheOperationalStatusToWhatTheCallerHas) {
-    test::simulateOne([](test::Node&) {});
-    const ComputerSystem system;
-    Numbers states = {9};
-    EXPECT_TRUE(system.getOperationalStatus(states));
-    EXPECT_THAT(states, ElementsAre(9, 2, 11));
+    const std::pair<unsigned, Numbers> expected[] = {{0, {9, 0}}, {1, {9, 2, 11}}, {20, {9, 3, 5}}, {21, {9, 3}}};
+    for (const auto& [status, wanted] : expected) {
+        test::simulateOne([status = status](test::Node& node) { node.status = status; });
+        Numbers states = {9};
+        EXPECT_TRUE(ComputerSystem().getOperationalStatus(states));
+        EXPECT_EQ(states, wanted) << "status " << status;
+    }
 }
 
 TEST(ComputerSystem, TellsTheEnabledStateFromThePowerState) {
