@@ -23,6 +23,16 @@ TEST(EnabledLogicalElementCapabilities, AreOneForEachComputerNamedByItsPath) {
     EXPECT_THAT(instanceIDs(capabilities), testing::ElementsAre("/computer/0", "/computer/1"));
 }
 
+TEST(EnabledLogicalElementCapabilities, TellTheInstanceIDInTheLog) {
+    test::simulate({test::computer(0, "node7")});
+    const EnabledLogicalElementCapabilities capabilities;
+    test::takeLog();
+    std::string id;
+    EXPECT_TRUE(capabilities.getInstanceID(id));
+    EXPECT_THAT(test::takeLog(), testing::Contains(testing::ContainsRegex(
+                                     " LOG 4000 .*: VARIABLE: 'instanceID' has Value '/computer/0' at line")));
+}
+
 TEST(EnabledLogicalElementCapabilities, StayOnTheNodeWhoseInstanceIDTheFilterNames) {
     test::simulate({test::computer(0, "node7")});
     EnabledLogicalElementCapabilities named;
