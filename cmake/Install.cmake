@@ -9,7 +9,7 @@ string(REPEAT "/." 200 room)
 set_target_properties(${runtime_libraries} PROPERTIES BUILD_RPATH "$ORIGIN${room}" INSTALL_RPATH "$ORIGIN")
 
 # Debug information names the sources from the tree's root on, not where the tree lay when it was built.
-foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkinstrumentation_inside om_schema om_broker vkcim_core vkcim)
+foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_core vkcim)
     target_compile_options(${target} PRIVATE
         -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)
 endforeach()

@@ -1,5 +1,5 @@
 // The two readers of date-times, the object manager's and the instrumentation's: each alone, and against each other.
-#include "instrumentation/CimDateTime.h"
+#include "common/CimDateTime.h"
 #include "objectmanager/model/DateTime.h"
 #include "vk/DateTime.h"
 
@@ -21,17 +21,17 @@ void tryInstant(const std::string& text, std::int64_t microseconds) {
     const auto printed = om::formatInstant(microseconds);
     // An offset can move the first or last hours into a year of five digits, or before the year 0.
     if (printed) expect(om::microseconds(*printed) == microseconds, "the printed instant is another one", text);
-    const auto parsed = VK::Inside::parseCimDateTime(text);
+    const auto parsed = VK::parseCimDateTime(text);
     expect(parsed.has_value(), "only the object manager knows the instant", text);
     expect(parsed->seconds * microsecondsPerSecond + parsed->microseconds == microseconds, "two instants", text);
     if (!printed) return;
     if (parsed->microseconds == 0)
         expect(std::string(VK::DateTime(parsed->seconds, 3)) == *printed, "the common library prints another", text);
-    expect(VK::Inside::formatCimDateTime(*parsed, 0) == *printed, "the instrumentation prints another", text);
+    expect(VK::formatCimDateTime(*parsed, 0) == *printed, "the instrumentation prints another", text);
 }
 
 void tryText(const std::string& text) {
-    const auto parsed = VK::Inside::parseCimDateTime(text);
+    const auto parsed = VK::parseCimDateTime(text);
     if (!om::isDateTime(text)) return expect(!parsed, "only the instrumentation takes it", text);
     expect(text.size() == 25, "of another length", text);
     const auto microseconds = om::microseconds(text);

@@ -1,13 +1,14 @@
+#include "common/Text.h"
 #include "fuzz/Expect.h"
-#include "instrumentation/HostText.h"
-#include "instrumentation/Smbios.h"
+#include "host/Smbios.h"
 
 #include <algorithm>
 #include <tuple>
 
 namespace {
 
-using namespace VK::Inside;
+using namespace VK;
+using namespace VK::Host;
 using fuzz::expect;
 
 /// An entry point of version 3 without a fault, so that the table's parser is reached whatever the table is.

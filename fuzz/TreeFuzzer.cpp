@@ -1,11 +1,11 @@
 #include "fuzz/Expect.h"
-#include "instrumentation/TreeText.h"
+#include "tree/TreeText.h"
 
 #include <tuple>
 
 namespace {
 
-using namespace VK::Inside;
+using namespace VK::Tree;
 using fuzz::expect;
 
 auto allOf(const Node& node) {

@@ -1,12 +1,12 @@
 #include "fuzz/Expect.h"
-#include "instrumentation/ZoneFile.h"
+#include "zone/ZoneFile.h"
 
 #include <algorithm>
 #include <cstdint>
 
 namespace {
 
-using namespace VK::Inside;
+using namespace VK::Zone;
 using fuzz::expect;
 using namespace std::literals;
 
@@ -32,12 +32,12 @@ bool isPossible(std::int32_t offset) {
     return -longestOffset <= offset && offset <= longestOffset;
 }
 
-void checkZone(const Zone& zone, const std::vector<std::int64_t>& instants) {
+void checkZone(const TimeZone& zone, const std::vector<std::int64_t>& instants) {
     // From the last instant to the first: daylight saving that is still to come has been seen already.
     bool daylightLater = false;
     bool saidLater = false;
     for (auto instant = instants.rbegin(); instant != instants.rend(); ++instant) {
-        const Zone::LocalTime time = zone.at(*instant);
+        const TimeZone::LocalTime time = zone.at(*instant);
         const std::int32_t standard = zone.standardOffsetAt(*instant);
         const bool said = zone.hasDaylightSavingFrom(*instant);
         daylightLater = daylightLater || time.daylight;
@@ -49,9 +49,9 @@ void checkZone(const Zone& zone, const std::vector<std::int64_t>& instants) {
     }
 }
 
-void checkSame(const Zone& one, const Zone& other, const std::vector<std::int64_t>& instants) {
+void checkSame(const TimeZone& one, const TimeZone& other, const std::vector<std::int64_t>& instants) {
     for (const std::int64_t instant : instants) {
-        const Zone::LocalTime time = one.at(instant);
+        const TimeZone::LocalTime time = one.at(instant);
         expect(time.offset == other.at(instant).offset && time.daylight == other.at(instant).daylight,
                "another time the second time");
         expect(one.standardOffsetAt(instant) == other.standardOffsetAt(instant), "another standard offset");

@@ -2,7 +2,7 @@
 
 #include "objectmanager/vkcim/Arguments.h"
 
-#include "vk/HostFacts.h"
+#include "vk/HostNotes.h"
 
 #include <dlfcn.h>
 
@@ -17,9 +17,12 @@ std::vector<std::string> hostNotes(const std::string& provider) {
     const std::unique_ptr<void, int (*)(void*)> library(dlopen("libvkinstrumentation.so.1", RTLD_NOW | RTLD_NOLOAD),
                                                         &dlclose);
     if (!library) return {};
-    // VK::hostNotes() as compilers with libstdc++ spell it.
-    void* const found = dlsym(library.get(), "_ZN2VK9hostNotesB5cxx11Ev");
-    return found ? reinterpret_cast<decltype(&VK::hostNotes)>(found)() : std::vector<std::string>();
+    const auto ask = reinterpret_cast<decltype(&vkHostNotes)>(dlsym(library.get(), "vkHostNotes"));
+    std::vector<std::string> notes;
+    if (ask != nullptr)
+        ask([](void* list, const char* note) { static_cast<std::vector<std::string>*>(list)->emplace_back(note); },
+            &notes);
+    return notes;
 }
 
 } // namespace vkcim

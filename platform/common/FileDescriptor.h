@@ -6,7 +6,7 @@
 namespace VK {
 
 /// Owns a descriptor; -1 is none.
-class __attribute__((visibility("hidden"))) FileDescriptor {
+class FileDescriptor {
 public:
     explicit FileDescriptor(int descriptor = -1) noexcept : fd(descriptor) {}
     FileDescriptor(FileDescriptor&& other) noexcept : fd(other.release()) {}

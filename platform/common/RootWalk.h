@@ -12,7 +12,7 @@ namespace VK {
 /// Follows a path below a directory one name at a time, symbolic links by hand, without ever leaving the directory,
 /// also while somebody renames what is being walked. What the kernel's RESOLVE_IN_ROOT does, for kernels and sandboxes
 /// without it, and with the names walked through.
-class __attribute__((visibility("hidden"))) RootWalk {
+class RootWalk {
 public:
     explicit RootWalk(FileDescriptor rootDirectory) : root(std::move(rootDirectory)) {}
 

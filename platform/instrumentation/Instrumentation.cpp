@@ -1,21 +1,18 @@
 #include "vk/Instrumentation.h"
 
-#include "instrumentation/Cursor.h"
+#include "tree/Cursor.h"
 
 #include <utility>
 
 namespace VK {
 
-class __attribute__((visibility("hidden"))) Instrumentation::Cursor : public Inside::Cursor {
-public:
-    Cursor() : Inside::Cursor(Inside::Host::current()) {}
-};
+class Instrumentation::Cursor : public Tree::Cursor {};
 
 namespace {
 
 /// Hands out a property that is of the kind asked for.
 template <typename T>
-bool take(std::optional<Inside::Value>&& found, T& value) {
+bool take(std::optional<Tree::Value>&& found, T& value) {
     T* const content = found ? std::get_if<T>(&*found) : nullptr;
     if (content != nullptr) value = std::move(*content);
     return content != nullptr;

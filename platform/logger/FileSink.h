@@ -2,8 +2,6 @@
 
 #include <string_view>
 
-#pragma GCC visibility push(hidden)
-
 namespace NVLog {
 
 /// Appends a line to the file at `path`, made with mode 0640 where it is missing, and opened again when another
@@ -11,5 +9,3 @@ namespace NVLog {
 bool appendToFile(const char* path, std::string_view line) noexcept;
 
 } // namespace NVLog
-
-#pragma GCC visibility pop

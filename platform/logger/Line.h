@@ -6,8 +6,6 @@
 #include <ctime>
 #include <string_view>
 
-#pragma GCC visibility push(hidden)
-
 namespace NVLog {
 
 /// A text that grows without ever throwing: short ones need no memory of their own, and a text for which there is
@@ -56,5 +54,3 @@ void appendTime(Line& line, const timespec& now) noexcept;
 void appendEvent(Line& line, const Event& event) noexcept;
 
 } // namespace NVLog
-
-#pragma GCC visibility pop

@@ -6,8 +6,6 @@
 #include <string>
 #include <string_view>
 
-#pragma GCC visibility push(hidden)
-
 namespace NVLog {
 
 /// A text that is collected piece by piece, and a stream that appends to it.
@@ -97,5 +95,3 @@ private:
 };
 
 } // namespace NVLog
-
-#pragma GCC visibility pop

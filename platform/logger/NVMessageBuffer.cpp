@@ -10,7 +10,7 @@ namespace NVLog {
 
 /// What a buffer collects into. It outlives the buffer and serves the next one, so that a log line allocates no memory
 /// and makes no stream; the pool, and with it whatever is unused, goes when the library is unloaded.
-struct __attribute__((visibility("hidden"))) NVMessageBuffer::Storage : MessageText {
+struct NVMessageBuffer::Storage : MessageText {
     static Pool<Storage> pool;
     std::atomic<bool>* free = nullptr;
 };

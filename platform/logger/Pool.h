@@ -5,8 +5,6 @@
 #include <cstddef>
 #include <cstdint>
 
-#pragma GCC visibility push(hidden)
-
 namespace NVLog {
 
 /// Objects that wait to be used, for all threads, without locks: one takes any that nobody uses and gives it back, or
@@ -65,5 +63,3 @@ private:
 };
 
 } // namespace NVLog
-
-#pragma GCC visibility pop

@@ -5,8 +5,6 @@
 #include <climits>
 #include <cstddef>
 
-#pragma GCC visibility push(hidden)
-
 namespace NVLog {
 
 enum class Channel { Log, Trace };
@@ -55,5 +53,3 @@ inline const Settings& currentSettings() noexcept {
 }
 
 } // namespace NVLog
-
-#pragma GCC visibility pop

@@ -2,8 +2,6 @@
 
 #include <string_view>
 
-#pragma GCC visibility push(hidden)
-
 namespace NVLog {
 
 /// Writes a line, which brings its line feed along, with one write. False when not all of it was taken: a full disk,
@@ -12,5 +10,3 @@ namespace NVLog {
 bool writeLine(int descriptor, std::string_view line) noexcept;
 
 } // namespace NVLog
-
-#pragma GCC visibility pop

@@ -37,11 +37,11 @@ std::string withFinalSlash(std::string path) {
 
 std::string readUid() {
     const std::string machineId = readMachineId();
-    return uniqueIdentifier(machineId.empty() && hostUuid != nullptr ? hostUuid() : machineId);
+    return uniqueIdentifier(machineId.empty() ? hostUuid() : machineId);
 }
 
 Facts readFacts() {
-    const ProductOverrides given = productOverrides != nullptr ? productOverrides() : ProductOverrides();
+    const ProductOverrides& given = productOverrides();
     return {given.architecture ? *given.architecture : architectureOf(Root::host()),
             withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
             given.uid ? *given.uid : readUid()};

@@ -5,8 +5,6 @@
 #include <cstdint>
 #include <string_view>
 
-#pragma GCC visibility push(hidden)
-
 namespace VK {
 
 using Sha256Digest = std::array<std::uint8_t, 32>;
@@ -32,5 +30,3 @@ private:
 Sha256Digest hmacSha256(std::string_view key, std::string_view message);
 
 } // namespace VK
-
-#pragma GCC visibility pop

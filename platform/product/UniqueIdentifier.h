@@ -2,8 +2,6 @@
 
 #include <string>
 
-#pragma GCC visibility push(hidden)
-
 namespace VK {
 
 /// The product's identifier for the host that `secret` names, as a UUID of version 8 (made by a rule of our own): the
@@ -11,5 +9,3 @@ namespace VK {
 std::string uniqueIdentifier(const std::string& secret);
 
 } // namespace VK
-
-#pragma GCC visibility pop

@@ -3,13 +3,9 @@
 #include <string>
 #include <string_view>
 
-#pragma GCC visibility push(hidden)
-
 namespace VK {
 
 /// Widens UTF-8. A byte that belongs to no well-formed character becomes U+FFFD.
 std::wstring widen(std::string_view text);
 
 } // namespace VK
-
-#pragma GCC visibility pop

@@ -1,7 +1,5 @@
 #pragma once
 
-#pragma GCC visibility push(hidden)
-
 namespace VK {
 
 /// The identifier of a class, compared without regard to case; ProviderUtilities::CLASS_ID_UNKNOWN for null and for
@@ -9,5 +7,3 @@ namespace VK {
 unsigned short findClassId(const char* className);
 
 } // namespace VK
-
-#pragma GCC visibility pop

@@ -6,8 +6,6 @@
 #include <optional>
 #include <string>
 
-#pragma GCC visibility push(hidden)
-
 /// What every use of a broker needs: statuses, slots that may be missing, texts. Slots are called by themselves,
 /// because the macros differ between the standard's versions.
 namespace VK::Cmpi {
@@ -65,5 +63,3 @@ void noteUntold(const char* function, int line, const char* what, const CMPIStat
 bool refused(const char* function, int line, const std::string& what, const char* name, const CMPIStatus& status);
 
 } // namespace VK::Cmpi
-
-#pragma GCC visibility pop

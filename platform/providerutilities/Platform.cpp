@@ -5,7 +5,7 @@
 namespace VK {
 
 bool ProviderUtilities::isKVM() {
-    return hostIsKVM != nullptr && hostIsKVM();
+    return hostIsKVM();
 }
 
 } // namespace VK

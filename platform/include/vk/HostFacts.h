@@ -4,8 +4,7 @@
 #include <string>
 #include <vector>
 
-// For the product's other libraries, beside the operations of vk/Instrumentation.h. A library that stands in for this
-// one need not have them: whoever calls one looks first whether it is there.
+// What the product's libraries share about the host, beside the operations of vk/Instrumentation.h.
 namespace VK {
 
 /// What a simulated host's file says of the product instead of the real host.
@@ -18,16 +17,16 @@ struct ProductOverrides {
 
 /// The overrides of the simulated host's file as it stood when first asked for; all absent when the process's host is
 /// not a simulated one (vk/HostSource.h), or its file cannot be read.
-[[gnu::weak]] const ProductOverrides& productOverrides();
+const ProductOverrides& productOverrides();
 
 /// The system's UUID as this machine's or the snapshot's files tell it; empty where they do not. What a simulated
 /// host's file holds of its computer does not count.
-[[gnu::weak]] const std::string& hostUuid();
+const std::string& hostUuid();
 
 /// Whether the host is a KVM virtual machine; found out once per process. A simulated host's file may say so. This
 /// machine: CPUID says KVMKVMKVM (x86), or the firmware's system product name starts with KVM, or its system
 /// manufacturer with QEMU. A snapshot: the firmware's names alone.
-[[gnu::weak]] bool hostIsKVM();
+bool hostIsKVM();
 
 /// For people: one line for each thing that the host could not tell, and why: it lacks the source, or we may not see
 /// it; then one on time, zone, daylight saving and whether the NTP daemon runs, and one where the CIM server's

@@ -2,7 +2,6 @@
 
 #pragma GCC visibility push(default) // so that the libraries' calls arrive here
 #include "nvlog/NVLogger.h"
-#pragma GCC visibility pop
 
 #include <utility>
 

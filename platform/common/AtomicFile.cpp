@@ -1,0 +1,100 @@
+#include "common/AtomicFile.h"
+
+#include "common/FileDescriptor.h"
+
+#include <cerrno>
+#include <csignal>
+#include <cstdio>
+#include <ctime>
+#include <fcntl.h>
+#include <pthread.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace VK {
+
+namespace {
+
+/// The name of what is not in place yet. One left over from a crash is overwritten.
+std::string besides(const std::string& name) {
+    return "." + name + ".vk-new";
+}
+
+/// Keeps the signal of a write beyond the process's file size limit from it, which would end it.
+class SizeLimitSignal {
+public:
+    SizeLimitSignal() noexcept {
+        sigemptyset(&ours);
+        sigaddset(&ours, SIGXFSZ);
+        pthread_sigmask(SIG_BLOCK, &ours, &before);
+    }
+    ~SizeLimitSignal() { pthread_sigmask(SIG_SETMASK, &before, nullptr); }
+    SizeLimitSignal(const SizeLimitSignal&) = delete;
+    SizeLimitSignal& operator=(const SizeLimitSignal&) = delete;
+
+    /// Takes back the signal that the failed write sent to this thread, unless the thread had it blocked anyway.
+    void takeBack() const noexcept {
+        if (sigismember(&before, SIGXFSZ) == 1) return;
+        const timespec atOnce{};
+        while (sigtimedwait(&ours, nullptr, &atOnce) < 0 && errno == EINTR) {
+        }
+    }
+
+private:
+    sigset_t ours{};
+    sigset_t before{};
+};
+
+int writeAll(int fd, const std::string& bytes) {
+    const SizeLimitSignal signal;
+    std::size_t done = 0;
+    while (done < bytes.size()) {
+        const ssize_t count = ::write(fd, bytes.data() + done, bytes.size() - done);
+        if (count >= 0) {
+            done += static_cast<std::size_t>(count);
+        } else if (const int error = errno; error != EINTR) {
+            if (error == EFBIG) signal.takeBack();
+            return error;
+        }
+    }
+    return 0;
+}
+
+int fill(int fd, const std::string& bytes, const FileOwner& owner) {
+    if (const int error = writeAll(fd, bytes); error != 0) return error;
+    // Giving a file away takes a privilege; without it the file stays ours.
+    if (fchown(fd, owner.user, owner.group) != 0 && errno != EPERM) return errno;
+    if (fchmod(fd, owner.mode) != 0) return errno;
+    return fsync(fd) == 0 ? 0 : errno;
+}
+
+int putInPlace(int folder, const std::string& from, const std::string& to) {
+    if (renameat(folder, from.c_str(), folder, to.c_str()) != 0) return errno;
+    // The rename is done: a folder that cannot be synchronised does not undo it.
+    fsync(folder);
+    return 0;
+}
+
+} // namespace
+
+int replaceFile(int folder, const std::string& name, const std::string& bytes, const FileOwner& owner) {
+    const std::string fresh = besides(name);
+    if (unlinkat(folder, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
+    const FileDescriptor fd(openat(folder, fresh.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
+    if (!fd) return errno;
+    int error = fill(fd.get(), bytes, owner);
+    if (error == 0) error = putInPlace(folder, fresh, name);
+    if (error != 0) unlinkat(folder, fresh.c_str(), 0);
+    return error;
+}
+
+int replaceLink(int folder, const std::string& name, const std::string& target) {
+    const std::string fresh = besides(name);
+    if (unlinkat(folder, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
+    if (symlinkat(target.c_str(), folder, fresh.c_str()) != 0) return errno;
+    const int error = putInPlace(folder, fresh, name);
+    if (error != 0) unlinkat(folder, fresh.c_str(), 0);
+    return error;
+}
+
+} // namespace VK

@@ -1,0 +1,23 @@
+#pragma once
+
+#include <string>
+#include <sys/types.h>
+
+namespace VK {
+
+/// Whom a new file is to belong to, and who may use it.
+struct FileOwner {
+    mode_t mode = 0644;
+    uid_t user = 0;
+    gid_t group = 0;
+};
+
+/// Puts a file with these bytes at `name` in the folder, in place of what is there, at one stroke and surviving a
+/// crash: written beside it, synchronised, renamed. Only one writer at a time. 0, or the errno value; then what was
+/// there is still there. A user or group that we may not give it is left out.
+int replaceFile(int folder, const std::string& name, const std::string& bytes, const FileOwner& owner);
+
+/// The same for a symbolic link.
+int replaceLink(int folder, const std::string& name, const std::string& target);
+
+} // namespace VK

@@ -1,0 +1,100 @@
+#include "common/Text.h"
+
+#include <algorithm>
+
+namespace VK {
+
+namespace {
+
+using namespace std::literals;
+
+bool isControl(unsigned char byte) {
+    return byte < 0x20 || byte == 0x7F;
+}
+
+std::size_t sequenceLength(unsigned char lead) {
+    if (lead < 0x80) return 1;
+    if (lead >= 0xC2 && lead <= 0xDF) return 2;
+    if (lead >= 0xE0 && lead <= 0xEF) return 3;
+    if (lead >= 0xF0 && lead <= 0xF4) return 4;
+    return 0;
+}
+
+/// The second byte tells overlong forms, surrogates and numbers beyond Unicode.
+bool secondByteFits(unsigned char lead, unsigned char second) {
+    switch (lead) {
+    case 0xE0:
+        return second >= 0xA0;
+    case 0xED:
+        return second <= 0x9F;
+    case 0xF0:
+        return second >= 0x90;
+    case 0xF4:
+        return second <= 0x8F;
+    default:
+        return true;
+    }
+}
+
+/// The length of the UTF-8 sequence that the text starts with; 0 when it is none.
+std::size_t utf8Length(std::string_view text) {
+    const auto lead = static_cast<unsigned char>(text.front());
+    const std::size_t length = sequenceLength(lead);
+    if (length == 0 || length > text.size()) return 0;
+    for (std::size_t i = 1; i < length; ++i)
+        if ((static_cast<unsigned char>(text[i]) & 0xC0) != 0x80) return 0;
+    return length == 1 || secondByteFits(lead, static_cast<unsigned char>(text[1])) ? length : 0;
+}
+
+} // namespace
+
+std::string_view trimmed(std::string_view text) {
+    constexpr std::string_view BLANKS = " \t\r\n\v\f\0"sv;
+    const std::size_t begin = text.find_first_not_of(BLANKS);
+    if (begin == std::string_view::npos) return {};
+    return text.substr(begin, text.find_last_not_of(BLANKS) - begin + 1);
+}
+
+std::string printable(std::string_view text) {
+    std::string result(text);
+    std::replace_if(
+        result.begin(), result.end(), [](char c) { return c < 0x20 || static_cast<unsigned char>(c) >= 0x7F; }, '.');
+    return result;
+}
+
+std::string cleanText(std::string_view text) {
+    return printable(trimmed(trimmed(text).substr(0, LONGEST_TEXT)));
+}
+
+std::string cleanWrittenText(std::string_view text) {
+    const std::string_view whole = text;
+    text = trimmed(text);
+    std::string result;
+    while (!text.empty()) {
+        const std::size_t length = utf8Length(text);
+        if (length == 0) return cleanText(whole);
+        if (result.size() + length > LONGEST_TEXT) break;
+        result += length == 1 && isControl(static_cast<unsigned char>(text.front())) ? "."sv : text.substr(0, length);
+        text.remove_prefix(length);
+    }
+    return std::string(trimmed(result));
+}
+
+std::string lowerCase(std::string_view text) {
+    std::string result(text);
+    for (char& c : result)
+        if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+    return result;
+}
+
+std::string_view firstLine(std::string_view text) {
+    return text.substr(0, text.find_first_of("\r\n"));
+}
+
+std::string inQuotes(const std::string& text) {
+    constexpr std::size_t LONGEST = 64;
+    const bool cut = text.size() > LONGEST;
+    return "\"" + printable(text.substr(0, LONGEST)) + (cut ? "…\"" : "\"");
+}
+
+} // namespace VK

@@ -1,0 +1,80 @@
+#include "host/ChassisType.h"
+
+namespace VK::Host {
+
+namespace {
+
+constexpr const char* NAMES[] = {
+    nullptr,
+    "Other",
+    "Unknown",
+    "Desktop",
+    "Low Profile Desktop",
+    "Pizza Box",
+    "Mini Tower",
+    "Tower",
+    "Portable",
+    "Laptop",
+    "Notebook",
+    "Hand Held",
+    "Docking Station",
+    "All In One",
+    "Sub Notebook",
+    "Space-saving",
+    "Lunch Box",
+    "Main Server Chassis",
+    "Expansion Chassis",
+    "Sub Chassis",
+    "Bus Expansion Chassis",
+    "Peripheral Chassis",
+    "RAID Chassis",
+    "Rack Mount Chassis",
+    "Sealed-case PC",
+    "Multi-system",
+    "CompactPCI",
+    "AdvancedTCA",
+    "Blade",
+    "Blade Enclosing",
+    "Tablet",
+    "Convertible",
+    "Detachable",
+    "IoT Gateway",
+    "Embedded PC",
+    "Mini PC",
+    "Stick PC",
+};
+
+constexpr ChassisType LAST = sizeof NAMES / sizeof *NAMES - 1;
+
+bool isBetween(ChassisType type, ChassisType first, ChassisType last) {
+    return first <= type && type <= last;
+}
+
+} // namespace
+
+std::string chassisTypeName(ChassisType type) {
+    return NAMES[isBetween(type, 1, LAST) ? type : UNKNOWN_CHASSIS];
+}
+
+unsigned int packageType(ChassisType type) {
+    if (!isBetween(type, 1, LAST) || type == UNKNOWN_CHASSIS) return 0;
+    if (type == 23) return 2;
+    if (type == 28) return 3;
+    return isBetween(type, 3, 7) || isBetween(type, 17, 22) || isBetween(type, 24, 27) || type == 29 ? 1 : 4;
+}
+
+ChassisType chassisTypeFromWord(std::string_view word) {
+    struct Known {
+        std::string_view word;
+        ChassisType type;
+    };
+    static constexpr Known KNOWN[] = {
+        {"desktop", 3}, {"laptop", 9},       {"handset", 11},  {"watch", 11}, {"server", 17},
+        {"tablet", 30}, {"convertible", 31}, {"embedded", 34}, {"vm", 1},     {"container", 1},
+    };
+    for (const Known& known : KNOWN)
+        if (known.word == word) return known.type;
+    return 0;
+}
+
+} // namespace VK::Host

@@ -1,0 +1,32 @@
+#include "host/Hypervisor.h"
+
+#if defined(__x86_64__) || defined(__i386__)
+
+#include <cpuid.h>
+#include <cstring>
+
+namespace VK::Host {
+
+bool processorSaysKvm() {
+    constexpr unsigned int UNDER_HYPERVISOR = 1U << 31;
+    constexpr unsigned int HYPERVISOR_LEAF = 0x40000000;
+    unsigned int a = 0, b = 0, c = 0, d = 0;
+    // Processors without hypervisor answer for that leaf too, with something else.
+    if (__get_cpuid(1, &a, &b, &c, &d) == 0 || (c & UNDER_HYPERVISOR) == 0) return false;
+    char signature[12];
+    __cpuid(HYPERVISOR_LEAF, a, b, c, d);
+    std::memcpy(signature, &b, 4);
+    std::memcpy(signature + 4, &c, 4);
+    std::memcpy(signature + 8, &d, 4);
+    return std::memcmp(signature, "KVMKVMKVM\0\0\0", sizeof signature) == 0;
+}
+
+} // namespace VK::Host
+
+#else
+
+bool VK::Host::processorSaysKvm() {
+    return false;
+}
+
+#endif

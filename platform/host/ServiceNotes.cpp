@@ -1,0 +1,56 @@
+#include "host/ServiceNotes.h"
+
+#include <algorithm>
+#include <cctype>
+#include <unistd.h>
+
+namespace VK::Host {
+
+namespace {
+
+bool isProcess(const std::string& name) {
+    return !name.empty() && std::all_of(name.begin(), name.end(), [](unsigned char c) { return std::isdigit(c) != 0; });
+}
+
+std::string lowerCase(std::string text) {
+    std::transform(text.begin(), text.end(), text.begin(),
+                   [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
+    return text;
+}
+
+} // namespace
+
+std::string timeNote(const TimeFacts& facts) {
+    std::string note = "time service: ";
+    if (!facts.time.empty()) note += "time " + facts.time + ", ";
+    if (!facts.zone.empty()) note += "zone " + facts.zone + ", ";
+    if (facts.automaticDst)
+        note += std::string("automatic daylight saving ") + (*facts.automaticDst != 0 ? "on" : "off") + ", ";
+    return note + "NTP daemon " + (facts.ntpDaemonRuns ? "running" : "not running");
+}
+
+std::string zoneNameOf(const std::string& link) {
+    const std::string folder = "zoneinfo/";
+    const std::size_t found = link.rfind(folder);
+    return found == std::string::npos ? std::string() : link.substr(found + folder.size());
+}
+
+bool isNtpDaemonRunning(const Root& root) {
+    const Root::Names processes = root.list("/proc");
+    return std::any_of(processes.names.begin(), processes.names.end(), [&](const std::string& name) {
+        return isProcess(name) &&
+               lowerCase(root.read("/proc/" + name + "/cmdline").text).find("ntpd") != std::string::npos;
+    });
+}
+
+std::string commandFolder(const std::string& rootDirectory, bool isKvm) {
+    return isKvm ? "/usr/sbin/" : rootDirectory.substr(0, rootDirectory.find("platform")) + "vcm/bin/";
+}
+
+std::string commandNote(const std::string& folder) {
+    const std::string command = folder + "cimconfig";
+    if (access(command.c_str(), X_OK) == 0) return {};
+    return "no " + command + ": the delivery settings of the CIM server read as 0, which then means nothing";
+}
+
+} // namespace VK::Host

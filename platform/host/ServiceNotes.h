@@ -1,0 +1,34 @@
+#pragma once
+
+#include "vk/Root.h"
+
+#include <optional>
+#include <string>
+
+namespace VK::Host {
+
+/// What stands behind the time service now; what is not known is empty.
+struct TimeFacts {
+    std::string time; ///< in CIM form
+    std::string zone;
+    std::optional<unsigned int> automaticDst;
+    bool ntpDaemonRuns = false;
+};
+
+/// The facts in one line for people.
+std::string timeNote(const TimeFacts& facts);
+
+/// The zone that a link like `../usr/share/zoneinfo/Europe/Berlin` names; empty for any other text.
+std::string zoneNameOf(const std::string& link);
+
+/// Whether `ntpd` stands in the command line of any process below `/proc` of that root, in any letter case: the
+/// question that the time service asks of `ps`.
+bool isNtpDaemonRunning(const Root& root);
+
+/// The folder of the CIM server's commands for that root directory of the product, on a KVM guest or not.
+std::string commandFolder(const std::string& rootDirectory, bool isKvm);
+
+/// That the folder lacks `cimconfig`, and what that means; empty when it is there.
+std::string commandNote(const std::string& folder);
+
+} // namespace VK::Host

@@ -1,0 +1,67 @@
+#include "host/Smbios.h"
+
+#include "common/Text.h"
+
+namespace VK::Host {
+
+namespace {
+
+constexpr unsigned int SYSTEM = 1;
+constexpr unsigned int CHASSIS = 3;
+
+/// Reads fields of one structure.
+struct Fields {
+    const SmbiosStructure& structure;
+    std::size_t& badIndexes;
+
+    std::string text(std::size_t offset) const { return cleanText(structure.stringAt(offset, badIndexes)); }
+    unsigned int byte(std::size_t offset) const { return structure.byteAt(offset).value_or(0); }
+};
+
+SmbiosSystem readSystem(const Fields& fields, SmbiosVersion version) {
+    SmbiosSystem system;
+    system.manufacturer = fields.text(0x04);
+    system.product = fields.text(0x05);
+    system.version = fields.text(0x06);
+    system.serial = fields.text(0x07);
+    system.uuid = uuidFromBytes(fields.structure.bytesAt(0x08, 16).value_or(std::string_view()), version);
+    system.sku = fields.text(0x19);
+    return system;
+}
+
+SmbiosChassis readChassis(const Fields& fields) {
+    SmbiosChassis chassis;
+    chassis.manufacturer = fields.text(0x04);
+    chassis.type = fields.byte(0x05) & 0x7F; // the first bit tells whether there is a lock
+    chassis.version = fields.text(0x06);
+    chassis.serial = fields.text(0x07);
+    chassis.bootUpState = fields.byte(0x09);
+    chassis.powerSupplyState = fields.byte(0x0A);
+    chassis.thermalState = fields.byte(0x0B);
+    // The elements contained come before the last field, 0x13 telling how many and 0x14 how long each is.
+    if (fields.structure.byteAt(0x14)) chassis.sku = fields.text(0x15 + fields.byte(0x13) * fields.byte(0x14));
+    return chassis;
+}
+
+} // namespace
+
+Smbios parseSmbios(std::string_view entryPoint, std::string_view table) {
+    Smbios result;
+    const SmbiosEntryPoint entry = parseSmbiosEntryPoint(entryPoint);
+    result.entryPointProblem = entry.problem;
+    if (!entry.problem.empty()) return result;
+    result.version = entry.version;
+    std::size_t badIndexes = 0;
+    SmbiosTable structures(table.substr(0, entry.tableLength));
+    while (const auto structure = structures.next()) {
+        const Fields fields{*structure, badIndexes};
+        if (structure->type() == SYSTEM && !result.system) result.system = readSystem(fields, entry.version);
+        if (structure->type() == CHASSIS) result.chassis.push_back(readChassis(fields));
+    }
+    if (!structures.problem().empty()) result.problems.push_back(structures.problem());
+    if (badIndexes > 0)
+        result.problems.push_back(std::to_string(badIndexes) + " string(s) that the table refers to are not there");
+    return result;
+}
+
+} // namespace VK::Host

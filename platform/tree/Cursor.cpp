@@ -1,0 +1,70 @@
+#include "tree/Cursor.h"
+
+namespace VK::Tree {
+
+Cursor::Cursor() : Cursor(NodeSource::current()) {}
+
+void Cursor::standOn(const Node* node) {
+    current = node;
+    knownStatus.reset();
+}
+
+void Cursor::selectType(unsigned int type) {
+    tree = host.tree();
+    sameType = &tree->ofType(type);
+    rank = 0;
+    filtered = false;
+    standOn(sameType->empty() ? nullptr : sameType->front());
+}
+
+void Cursor::selectPath(const std::string& path) {
+    tree = host.tree();
+    sameType = nullptr;
+    filtered = false;
+    standOn(tree->find(path).node);
+}
+
+void Cursor::advance() {
+    if (current == nullptr) return;
+    // Paths are unique: behind the one node that a filter lets pass, or that was selected by its path, there is none.
+    standOn(filtered || sameType == nullptr || ++rank >= sameType->size() ? nullptr : (*sameType)[rank]);
+}
+
+void Cursor::filterByPath(const std::string& path) {
+    if (current == nullptr) return;
+    const NodeTree::Place place = tree->find(path);
+    const bool reached = place.node == current || (!filtered && sameType != nullptr && place.node != nullptr &&
+                                                   place.node->type == current->type && place.rank >= rank);
+    standOn(reached ? place.node : nullptr);
+    rank = place.rank;
+    filtered = true;
+}
+
+std::optional<Value> Cursor::read(unsigned int property) const {
+    return current != nullptr ? host.read(*current, property) : std::nullopt;
+}
+
+bool Cursor::write(unsigned int property, const Value& value) {
+    if (current == nullptr || !host.write(*current, property, value)) return false;
+    // The cursor that wrote sees what it wrote.
+    std::shared_ptr<const NodeTree> now = host.tree();
+    const NodeTree::Place place = now->find(current->path);
+    if (place.node == nullptr || place.node->type != current->type) return true; // taken away since: the old one stays
+    if (sameType != nullptr) sameType = &now->ofType(place.node->type);
+    standOn(place.node);
+    rank = place.rank;
+    tree = std::move(now);
+    return true;
+}
+
+std::optional<bool> Cursor::isReadOnly(unsigned int property) const {
+    return current != nullptr ? host.isReadOnly(*current, property) : std::nullopt;
+}
+
+unsigned int Cursor::status() const {
+    if (current == nullptr) return 0;
+    if (!knownStatus) knownStatus = host.status(*current);
+    return *knownStatus;
+}
+
+} // namespace VK::Tree

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "tree/NodeSource.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace VK::Tree {
+
+/// What VK::Instrumentation is made of: a place among the nodes of one type, or on one node, of a host's tree as it
+/// stood when the nodes were selected.
+class Cursor {
+public:
+    /// Over the host of this process.
+    Cursor();
+    explicit Cursor(NodeSource& ofHost) : host(ofHost) {}
+
+    void selectType(unsigned int type);
+    void selectPath(const std::string& path);
+    /// The node that the cursor stands on, or null.
+    const Node* node() const { return current; }
+    void advance();
+    void filterByPath(const std::string& path);
+    /// Moves off the end, for filters that no node passes.
+    void finish() { standOn(nullptr); }
+
+    std::optional<Value> read(unsigned int property) const;
+    bool write(unsigned int property, const Value& value);
+    std::optional<bool> isReadOnly(unsigned int property) const;
+    /// Read once while the cursor stands where it does: what one answer tells of the health is of one moment, and a
+    /// host that reads it from files does so once.
+    unsigned int status() const;
+
+private:
+    void standOn(const Node* node);
+
+    NodeSource& host;
+    std::shared_ptr<const NodeTree> tree;
+    const NodeTree::Nodes* sameType = nullptr; ///< what ++ walks along; null after selectPath
+    std::size_t rank = 0;
+    const Node* current = nullptr;
+    bool filtered = false;
+    mutable std::optional<unsigned int> knownStatus; ///< of the current node
+};
+
+} // namespace VK::Tree

@@ -1,0 +1,80 @@
+#include "vk/HostFacts.h"
+
+#include "host/HardwareNotes.h"
+#include "host/Hypervisor.h"
+#include "host/ServiceNotes.h"
+#include "tree/CurrentHost.h"
+#include "tree/Cursor.h"
+#include "vk/HostSource.h"
+#include "vk/NodeLexicon.h"
+#include "vk/Root.h"
+
+namespace VK {
+
+namespace {
+
+bool startsWith(const std::string& text, const char* start) {
+    return text.rfind(start, 0) == 0;
+}
+
+bool findOutKvm() {
+    if (const std::optional<bool> given = productOverrides().kvm; given) return *given;
+    if (HostSource::current().kind != HostSource::Snapshot && Host::processorSaysKvm()) return true;
+    const Host::HardwareFacts& facts = Tree::realHost().hardware();
+    return startsWith(facts.firmwareModel.text, "KVM") || startsWith(facts.firmwareManufacturer.text, "QEMU");
+}
+
+} // namespace
+
+const ProductOverrides& productOverrides() {
+    static const ProductOverrides overrides =
+        Tree::simulatedHost() != nullptr ? Tree::simulatedHost()->state()->product : ProductOverrides();
+    return overrides;
+}
+
+const std::string& hostUuid() {
+    return Tree::realHost().hardware().uuid.text;
+}
+
+bool hostIsKVM() {
+    static const bool kvm = findOutKvm();
+    return kvm;
+}
+
+namespace {
+
+std::vector<std::string> missingFacts() {
+    if (Tree::SimulatedHost* host = Tree::simulatedHost(); host != nullptr) {
+        const std::string problem = host->state()->problem;
+        if (problem.empty()) return {};
+        return {HostSource::current().location + ": " + problem};
+    }
+    Tree::RealHost& host = Tree::realHost();
+    return host.problem().empty() ? Host::notesOn(host.hardware()) : std::vector<std::string>{host.problem()};
+}
+
+std::string timeServiceNote() {
+    Host::TimeFacts facts;
+    Tree::Cursor computer;
+    computer.selectType(NodeLexicon::ComputerSystemNode);
+    if (const auto time = computer.read(NodeLexicon::SystemTimeProperty))
+        if (const std::string* text = std::get_if<std::string>(&*time)) facts.time = *text;
+    if (const auto automatic = computer.read(NodeLexicon::AutomaticDSTAdjustmentProperty))
+        if (const unsigned int* number = std::get_if<unsigned int>(&*automatic)) facts.automaticDst = *number;
+    if (Tree::simulatedHost() == nullptr) facts.zone = Host::zoneNameOf(Root::host().readLink("/etc/localtime").text);
+    facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, whatever is described
+    return Host::timeNote(facts);
+}
+
+} // namespace
+
+std::vector<std::string> hostNotes() {
+    std::vector<std::string> notes = missingFacts();
+    notes.push_back(timeServiceNote());
+    const std::string root = productOverrides().rootDirectory.value_or(VK_ROOT_DIRECTORY);
+    const std::string command = Host::commandNote(Host::commandFolder(root, hostIsKVM()));
+    if (!command.empty()) notes.push_back(command);
+    return notes;
+}
+
+} // namespace VK

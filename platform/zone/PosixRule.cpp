@@ -1,0 +1,178 @@
+#include "zone/PosixRule.h"
+
+#include <algorithm>
+#include <array>
+#include <cctype>
+
+namespace VK::Zone {
+
+namespace {
+
+constexpr std::int64_t DAY = 86400;
+constexpr std::int64_t LONGEST_TIME = 167; // hours; what RFC 8536 allows beyond POSIX
+
+bool isLeap(std::int64_t year) {
+    return year % 4 == 0 && (year % 100 != 0 || year % 400 == 0);
+}
+
+std::int64_t daysBefore(std::int64_t year) {
+    const std::int64_t y = year - 1;
+    return y * 365 + y / 4 - y / 100 + y / 400 - 719162; // days from 0001-01-01 to 1970-01-01
+}
+
+/// The year that an instant lies in, in UTC; kept within what a rule can be asked of.
+int yearOf(std::int64_t instant) {
+    constexpr std::int64_t LAST = 253402300799; // 9999-12-31
+    const std::int64_t days = std::clamp<std::int64_t>(instant, 0, LAST) / DAY;
+    std::int64_t year = 1970 + days / 366;
+    while (daysBefore(year + 1) <= days) ++year;
+    return static_cast<int>(year);
+}
+
+std::int64_t dayOfMonthRule(const RuleDay& rule, int year) {
+    static constexpr std::array<int, 12> LENGTHS{31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+    std::int64_t first = daysBefore(year);
+    for (int month = 1; month < rule.month; ++month)
+        first += LENGTHS[static_cast<std::size_t>(month - 1)] + (month == 2 && isLeap(year) ? 1 : 0);
+    const int length = LENGTHS[static_cast<std::size_t>(rule.month - 1)] + (rule.month == 2 && isLeap(year) ? 1 : 0);
+    const std::int64_t firstWeekday = (((first + 4) % 7) + 7) % 7; // 1970-01-01 was a Thursday
+    std::int64_t offset = (rule.day - firstWeekday + 7) % 7 + (rule.week - 1) * 7;
+    if (offset >= length) offset -= 7; // week 5 is the last one
+    return first + offset;
+}
+
+/// Takes a rule's text apart from its front.
+class RuleParser {
+public:
+    explicit RuleParser(std::string_view text) : rest(text) {}
+
+    bool atEnd() const { return rest.empty(); }
+
+    bool take(char c) {
+        if (rest.empty() || rest.front() != c) return false;
+        rest.remove_prefix(1);
+        return true;
+    }
+
+    /// An abbreviation, `CET` or `<+0530>`.
+    bool name() {
+        if (take('<')) {
+            const std::size_t end = rest.find('>');
+            if (end == std::string_view::npos || end < 3) return false;
+            rest.remove_prefix(end + 1);
+            return true;
+        }
+        std::size_t length = 0;
+        while (length < rest.size() && std::isalpha(static_cast<unsigned char>(rest[length])) != 0) ++length;
+        if (length < 3) return false;
+        rest.remove_prefix(length);
+        return true;
+    }
+
+    bool number(std::int64_t lowest, std::int64_t highest, std::int64_t& value) {
+        std::size_t length = 0;
+        value = 0;
+        while (length < rest.size() && length < 4 && rest[length] >= '0' && rest[length] <= '9')
+            value = value * 10 + (rest[length++] - '0');
+        rest.remove_prefix(length);
+        return length > 0 && lowest <= value && value <= highest;
+    }
+
+    /// `[+-]hh[:mm[:ss]]` in seconds.
+    bool time(std::int64_t longestHours, std::int64_t& seconds) {
+        const bool negative = take('-');
+        if (!negative) take('+');
+        std::int64_t hours = 0, minutes = 0, rest60 = 0;
+        if (!number(0, longestHours, hours)) return false;
+        if (take(':')) {
+            if (!number(0, 59, minutes)) return false;
+            if (take(':') && !number(0, 59, rest60)) return false;
+        }
+        seconds = (hours * 3600 + minutes * 60 + rest60) * (negative ? -1 : 1);
+        return true;
+    }
+
+    /// `,Mm.w.d[/time]` and the like.
+    bool day(RuleDay& rule) {
+        if (!take(',')) return false;
+        std::int64_t month = 0, week = 0, day = 0;
+        if (take('M')) {
+            if (!number(1, 12, month) || !take('.') || !number(1, 5, week) || !take('.') || !number(0, 6, day))
+                return false;
+            rule.kind = RuleDay::MonthWeekDay;
+        } else {
+            rule.kind = take('J') ? RuleDay::Julian : RuleDay::DayOfYear;
+            if (!number(rule.kind == RuleDay::Julian ? 1 : 0, 365, day)) return false;
+        }
+        rule.month = static_cast<int>(month);
+        rule.week = static_cast<int>(week);
+        rule.day = static_cast<int>(day);
+        return !take('/') || time(LONGEST_TIME, rule.second);
+    }
+
+private:
+    std::string_view rest;
+};
+
+} // namespace
+
+std::int64_t RuleDay::inYear(int year) const {
+    std::int64_t days = 0;
+    switch (kind) {
+    case Julian:
+        days = daysBefore(year) + day - 1 + (isLeap(year) && day >= 60 ? 1 : 0);
+        break;
+    case DayOfYear:
+        days = daysBefore(year) + day;
+        break;
+    case MonthWeekDay:
+        days = dayOfMonthRule(*this, year);
+        break;
+    }
+    return days * DAY + second;
+}
+
+bool PosixRule::isDaylightAt(std::int64_t instant) const {
+    if (!hasDaylightSaving) return false;
+    // What came last before the instant, a begin or an end; local years need not be the years of UTC.
+    std::int64_t latest = INT64_MIN;
+    bool daylight = false;
+    const int year = yearOf(instant);
+    for (int each = year - 1; each <= year + 1; ++each) {
+        const std::int64_t begins = begin.inYear(each) - standardOffset;
+        const std::int64_t ends = end.inYear(each) - daylightOffset;
+        if (begins <= instant && begins > latest) {
+            latest = begins;
+            daylight = true;
+        }
+        // An end at the very instant of a begin yields to it: that is how a year-round daylight saving is written.
+        if (ends <= instant && ends > latest) {
+            latest = ends;
+            daylight = false;
+        }
+    }
+    return daylight;
+}
+
+std::optional<PosixRule> parsePosixRule(std::string_view text) {
+    constexpr std::int64_t LONGEST_OFFSET = 24;
+    PosixRule rule;
+    RuleParser parser(text);
+    std::int64_t west = 0;
+    if (!parser.name() || !parser.time(LONGEST_OFFSET, west)) return std::nullopt;
+    rule.standardOffset = static_cast<std::int32_t>(-west);
+    if (parser.atEnd()) return rule;
+    rule.hasDaylightSaving = true;
+    if (!parser.name()) return std::nullopt;
+    std::int64_t daylightWest = west - 3600;
+    RuleParser ahead = parser;
+    if (ahead.time(LONGEST_OFFSET, daylightWest))
+        parser = ahead;
+    else
+        daylightWest = west - 3600;
+    rule.daylightOffset = static_cast<std::int32_t>(-daylightWest);
+    if (!parser.day(rule.begin) || !parser.day(rule.end) || !parser.atEnd()) return std::nullopt;
+    return rule;
+}
+
+} // namespace VK::Zone

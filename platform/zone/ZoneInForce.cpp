@@ -1,0 +1,48 @@
+#include "zone/ZoneInForce.h"
+
+#include "common/CimDateTime.h"
+
+#include <ctime>
+
+namespace VK::Zone {
+
+namespace {
+
+const std::string LOCAL_TIME = "/etc/localtime";
+const std::string ZONE_FOLDER = "/usr/share/zoneinfo";
+
+/// Whether the path that /etc/localtime leads to is that file itself or one of the zone folder.
+bool isTrusted(const Root& root, const std::string& path) {
+    const Root::Contents folder = root.resolve(ZONE_FOLDER);
+    if (folder && path.rfind(folder.text + "/", 0) == 0) return true;
+    const Root::Contents parent = root.resolve("/etc");
+    return parent && path == parent.text + "/localtime";
+}
+
+} // namespace
+
+std::optional<TimeZone> zoneOfFile(const Root& root, const std::string& path) {
+    const Root::Contents real = root.resolve(path);
+    if (!real || !isTrusted(root, real.text)) return std::nullopt;
+    return parseZoneFile(root.read(real.text).text);
+}
+
+TimeZone zoneInForce(const Root& root) {
+    return zoneOfFile(root, LOCAL_TIME).value_or(TimeZone());
+}
+
+int offsetInForce(const Root& root) {
+    return zoneInForce(root).at(std::time(nullptr)).offset / 60;
+}
+
+bool hasDaylightSaving(const Root& root) {
+    return zoneInForce(root).hasDaylightSavingFrom(std::time(nullptr));
+}
+
+std::string systemTime(const Root& root) {
+    timespec now{};
+    clock_gettime(CLOCK_REALTIME, &now);
+    return formatCimDateTime({now.tv_sec, now.tv_nsec / 1000}, zoneInForce(root).at(now.tv_sec).offset / 60);
+}
+
+} // namespace VK::Zone

@@ -1,0 +1,28 @@
+#pragma once
+
+#include "vk/Root.h"
+#include "zone/ZoneFile.h"
+
+#include <optional>
+#include <string>
+
+namespace VK::Zone {
+
+// The zone may change at any time; each of these looks anew.
+
+/// The zone of a zone file, links followed. Nothing when it is missing, broken, no zone file, or neither
+/// /etc/localtime itself nor one of the zone directory.
+std::optional<TimeZone> zoneOfFile(const Root& root, const std::string& path);
+
+/// The zone that /etc/localtime puts into force. UTC when it is missing, broken, no zone file, or neither a file
+/// there nor one of the zone directory.
+TimeZone zoneInForce(const Root& root);
+
+/// The zone's offset now, in minutes east of UTC, and whether it has daylight saving now or later.
+int offsetInForce(const Root& root);
+bool hasDaylightSaving(const Root& root);
+
+/// Now, as a CIM date-time with microseconds and the offset in force.
+std::string systemTime(const Root& root);
+
+} // namespace VK::Zone
