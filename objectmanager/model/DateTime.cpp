@@ -73,46 +73,14 @@ bool isFraction(std::string_view text, bool unknown) {
            digits.find_first_not_of('*', known) == std::string_view::npos && (!unknown || known == 0);
 }
 
-bool isLeapYear(unsigned year) {
-    return (year % 4 == 0 && year % 100 != 0) || year % 400 == 0;
-}
-
-unsigned daysOf(unsigned year, unsigned month) {
-    constexpr unsigned Lengths[] = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-    return month == 2 && isLeapYear(year) ? 29 : Lengths[month - 1];
+std::chrono::year_month_day dateOf(std::string_view text) {
+    return {std::chrono::year{static_cast<int>(number(text, Year))}, std::chrono::month{number(text, Month)},
+            std::chrono::day{number(text, Day)}};
 }
 
 bool dayExists(std::string_view text) {
     if (isUnknown(text, Day)) return true;
-    return number(text, Day) <= daysOf(number(text, Year), number(text, Month));
-}
-
-/// Days since 1970-01-01 in the Gregorian calendar. Years are counted from March, so that a leap day ends one.
-std::int64_t daysFromDate(std::int64_t year, unsigned month, unsigned day) {
-    year -= month <= 2 ? 1 : 0;
-    const std::int64_t era = (year >= 0 ? year : year - 399) / 400;
-    const std::int64_t yearOfEra = year - era * 400;
-    const std::int64_t dayOfYear = (153 * (month > 2 ? month - 3 : month + 9) + 2) / 5 + day - 1;
-    const std::int64_t dayOfEra = yearOfEra * 365 + yearOfEra / 4 - yearOfEra / 100 + dayOfYear;
-    return era * 146'097 + dayOfEra - 719'468;
-}
-
-struct Date {
-    std::int64_t year;
-    int month;
-    int day;
-};
-
-Date dateFromDays(std::int64_t days) {
-    days += 719'468;
-    const std::int64_t era = (days >= 0 ? days : days - 146'096) / 146'097;
-    const std::int64_t dayOfEra = days - era * 146'097;
-    const std::int64_t yearOfEra = (dayOfEra - dayOfEra / 1460 + dayOfEra / 36'524 - dayOfEra / 146'096) / 365;
-    const std::int64_t dayOfYear = dayOfEra - (365 * yearOfEra + yearOfEra / 4 - yearOfEra / 100);
-    const std::int64_t shifted = (5 * dayOfYear + 2) / 153;
-    const int day = static_cast<int>(dayOfYear - (153 * shifted + 2) / 5 + 1);
-    const int month = static_cast<int>(shifted < 10 ? shifted + 3 : shifted - 9);
-    return {yearOfEra + era * 400 + (month <= 2 ? 1 : 0), month, day};
+    return dateOf(text).ok();
 }
 
 std::string print(std::int64_t days, std::int64_t secondOfDay, std::int64_t fraction) {
@@ -161,8 +129,8 @@ std::optional<std::int64_t> microseconds(std::string_view dateTime) {
         seconds = value(Days) * SecondsPerDay + time;
     } else {
         const std::int64_t offset = value(Offset) * (dateTime[SignAt] == '-' ? -60 : 60);
-        seconds =
-            daysFromDate(value(Year), number(dateTime, Month), number(dateTime, Day)) * SecondsPerDay + time - offset;
+        const std::int64_t days = std::chrono::sys_days{dateOf(dateTime)}.time_since_epoch().count();
+        seconds = days * SecondsPerDay + time - offset;
     }
     return seconds * Million + value(Fraction);
 }
@@ -170,9 +138,12 @@ std::optional<std::int64_t> microseconds(std::string_view dateTime) {
 std::optional<std::string> formatInstant(std::int64_t microseconds) {
     const std::int64_t seconds = floorDivide(microseconds, Million);
     const std::int64_t days = floorDivide(seconds, SecondsPerDay);
-    const Date date = dateFromDays(days);
-    if (date.year < 0 || date.year > 9999) return std::nullopt;
-    const std::int64_t packed = (date.year * 100 + date.month) * 100 + date.day;
+    constexpr std::int64_t Earliest = -719'528; // 0000-01-01
+    constexpr std::int64_t Latest = 2'932'896;  // 9999-12-31
+    if (days < Earliest || days > Latest) return std::nullopt;
+    const std::chrono::year_month_day date{std::chrono::sys_days{std::chrono::days{days}}};
+    const std::int64_t packed =
+        (std::int64_t{int{date.year()}} * 100 + unsigned{date.month()}) * 100 + unsigned{date.day()};
     return print(packed, seconds - days * SecondsPerDay, microseconds - seconds * Million) + "+000";
 }
 

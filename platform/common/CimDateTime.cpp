@@ -1,9 +1,9 @@
 #include "common/CimDateTime.h"
 
 #include <array>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
-#include <ctime>
 
 namespace VK {
 
@@ -40,27 +40,25 @@ std::optional<Instant> parseCimDateTime(std::string_view text) {
                         number(text, 8, 2, hour) && number(text, 10, 2, minute) && number(text, 12, 2, second) &&
                         fraction(text.substr(FRACTION, 6), microsecond) && number(text, SIGN + 1, 3, offset);
     if (!digits || hour > 23 || minute > 59 || second > 59) return std::nullopt;
-    tm fields{};
-    fields.tm_year = year - 1900;
-    fields.tm_mon = month - 1;
-    fields.tm_mday = day;
-    fields.tm_hour = hour;
-    fields.tm_min = minute;
-    fields.tm_sec = second;
-    const std::time_t local = timegm(&fields);
-    // A day that does not exist has become another one.
-    if (fields.tm_year != year - 1900 || fields.tm_mon != month - 1 || fields.tm_mday != day) return std::nullopt;
-    return Instant{std::int64_t{local} - (text[SIGN] == '-' ? -offset : offset) * 60, microsecond};
+    const std::chrono::year_month_day date{std::chrono::year{year}, std::chrono::month{static_cast<unsigned>(month)},
+                                           std::chrono::day{static_cast<unsigned>(day)}};
+    if (!date.ok()) return std::nullopt;
+    const std::int64_t days = std::chrono::sys_days{date}.time_since_epoch().count();
+    const std::int64_t local = days * 86400 + hour * 3600 + minute * 60 + second;
+    return Instant{local - (text[SIGN] == '-' ? -offset : offset) * 60, microsecond};
 }
 
 std::string formatCimDateTime(Instant instant, int offsetMinutes) {
-    const auto local = static_cast<std::time_t>(instant.seconds + offsetMinutes * 60);
-    tm fields{};
-    gmtime_r(&local, &fields);
+    using namespace std::chrono;
+    const sys_seconds local{seconds{instant.seconds + offsetMinutes * 60}};
+    const auto midnight = floor<days>(local);
+    const year_month_day date{midnight};
+    const hh_mm_ss time{local - midnight};
     std::array<char, 64> text{};
-    std::snprintf(text.data(), text.size(), "%04d%02d%02d%02d%02d%02d.%06d%c%03d", fields.tm_year + 1900,
-                  fields.tm_mon + 1, fields.tm_mday, fields.tm_hour, fields.tm_min, fields.tm_sec,
-                  static_cast<int>(instant.microseconds), offsetMinutes < 0 ? '-' : '+', std::abs(offsetMinutes));
+    std::snprintf(text.data(), text.size(), "%04d%02u%02u%02ld%02ld%02ld.%06d%c%03d", int{date.year()},
+                  unsigned{date.month()}, unsigned{date.day()}, long{time.hours().count()},
+                  long{time.minutes().count()}, long{time.seconds().count()}, static_cast<int>(instant.microseconds),
+                  offsetMinutes < 0 ? '-' : '+', std::abs(offsetMinutes));
     return text.data();
 }
 

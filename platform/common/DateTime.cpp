@@ -1,9 +1,6 @@
 #include "vk/DateTime.h"
 
-#include "common/CivilTime.h"
-
-#include <array>
-#include <cstdio>
+#include "common/CimDateTime.h"
 
 namespace VK {
 
@@ -11,13 +8,11 @@ DateTime::DateTime(long secondsSinceEpoch, unsigned int outputFormat)
     : seconds(secondsSinceEpoch), format(outputFormat) {}
 
 DateTime::operator std::string() const {
-    static_cast<void>(format); // there is one form only
-    const CivilTime time = civilTime(seconds);
-    if (time.year < 0 || time.year > 9999) return {};
-    std::array<char, 32> text{};
-    std::snprintf(text.data(), text.size(), "%04ld%02d%02d%02d%02d%02d.000000+000", time.year, time.month, time.day,
-                  time.hour, time.minute, time.second);
-    return text.data();
+    static_cast<void>(format);              // there is one form only
+    constexpr long EARLIEST = -62167219200; // 0000-01-01 00:00:00
+    constexpr long LATEST = 253402300799;   // 9999-12-31 23:59:59
+    if (seconds < EARLIEST || seconds > LATEST) return {};
+    return formatCimDateTime({seconds, 0}, 0);
 }
 
 } // namespace VK

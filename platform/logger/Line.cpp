@@ -1,10 +1,9 @@
 #include "logger/Line.h"
 
-#include "common/CivilTime.h"
-
 #include <algorithm>
 #include <array>
 #include <charconv>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -78,10 +77,17 @@ void Line::appendEscaped(std::string_view text) noexcept {
 }
 
 void appendTime(Line& line, const timespec& now) noexcept {
-    const VK::CivilTime time = VK::civilTime(now.tv_sec);
+    // Not the C library's gmtime: it may read zone files, and takes a lock that is not safe after fork.
+    using namespace std::chrono;
+    const sys_seconds instant{seconds{now.tv_sec}};
+    const auto midnight = floor<days>(instant);
+    const year_month_day date{midnight};
+    const hh_mm_ss time{instant - midnight};
     std::array<char, 64> text;
-    const int length = std::snprintf(text.data(), text.size(), "%04ld-%02d-%02dT%02d:%02d:%02d.%06ldZ", time.year,
-                                     time.month, time.day, time.hour, time.minute, time.second, now.tv_nsec / 1000);
+    const int length =
+        std::snprintf(text.data(), text.size(), "%04d-%02u-%02uT%02ld:%02ld:%02ld.%06ldZ", int{date.year()},
+                      unsigned{date.month()}, unsigned{date.day()}, long{time.hours().count()},
+                      long{time.minutes().count()}, long{time.seconds().count()}, now.tv_nsec / 1000);
     line.append(std::string_view(text.data(), static_cast<std::size_t>(length)));
 }
 
