@@ -7,11 +7,9 @@
 
 namespace VK {
 
-DateTime::DateTime(long secondsSinceEpoch, unsigned int outputFormat)
-    : seconds(secondsSinceEpoch), format(outputFormat) {}
+DateTime::DateTime(long secondsSinceEpoch, unsigned int) : seconds(secondsSinceEpoch) {}
 
 DateTime::operator std::string() const {
-    static_cast<void>(format); // there is one form only
     const CivilTime time = civilTime(seconds);
     if (time.year < 0 || time.year > 9999) return {};
     std::array<char, 32> text{};
