@@ -1,0 +1,13 @@
+#pragma once
+
+#pragma GCC visibility push(hidden)
+
+namespace NVLog {
+
+/// Sends a text to syslog: through the C library or, in the child of a fork that may have lost the C library's lock,
+/// straight to /dev/log.
+void sendToSyslog(int priority, const char* text) noexcept;
+
+} // namespace NVLog
+
+#pragma GCC visibility pop
