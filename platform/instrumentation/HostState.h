@@ -21,9 +21,8 @@ unsigned int powerState(const Root& root);
 /// Whether any memory controller has counted an error that could not be corrected.
 bool hasUncorrectableMemoryErrors(const Root& root);
 
-/// The zone of a zone file, links followed. Nothing when it is missing, broken, no zone file, or neither
-/// /etc/localtime
-/// itself nor one of the zone folder.
+/// The zone of a zone file, links followed. Nothing when it is missing, broken, no zone file, or neither /etc/localtime
+/// itself nor one of the zone directory.
 std::optional<Zone> zoneOfFile(const Root& root, const std::string& path);
 
 /// The zone that /etc/localtime puts into force. UTC when it is missing, broken, no zone file, or neither a file
