@@ -1,6 +1,7 @@
 #include "instrumentation/HostNodes.h"
 
 #include "instrumentation/HostState.h"
+#include "instrumentation/HostText.h"
 #include "vk/NodeLexicon.h"
 
 namespace VK {
@@ -85,11 +86,18 @@ void fill(Node& node, const Row (&rows)[N], const View& view) {
         if (const Told value = row.tell(view)) node.properties[row.property] = *value;
 }
 
+std::string firstWord(const std::string& text) {
+    return lowerCase(text.substr(0, text.find_first_of(" ,")));
+}
+
+/// Manufacturer and model. Some models name their manufacturer themselves: "Dell Computer Corporation" makes a "Dell
+/// PowerEdge 8450".
 std::string describe(const HardwareFacts& host) {
     const std::string& manufacturer = host.manufacturer.text;
     const std::string& model = host.model.text;
     if (manufacturer.empty() && model.empty()) return "Linux " + host.architecture;
-    return manufacturer + (manufacturer.empty() || model.empty() ? "" : " ") + model;
+    if (manufacturer.empty() || firstWord(model) == firstWord(manufacturer)) return model;
+    return manufacturer + (model.empty() ? "" : " ") + model;
 }
 
 } // namespace
