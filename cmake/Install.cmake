@@ -54,6 +54,10 @@ vk_configured(tools/register-links.sh.in ${VK_SHARE_DIR} provider FILES)
 vk_configured(tools/register-openpegasus.sh.in ${VK_SHARE_DIR} provider FILES)
 vk_configured(tools/register-sfcb.sh.in ${VK_SHARE_DIR} provider FILES)
 vk_configured(tools/vk-provider-check.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
+# vk-host-snapshot sees the same placeholders as the provider.
+set(placeholders ${CMAKE_SOURCE_DIR}/platform/instrumentation/Placeholders.inc)
+set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${placeholders})
+file(READ ${placeholders} VK_PLACEHOLDERS)
 vk_configured(tools/vk-host-snapshot.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
 install(FILES ${VK_SCHEMA_DIR}/libvknabaseserverprofileprovider.7 DESTINATION ${CMAKE_INSTALL_MANDIR}/man7
     COMPONENT provider)
