@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cstdlib>
+#include <iterator>
 #include <map>
 #include <set>
 #include <string>
@@ -63,6 +64,18 @@ TEST(Placeholder, HasTheRuleThatSaysWhy) {
     EXPECT_THAT(std::string(reason("0123456789")), testing::StartsWith("counts up or down"));
     EXPECT_THAT(std::string(reason("System SKU#")), testing::StartsWith("the name of the field itself"));
     EXPECT_THAT(std::string(reason("SKU=NotProvided;ModelName=X")), testing::HasSubstr("without the SKU"));
+}
+
+TEST(Placeholder, RulesAllHaveATextThatTheyAreFor) {
+    std::set<std::string_view> reasons;
+    for (const Row& row : SAY_NOTHING)
+        if (const PlaceholderRule* const rule = placeholderRule(row.text, row.kind)) reasons.insert(rule->reason);
+    constexpr const char* ALL[] = {
+#define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) REASON,
+#include "instrumentation/Placeholders.inc"
+    };
+    for (const char* reason : ALL) EXPECT_EQ(reasons.count(reason), 1U) << reason;
+    EXPECT_EQ(reasons.size(), std::size(ALL)); // no two rules have the same
 }
 
 /// The reasons why texts of a machine's tables say nothing.
