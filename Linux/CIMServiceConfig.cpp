@@ -1,6 +1,7 @@
 #include "Linux/CIMServiceConfig.h"
 
 #include "Linux/CommandStream.h"
+#include "vk/MachineLock.h"
 #include "vk/Product.h"
 #include "vk/ProviderUtilities.h"
 
@@ -10,6 +11,16 @@ namespace VK::BaseServerProvider {
 
 static const std::string loggerCIMServiceConfig("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCIMServiceConfig, "CIMServiceConfig"};
+
+namespace {
+
+/// Two runs at once can empty the server's file of planned settings, with which it does not start again.
+int runAlone(const std::string& command) {
+    const MachineLock lock("vk-cimconfig.lock");
+    return std::system(command.c_str()); // NOLINT(cert-env33-c): running it is what the operation is for
+}
+
+} // namespace
 
 struct CIMServiceConfig::Setting {
     const char* argument; ///< its name in requests
@@ -71,7 +82,7 @@ std::string CIMServiceConfig::commandDirectory() const {
 unsigned int CIMServiceConfig::set(const TracePoint& at, const Setting& setting, const std::string& value) {
     const std::string command = commandDirectory() + setting.setCommand + value + " -p";
     traceVariable(at, "cimconfig command :", command.c_str(), NoticeLevel);
-    if (std::system(command.c_str()) != 0) { // NOLINT(cert-env33-c): running it is what the operation is for
+    if (runAlone(command) != 0) {
         traceVariable(at, "command failed", command.c_str(), FailureLevel);
         return 1;
     }

@@ -23,7 +23,8 @@ public:
     /// followed by "vcm/bin/".
     std::string getbinDirectory() const;
 
-    /// Sets one of the two settings; `value` becomes part of the command as it is. 0 for success, 1 for failure.
+    /// Sets one of the two settings; `value` becomes part of the command as it is. 0 for success, 1 for failure. Waits
+    /// for other runs of the command that set something, of this process and, as root, of others.
     unsigned int setIntervalParameter(std::string value);
     unsigned int setAttemptParameter(std::string value);
 

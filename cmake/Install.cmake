@@ -5,8 +5,10 @@ set(runtime_libraries vknabaseserverprofileprovider nvlog vkcommon vkproduct vki
 # An object manager may load the provider through a link in a folder of its own, and $ORIGIN is that folder then; so the
 # installed libraries name their own folder as well. Which one that is becomes known when installing (--prefix): room for
 # it is kept in the built libraries by a long name of the same place. In the system's own folder none is needed.
+# It is built with the path to be installed, since CMake would end a path that it changes when installing with an empty
+# element, and that stands for the directory a process is started in.
 string(REPEAT "/." 200 room)
-set_target_properties(${runtime_libraries} PROPERTIES BUILD_RPATH "$ORIGIN${room}" INSTALL_RPATH "$ORIGIN")
+set_target_properties(${runtime_libraries} PROPERTIES BUILD_WITH_INSTALL_RPATH ON INSTALL_RPATH "$ORIGIN${room}")
 
 # Debug information names the sources from the tree's root on, not where the tree lay when it was built.
 foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_core vkcim)
@@ -52,6 +54,10 @@ vk_configured(tools/register-links.sh.in ${VK_SHARE_DIR} provider FILES)
 vk_configured(tools/register-openpegasus.sh.in ${VK_SHARE_DIR} provider FILES)
 vk_configured(tools/register-sfcb.sh.in ${VK_SHARE_DIR} provider FILES)
 vk_configured(tools/vk-provider-check.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
+# vk-host-snapshot sees the same placeholders as the provider.
+set(placeholders ${CMAKE_SOURCE_DIR}/platform/host/Placeholders.inc)
+set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${placeholders})
+file(READ ${placeholders} VK_PLACEHOLDERS)
 vk_configured(tools/vk-host-snapshot.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
 install(FILES ${VK_SCHEMA_DIR}/libvknabaseserverprofileprovider.7 DESTINATION ${CMAKE_INSTALL_MANDIR}/man7
     COMPONENT provider)

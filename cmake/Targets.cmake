@@ -4,7 +4,7 @@
 function(vk_platform_library name)
     cmake_parse_arguments(ARG "" "" "LINK" ${ARGN})
     add_library(${name} SHARED ${ARG_UNPARSED_ARGUMENTS})
-    set_target_properties(${name} PROPERTIES VERSION 1 SOVERSION 1 INSTALL_RPATH "$ORIGIN")
+    set_target_properties(${name} PROPERTIES VERSION 1 SOVERSION 1)
     target_compile_options(${name} PRIVATE -fvisibility=default)
     target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/platform/include PRIVATE ${CMAKE_SOURCE_DIR}/platform)
     target_link_libraries(${name} PRIVATE vk_settings ${ARG_LINK})

@@ -1,5 +1,6 @@
 #include "common/Text.h"
 #include "fuzz/Expect.h"
+#include "host/Placeholder.h"
 #include "host/Smbios.h"
 
 #include <algorithm>
@@ -8,7 +9,6 @@
 namespace {
 
 using namespace VK;
-using namespace VK::Host;
 using fuzz::expect;
 
 /// An entry point of version 3 without a fault, so that the table's parser is reached whatever the table is.
@@ -24,6 +24,10 @@ auto allOf(const SmbiosSystem& system) {
     return std::tie(system.manufacturer, system.product, system.version, system.serial, system.sku, system.uuid);
 }
 
+auto allOf(const SmbiosBaseBoard& board) {
+    return std::tie(board.manufacturer, board.product);
+}
+
 auto allOf(const SmbiosChassis& chassis) {
     return std::tie(chassis.manufacturer, chassis.version, chassis.serial, chassis.sku, chassis.type,
                     chassis.bootUpState, chassis.powerSupplyState, chassis.thermalState);
@@ -32,6 +36,13 @@ auto allOf(const SmbiosChassis& chassis) {
 bool isClean(const std::string& text) {
     return text.size() <= LONGEST_TEXT && trimmed(text) == text &&
            std::all_of(text.begin(), text.end(), [](char c) { return c >= ' ' && c <= '~'; });
+}
+
+void checkText(const std::string& text) {
+    expect(isClean(text), "a text is not clean");
+    for (const FirmwareText kind : {FirmwareText::Other, FirmwareText::Model, FirmwareText::ChassisSku})
+        expect(isPlaceholder(text, kind) == isPlaceholder(". " + lowerCase(text) + " .", kind),
+               "a placeholder hangs on its letter case, or on what stands around it");
 }
 
 /// Empty, or groups of 8, 4, 4, 4 and 12 digits.
@@ -46,12 +57,17 @@ void checkTexts(const Smbios& smbios) {
     if (const auto& system = smbios.system) {
         for (const auto* text :
              {&system->manufacturer, &system->product, &system->version, &system->serial, &system->sku})
-            expect(isClean(*text), "a text of the system is not clean");
+            checkText(*text);
         expect(isUuid(system->uuid), "the system's UUID is none");
+        expect(isUuid(uuidFromText(system->uuid)), "the system's UUID is none as text");
+    }
+    if (const auto& board = smbios.baseBoard) {
+        checkText(board->manufacturer);
+        checkText(board->product);
     }
     for (const SmbiosChassis& chassis : smbios.chassis) {
         for (const auto* text : {&chassis.manufacturer, &chassis.version, &chassis.serial, &chassis.sku})
-            expect(isClean(*text), "a text of a chassis is not clean");
+            checkText(*text);
         expect(chassis.type <= 127, "the lock bit was left in a chassis' type");
         expect(std::max({chassis.bootUpState, chassis.powerSupplyState, chassis.thermalState}) <= 255, "no byte");
     }
@@ -61,6 +77,8 @@ void checkTexts(const Smbios& smbios) {
 void checkBegin(const Smbios& begin, const Smbios& whole) {
     if (begin.system)
         expect(whole.system && allOf(*begin.system) == allOf(*whole.system), "what follows changed the system");
+    if (begin.baseBoard)
+        expect(whole.baseBoard && allOf(*begin.baseBoard) == allOf(*whole.baseBoard), "what follows changed the board");
     expect(begin.chassis.size() <= whole.chassis.size(), "what follows took a chassis away");
     for (std::size_t i = 0; i < begin.chassis.size(); ++i)
         expect(allOf(begin.chassis[i]) == allOf(whole.chassis[i]), "what follows changed a chassis");
@@ -98,7 +116,8 @@ extern "C" int LLVMFuzzerTestOneInput(const unsigned char* data, std::size_t siz
     const Smbios smbios = parseSmbios(bytes.substr(0, length), table);
     checkTexts(smbios);
     if (!smbios.entryPointProblem.empty())
-        expect(!smbios.system && smbios.chassis.empty() && smbios.problems.empty(), "a refused table was read");
+        expect(!smbios.system && !smbios.baseBoard && smbios.chassis.empty() && smbios.problems.empty(),
+               "a refused table was read");
     checkTable(table);
     return 0;
 }

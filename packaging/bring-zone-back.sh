@@ -1,69 +1,60 @@
 # shellcheck shell=sh
 # Puts back the time zone that the provider replaced when daylight saving was switched off or an offset was set. What was
-# there before is kept in one file: the line "vk-zone 1", then for /etc/localtime and for /etc/timezone a line "absent 0",
-# "link LENGTH" or "file LENGTH", that many bytes, and a line end. A file that is not of that form is left alone.
-# There is no per cent sign in it: rpm would take that for one of its macros.
+# there before is kept in the directory former-zone: /etc/localtime as the very link or file, or an empty file
+# no-localtime where there was none, and /etc/timezone. There is no per cent sign in here: rpm would take that for one of
+# its macros.
 
-# zone_entry NUMBER: sets kind, length and start (the first byte, counted from 1) of the first or second entry.
-zone_entry() {
+# take_first_version FILE: version 1.0.0 kept both in one file: the line "vk-zone 1", then for each of the two a line
+# "absent 0", "link LENGTH" or "file LENGTH", that many bytes and a line end. Makes the directory of it.
+take_first_version() {
+    [ "$(head -n 1 "$1")" = "vk-zone 1" ] && mkdir "$kept" || return 1
     start=11
-    entry=1
-    while :; do
-        line=$(tail -c "+$start" "$kept" | head -n 1)
-        case $line in
-        "absent "*) kind="absent" ;;
-        "link "*) kind="link" ;;
-        "file "*) kind="file" ;;
-        *) return 1 ;;
-        esac
+    for name in localtime timezone; do
+        line=$(tail -c "+$start" "$1" | head -n 1)
         length=${line#* }
         case $length in "" | *[!0-9]*) return 1 ;; esac
         start=$((start + ${#line} + 1))
-        [ "$entry" -lt "$1" ] || return 0
+        case $line in
+        "link "*) ln -s "$(tail -c "+$start" "$1" | head -c "$length")" "$kept/$name" || return 1 ;;
+        "file "*) tail -c "+$start" "$1" | head -c "$length" >"$kept/$name" || return 1 ;;
+        "absent 0") : >"$kept/no-$name" ;;
+        *) return 1 ;;
+        esac
         start=$((start + length + 1))
-        entry=$((entry + 1))
     done
+    [ "$(wc -c <"$1")" -eq $((start - 1)) ]
 }
 
-zone_bytes() { tail -c "+$start" "$kept" | head -c "$length"; }
-
-# put_zone_entry FILE: replaces FILE at one stroke by what zone_entry found; a link only where it leads somewhere.
-put_zone_entry() {
-    case $kind in
-    link)
-        ln -sfn "$(zone_bytes)" "$1.vk-new" || return 1
-        if [ ! -e "$1.vk-new" ]; then
-            rm -f "$1.vk-new"
-            return 1
-        fi
-        ;;
-    file)
-        if ! zone_bytes >"$1.vk-new" || [ "$(wc -c <"$1.vk-new")" -ne "$length" ]; then
-            rm -f "$1.vk-new"
-            return 1
-        fi
-        chmod 644 "$1.vk-new"
-        ;;
-    absent)
-        rm -f "$1"
-        return
-        ;;
-    esac
-    mv -fT "$1.vk-new" "$1"
+# put_zone_file NAME [START]: replaces a file of /etc by the kept one at one stroke, if it begins so or leads to what
+# does.
+put_zone_file() {
+    fresh=$etc/.$1.vk-new
+    rm -f "$fresh"
+    if cp -a "$kept/$1" "$fresh" 2>/dev/null && [ "$(head -c "${#2}" "$fresh" 2>/dev/null)" = "$2" ] &&
+        mv -fT "$fresh" "$etc/$1"; then
+        return 0
+    fi
+    rm -f "$fresh"
+    return 1
 }
 
 # bring_zone_back [ROOT]
 bring_zone_back() {
-    kept=${1:-}/var/lib/vk/instrumentation/replaced-zone
-    [ -f "$kept" ] || return 0
-    if [ "$(head -n 1 "$kept")" != "vk-zone 1" ] || ! zone_entry 1 || ! put_zone_entry "${1:-}/etc/localtime"; then
+    etc=${1:-}/etc
+    kept=${1:-}/var/lib/vk/instrumentation/former-zone
+    older=${1:-}/var/lib/vk/instrumentation/replaced-zone
+    if [ ! -e "$kept" ]; then
+        [ -f "$older" ] || return 0
+        take_first_version "$older" || rm -rf "$kept"
+    fi
+    if [ -e "$kept/no-localtime" ]; then
+        rm -f "$etc/localtime"
+    elif ! put_zone_file localtime TZif; then
         echo "The time zone that was replaced cannot be brought back; it stays as it is." >&2
         return 0
     fi
-    if [ -e "${1:-}/etc/timezone" ] && zone_entry 2 && [ "$kind" != absent ]; then
-        put_zone_entry "${1:-}/etc/timezone" || :
-    fi
-    rm -f "$kept"
+    if [ -f "$etc/timezone" ] && [ -e "$kept/timezone" ]; then put_zone_file timezone "" || :; fi
+    rm -rf "$kept" "$older"
 }
 
 # forget_provider [ROOT]: removes what the provider kept.

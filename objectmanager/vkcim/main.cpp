@@ -1,4 +1,5 @@
 #include "objectmanager/vkcim/Arguments.h"
+#include "objectmanager/vkcim/OwnOutput.h"
 #include "objectmanager/vkcim/Run.h"
 
 #include <unistd.h>
@@ -22,8 +23,12 @@ bool wantsColours() {
 
 int main(int argc, char** argv) {
     const vkcim::Parsed parsed = vkcim::parseArguments(std::vector<std::string>(argv + (argc > 0), argv + argc));
-    if (parsed.arguments) return vkcim::run(*parsed.arguments, {std::cin, std::cout, std::cerr, wantsColours()});
-    std::cout << parsed.output << std::flush;
+    const bool colours = wantsColours();
+    vkcim::OwnOutput output;
+    if (parsed.arguments) return vkcim::run(*parsed.arguments, {std::cin, output, std::cerr, colours});
+    output << parsed.output << std::flush;
     std::cerr << parsed.error;
-    return parsed.exitStatus;
+    if (output) return parsed.exitStatus;
+    std::cerr << "vkcim: the help cannot be written\n";
+    return 1;
 }

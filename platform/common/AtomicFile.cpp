@@ -75,26 +75,41 @@ int putInPlace(int folder, const std::string& from, const std::string& to) {
     return 0;
 }
 
-} // namespace
-
-int replaceFile(int folder, const std::string& name, const std::string& bytes, const FileOwner& owner) {
+/// Has what replaces `name` made beside it, under a name that is handed over, and puts it in place.
+template <class Make>
+int replace(int folder, const std::string& name, const Make& make) {
     const std::string fresh = besides(name);
     if (unlinkat(folder, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
-    const FileDescriptor fd(openat(folder, fresh.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
-    if (!fd) return errno;
-    int error = fill(fd.get(), bytes, owner);
+    int error = make(fresh.c_str());
     if (error == 0) error = putInPlace(folder, fresh, name);
-    if (error != 0) unlinkat(folder, fresh.c_str(), 0);
+    // It is still there after a failure, and when it was the file in place already: renaming does nothing then.
+    unlinkat(folder, fresh.c_str(), 0);
     return error;
 }
 
+} // namespace
+
+int replaceFile(int folder, const std::string& name, const std::string& bytes, const FileOwner& owner) {
+    return replace(folder, name, [&](const char* fresh) {
+        const FileDescriptor fd(openat(folder, fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
+        return fd ? fill(fd.get(), bytes, owner) : errno;
+    });
+}
+
 int replaceLink(int folder, const std::string& name, const std::string& target) {
-    const std::string fresh = besides(name);
-    if (unlinkat(folder, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
-    if (symlinkat(target.c_str(), folder, fresh.c_str()) != 0) return errno;
-    const int error = putInPlace(folder, fresh, name);
-    if (error != 0) unlinkat(folder, fresh.c_str(), 0);
-    return error;
+    return replace(folder, name,
+                   [&](const char* fresh) { return symlinkat(target.c_str(), folder, fresh) == 0 ? 0 : errno; });
+}
+
+int replaceByLinking(int folder, const std::string& name, int from) {
+    return replace(folder, name,
+                   [&](const char* fresh) { return linkat(from, name.c_str(), folder, fresh, 0) == 0 ? 0 : errno; });
+}
+
+int removeFile(int folder, const std::string& name) {
+    if (unlinkat(folder, name.c_str(), 0) != 0) return errno == ENOENT ? 0 : errno;
+    fsync(folder);
+    return 0;
 }
 
 } // namespace VK

@@ -20,4 +20,11 @@ int replaceFile(int folder, const std::string& name, const std::string& bytes, c
 /// The same for a symbolic link.
 int replaceLink(int folder, const std::string& name, const std::string& target);
 
+/// The same with what has that name in another directory, `from`: it is the very file or link, under both names. Not
+/// possible between file systems (EXDEV).
+int replaceByLinking(int folder, const std::string& name, int from);
+
+/// Removes a file or link, surviving a crash; 0 also when there is none.
+int removeFile(int folder, const std::string& name);
+
 } // namespace VK

@@ -4,11 +4,9 @@
 
 namespace VK {
 
-DateTime::DateTime(long secondsSinceEpoch, unsigned int outputFormat)
-    : seconds(secondsSinceEpoch), format(outputFormat) {}
+DateTime::DateTime(long secondsSinceEpoch, unsigned int) : seconds(secondsSinceEpoch) {}
 
 DateTime::operator std::string() const {
-    static_cast<void>(format);              // there is one form only
     constexpr long EARLIEST = -62167219200; // 0000-01-01 00:00:00
     constexpr long LATEST = 253402300799;   // 9999-12-31 23:59:59
     if (seconds < EARLIEST || seconds > LATEST) return {};

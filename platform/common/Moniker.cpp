@@ -19,7 +19,7 @@ unsigned int Moniker::getKeyCount() const {
 
 bool Moniker::selectKey(unsigned int index) {
     const bool there = index < keys.size();
-    // Off the end it stays off, whatever is added later.
+    // A caller that overlooked the false must not read a pair that it never selected.
     current = there ? index : std::numeric_limits<unsigned int>::max();
     return there;
 }

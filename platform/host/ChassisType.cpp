@@ -18,23 +18,23 @@ constexpr const char* NAMES[] = {
     "Notebook",
     "Hand Held",
     "Docking Station",
-    "All In One",
+    "All in One",
     "Sub Notebook",
     "Space-saving",
     "Lunch Box",
     "Main Server Chassis",
     "Expansion Chassis",
-    "Sub Chassis",
+    "SubChassis",
     "Bus Expansion Chassis",
     "Peripheral Chassis",
     "RAID Chassis",
     "Rack Mount Chassis",
     "Sealed-case PC",
-    "Multi-system",
+    "Multi-system Chassis",
     "CompactPCI",
     "AdvancedTCA",
     "Blade",
-    "Blade Enclosing",
+    "Blade Enclosure",
     "Tablet",
     "Convertible",
     "Detachable",
@@ -44,7 +44,7 @@ constexpr const char* NAMES[] = {
     "Stick PC",
 };
 
-constexpr ChassisType LAST = sizeof NAMES / sizeof *NAMES - 1;
+static_assert(sizeof NAMES / sizeof *NAMES == LAST_CHASSIS_TYPE + 1);
 
 bool isBetween(ChassisType type, ChassisType first, ChassisType last) {
     return first <= type && type <= last;
@@ -53,11 +53,11 @@ bool isBetween(ChassisType type, ChassisType first, ChassisType last) {
 } // namespace
 
 std::string chassisTypeName(ChassisType type) {
-    return NAMES[isBetween(type, 1, LAST) ? type : UNKNOWN_CHASSIS];
+    return NAMES[isBetween(type, 1, LAST_CHASSIS_TYPE) ? type : UNKNOWN_CHASSIS];
 }
 
 unsigned int packageType(ChassisType type) {
-    if (!isBetween(type, 1, LAST) || type == UNKNOWN_CHASSIS) return 0;
+    if (!isBetween(type, 1, LAST_CHASSIS_TYPE) || type == UNKNOWN_CHASSIS) return 0;
     if (type == 23) return 2;
     if (type == 28) return 3;
     return isBetween(type, 3, 7) || isBetween(type, 17, 22) || isBetween(type, 24, 27) || type == 29 ? 1 : 4;

@@ -9,6 +9,7 @@ namespace VK::Host {
 /// nothing.
 using ChassisType = unsigned int;
 constexpr ChassisType UNKNOWN_CHASSIS = 2;
+constexpr ChassisType LAST_CHASSIS_TYPE = 36;
 
 /// The type's name in SMBIOS's words, `Rack Mount Chassis`; `Unknown` for numbers that stand for nothing.
 std::string chassisTypeName(ChassisType type);

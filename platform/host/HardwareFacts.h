@@ -1,22 +1,13 @@
 #pragma once
 
 #include "host/ChassisType.h"
+#include "host/Fact.h"
 #include "vk/Root.h"
 
 #include <string>
 #include <vector>
 
 namespace VK::Host {
-
-/// A text that the host tells and the file that it stands in, or why there is none.
-struct Fact {
-    std::string text;    ///< empty when the host does not tell it
-    std::string source;  ///< the file; for a text that is no use, where that stands
-    int error = 0;       ///< without text: ENOENT the host has no such thing, EACCES we may not see it
-    std::string useless; ///< without text: a placeholder that stands in its place
-
-    explicit operator bool() const { return !text.empty(); }
-};
 
 /// One chassis; states already are node statuses.
 struct ChassisFacts {
@@ -30,7 +21,8 @@ struct ChassisFacts {
 
 /// What of a host does not change while it runs.
 struct HardwareFacts {
-    int tablesError = 0;               ///< why the SMBIOS tables could not be opened
+    Fact noTables;                     ///< why the SMBIOS tables cannot be used; its error is 0 when they can
+    Fact noChassis;                    ///< why there is no chassis, where there is none
     std::vector<std::string> problems; ///< what is wrong with the tables, which file first
 
     Fact manufacturer; ///< of the system, as are the next four

@@ -9,51 +9,39 @@ namespace VK::Host {
 
 namespace {
 
-std::string whyNoTables(int error) {
-    switch (error) {
-    case ENOENT:
-        return "the firmware provides none (/sys/firmware/dmi/tables is not there)";
-    case EACCES:
-    case EPERM:
-        return "/sys/firmware/dmi/tables may be read by root alone";
-    default:
-        return "/sys/firmware/dmi/tables cannot be read (" + errorText(error) + ")";
-    }
-}
-
-/// Tables that are there but hidden from us may well tell of one.
-std::string whyNoChassis(int tablesError) {
-    return tablesError == 0 || tablesError == ENOENT ? "the host does not tell of one" : whyNoTables(tablesError);
-}
-
-std::string reason(const Fact& fact) {
+/// Why there is no text; `untold` for a host that simply does not have it.
+std::string reason(const Fact& fact, const char* untold) {
     if (!fact.useless.empty()) return fact.source + " holds a placeholder, " + inQuotes(fact.useless);
+    if (!fact.problem.empty()) return fact.source + " " + fact.problem;
     switch (fact.error) {
     case ENOENT:
-        return "the host does not tell it";
+        return untold;
     case EACCES:
     case EPERM:
         return fact.source + " may be read by root alone";
     default:
-        return fact.source + ": " + errorText(fact.error);
+        return fact.source + " cannot be read (" + errorText(fact.error) + ")";
     }
 }
 
 void noteMissing(std::vector<std::string>& notes, const char* what, const Fact& fact) {
-    if (!fact) notes.push_back(std::string("no ") + what + ": " + reason(fact));
+    if (!fact) notes.push_back(std::string("no ") + what + ": " + reason(fact, "the host does not tell it"));
 }
 
 } // namespace
 
 std::vector<std::string> notesOn(const HardwareFacts& facts) {
     std::vector<std::string> notes;
-    if (facts.tablesError != 0) notes.push_back("no SMBIOS tables: " + whyNoTables(facts.tablesError));
+    if (facts.noTables.error != 0 && facts.problems.empty()) // damage is among the problems
+        notes.push_back("no SMBIOS tables: " +
+                        reason(facts.noTables, "the firmware provides none (/sys/firmware/dmi/tables is not there)"));
     notes.insert(notes.end(), facts.problems.begin(), facts.problems.end());
     noteMissing(notes, "UUID", facts.uuid);
     noteMissing(notes, "serial number", facts.serial);
     noteMissing(notes, "manufacturer", facts.manufacturer);
     noteMissing(notes, "model", facts.model);
-    if (facts.chassis.empty()) notes.push_back("no chassis: " + whyNoChassis(facts.tablesError));
+    if (facts.chassis.empty())
+        notes.push_back("no chassis: " + reason(facts.noChassis, "the host does not tell of one"));
     noteMissing(notes, "primary owner", facts.ownerName);
     return notes;
 }

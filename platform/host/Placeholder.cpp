@@ -1,6 +1,7 @@
 #include "host/Placeholder.h"
 
 #include "common/Text.h"
+#include "host/ChassisType.h"
 
 #include <algorithm>
 #include <string>
@@ -9,74 +10,152 @@ namespace VK::Host {
 
 namespace {
 
-constexpr std::string_view FILLERS[] = {"default string", "none",    "n/a",   "na",     "null", "(none)",  "unknown",
-                                        "undefined",      "invalid", "empty", "o.e.m.", "oem",  "standard"};
+constexpr unsigned int NOT_COUNTED = 0;
 
-constexpr std::string_view FIELD_NAMES[] = {"system manufacturer",  "system product name",
-                                            "system serial number", "chassis manufacture",
-                                            "chassis manufacturer", "chassis serial number",
-                                            "chassis version",      "asset tag",
-                                            "no asset tag",         "sku",
-                                            "sku number",           "base board serial number"};
+constexpr PlaceholderRule RULES[] = {
+#define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) {PlaceholderRule::MATCH, MACHINES, REASON, TEXTS},
+#include "host/Placeholders.inc"
+};
 
-constexpr std::string_view COUNTING_SERIALS[] = {"0123456789", "123456789", "1234567890", "9876543210"};
+#define FIELD_WORDS(ROLE, WORDS) constexpr std::string_view FIELD_WORDS_##ROLE = WORDS;
+#include "host/Placeholders.inc"
 
-template <std::size_t N>
-bool contains(const std::string_view (&list)[N], std::string_view text) {
-    return std::find(std::begin(list), std::end(list), text) != std::end(list);
+/// A text as the rules compare it.
+struct Compared {
+    std::string plain;   ///< lower case, without blanks and dots around it
+    std::string letters; ///< its letters and digits alone
+};
+
+bool isDigit(char c) {
+    return c >= '0' && c <= '9';
 }
 
-/// Trimmed, lower case, each run of blanks one blank.
-std::string normalised(std::string_view text) {
-    std::string result;
-    for (const char c : lowerCase(trimmed(text))) {
-        const char each = c == '\t' ? ' ' : c;
-        if (each != ' ' || result.back() != ' ') result += each;
+bool isLetterOrDigit(char c) {
+    return isDigit(c) || (c >= 'a' && c <= 'z');
+}
+
+std::string lettersOf(std::string_view text) {
+    std::string letters;
+    std::copy_if(text.begin(), text.end(), std::back_inserter(letters), isLetterOrDigit);
+    return letters;
+}
+
+Compared compared(std::string_view text) {
+    constexpr std::string_view AROUND = " \t.";
+    const std::string_view whole = trimmed(text);
+    const std::size_t begin = std::min(whole.find_first_not_of(AROUND), whole.size());
+    const std::string_view inner = whole.substr(begin, whole.find_last_not_of(AROUND) + 1 - begin);
+    std::string plain = lowerCase(inner);
+    std::string letters = lettersOf(plain);
+    return {std::move(plain), std::move(letters)};
+}
+
+/// Takes a text of the table, which is in lower case, off the front of letters and digits.
+bool take(std::string_view& letters, std::string_view text) {
+    std::string_view rest = letters;
+    for (const char c : text) {
+        if (!isLetterOrDigit(c)) continue;
+        if (rest.empty() || rest.front() != c) return false;
+        rest.remove_prefix(1);
     }
-    return result;
-}
-
-bool startsWith(std::string_view text, std::string_view start) {
-    return text.substr(0, start.size()) == start;
-}
-
-/// Takes `start` off the text's front.
-bool take(std::string_view& text, std::string_view start) {
-    if (!startsWith(text, start)) return false;
-    text.remove_prefix(start.size());
+    letters = rest;
     return true;
 }
 
-/// "to be filled by o.e.m." in all its spellings, also with more behind it.
-bool isToBeFilled(std::string text) {
-    text.erase(std::remove(text.begin(), text.end(), '.'), text.end());
-    std::string_view rest = text;
-    if (!take(rest, "to be ")) return false;
-    if (!take(rest, "filled") && !take(rest, "set") && !take(rest, "defined")) return false;
-    return rest.empty() || startsWith(rest, " by oem") || startsWith(rest, " by odm") || startsWith(rest, " by o e m");
+/// Whether the test holds for one of the texts that are separated by |.
+template <typename Test>
+bool anyOf(std::string_view texts, Test test) {
+    while (true) {
+        const std::size_t end = texts.find('|');
+        if (test(texts.substr(0, end))) return true;
+        if (end == std::string_view::npos) return false;
+        texts.remove_prefix(end + 1);
+    }
 }
 
-bool isNotSomething(std::string_view text) {
-    static constexpr std::string_view WORDS[] = {"specified", "available", "applicable", "defined",
-                                                 "set",       "present",   "supported"};
-    return take(text, "not ") && contains(WORDS, text);
+bool isOneOf(std::string_view texts, std::string_view letters) {
+    return anyOf(texts, [letters](std::string_view text) {
+        std::string_view rest = letters;
+        return take(rest, text) && rest.empty();
+    });
 }
 
-bool isFillerCharacters(std::string_view text) {
-    if (text.find_first_not_of(".- x") == std::string_view::npos) return true;
-    return text.size() > 1 && text.find_first_not_of(text.front()) == std::string_view::npos;
+bool beginsWithOneOf(std::string_view texts, std::string_view letters) {
+    return anyOf(texts, [letters](std::string_view text) {
+        std::string_view rest = letters;
+        return take(rest, text);
+    });
+}
+
+/// Without a number that stands directly behind a letter (SKU0). A longer one may be somebody's, and so may one that
+/// stands apart (SKU-27).
+std::string_view withoutNumber(std::string_view plain) {
+    constexpr std::size_t LONGEST = 3;
+    while (!plain.empty() && !isLetterOrDigit(plain.back())) plain.remove_suffix(1);
+    std::string_view word = plain;
+    while (!word.empty() && isDigit(word.back())) word.remove_suffix(1);
+    const bool numbered = !word.empty() && isLetterOrDigit(word.back()) && plain.size() - word.size() <= LONGEST;
+    return numbered ? word : plain;
+}
+
+/// Any number of words for whose the field is, then the field.
+bool isFieldName(std::string_view fields, std::string_view letters, bool isOwned = false) {
+    if (isOneOf(fields, letters) || (isOwned && isOneOf(FIELD_WORDS_OwnedField, letters))) return true;
+    return anyOf(FIELD_WORDS_Owner, [fields, letters](std::string_view owner) {
+        std::string_view rest = letters;
+        return take(rest, owner) && isFieldName(fields, rest, true);
+    });
+}
+
+bool isCounting(std::string_view plain) {
+    const std::size_t digits = std::min(plain.find_first_not_of("0123456789"), plain.size());
+    if (digits < 4) return false;
+    const auto step = [plain](std::size_t i) { return (plain[i] - plain[i - 1] + 10) % 10; };
+    if (step(1) != 1 && step(1) != 9) return false;
+    for (std::size_t i = 2; i < digits; ++i)
+        if (step(i) != step(1)) return false;
+    if (digits == plain.size()) return true;
+    // As hexadecimal digits do: 0123456789ABCDEF.
+    constexpr std::string_view LETTERS = "abcdefghijklmnopqrstuvwxyz";
+    const char last = plain[digits - 1];
+    return step(1) == 1 && (last == '9' || last == '0') &&
+           plain.substr(digits) == LETTERS.substr(0, plain.size() - digits);
+}
+
+bool isChassisTypeName(std::string_view letters) {
+    for (ChassisType type = 1; type <= LAST_CHASSIS_TYPE; ++type)
+        if (lettersOf(lowerCase(chassisTypeName(type))) == letters) return true;
+    return false;
+}
+
+bool matches(const PlaceholderRule& rule, const Compared& text, FirmwareText kind) {
+    constexpr std::size_t SHORTEST_COUNTING_MODEL = 8;
+    switch (rule.match) {
+    case PlaceholderRule::Whole:
+        return isOneOf(rule.texts, text.letters);
+    case PlaceholderRule::Begin:
+        return beginsWithOneOf(rule.texts, text.letters);
+    case PlaceholderRule::FieldName:
+        return isFieldName(rule.texts, lettersOf(withoutNumber(text.plain)));
+    case PlaceholderRule::Counting:
+        return isCounting(text.plain) && (kind != FirmwareText::Model || text.plain.size() >= SHORTEST_COUNTING_MODEL);
+    case PlaceholderRule::OneCharacter:
+        return text.plain.size() > 1 && text.plain.find_first_not_of(text.plain.front()) == std::string::npos;
+    case PlaceholderRule::NoLetter:
+        return text.letters.find_first_not_of('x') == std::string::npos;
+    case PlaceholderRule::ChassisType:
+        return kind == FirmwareText::ChassisSku && isChassisTypeName(text.letters);
+    }
+    return false;
 }
 
 } // namespace
 
-bool isPlaceholder(std::string_view text) {
-    const std::string plain = normalised(text);
-    return isFillerCharacters(plain) || contains(FILLERS, plain) || contains(FIELD_NAMES, plain) ||
-           isNotSomething(plain) || isToBeFilled(plain);
-}
-
-bool isPlaceholderSerial(std::string_view text) {
-    return isPlaceholder(text) || contains(COUNTING_SERIALS, trimmed(text)) || trimmed(text) == "0";
+const PlaceholderRule* placeholderRule(std::string_view text, FirmwareText kind) {
+    const Compared each = compared(text);
+    const auto* const rule = std::find_if(std::begin(RULES), std::end(RULES),
+                                          [&](const PlaceholderRule& one) { return matches(one, each, kind); });
+    return rule != std::end(RULES) ? rule : nullptr;
 }
 
 } // namespace VK::Host

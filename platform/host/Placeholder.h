@@ -4,12 +4,37 @@
 
 namespace VK::Host {
 
-/// Whether a text of the firmware tells nothing: what a manufacturer left as it came ("To Be Filled By O.E.M."),
-/// the name of the field itself, fillers. Case, blanks at the ends and how many blanks stand between words do not
-/// matter.
-bool isPlaceholder(std::string_view text);
+/// What a text of the firmware is about, where that matters.
+enum class FirmwareText {
+    Other,
+    Model, ///< or a version: real ones can be short numbers that count
+    ChassisSku,
+};
 
-/// The same for a serial number, which can moreover be one that only counts (0123456789).
-bool isPlaceholderSerial(std::string_view text);
+/// A way to see that a text of the firmware says nothing. All of them stand in Placeholders.inc.
+struct PlaceholderRule {
+    enum Match {
+        Whole,        ///< the letters and digits of the text are those of one of `texts`
+        Begin,        ///< they begin like one of `texts`
+        FieldName,    ///< one of `texts`, maybe with words for whose it is before it and a short number at its end
+        Counting,     ///< four digits or more, each one more (or each one less) than the one before it, 9 and 0 being
+                      ///< neighbours; behind 9 or 0 letters may count on. A model or version has eight at least.
+        OneCharacter, ///< one character, twice or more often
+        NoLetter,     ///< no letter and no digit, or x alone
+        ChassisType,  ///< of a chassis' SKU: the name of a chassis type
+    };
+    Match match;
+    unsigned int machines; ///< see Placeholders.inc
+    std::string_view reason;
+    std::string_view texts;
+};
+
+/// The rule by which a text says nothing; null for one that says something. Letter case does not matter, nor do
+/// blanks and dots around the text.
+const PlaceholderRule* placeholderRule(std::string_view text, FirmwareText kind);
+
+inline bool isPlaceholder(std::string_view text, FirmwareText kind = FirmwareText::Other) {
+    return placeholderRule(text, kind) != nullptr;
+}
 
 } // namespace VK::Host

@@ -2,11 +2,14 @@
 
 #include "common/Text.h"
 
+#include <set>
+
 namespace VK::Host {
 
 namespace {
 
 constexpr unsigned int SYSTEM = 1;
+constexpr unsigned int BASE_BOARD = 2;
 constexpr unsigned int CHASSIS = 3;
 
 /// Reads fields of one structure.
@@ -27,6 +30,10 @@ SmbiosSystem readSystem(const Fields& fields, SmbiosVersion version) {
     system.uuid = uuidFromBytes(fields.structure.bytesAt(0x08, 16).value_or(std::string_view()), version);
     system.sku = fields.text(0x19);
     return system;
+}
+
+SmbiosBaseBoard readBaseBoard(const Fields& fields) {
+    return {fields.text(0x04), fields.text(0x05)};
 }
 
 SmbiosChassis readChassis(const Fields& fields) {
@@ -52,13 +59,18 @@ Smbios parseSmbios(std::string_view entryPoint, std::string_view table) {
     if (!entry.problem.empty()) return result;
     result.version = entry.version;
     std::size_t badIndexes = 0;
+    // Some firmware lists a chassis twice, under two handles. As two instances they would have the same path.
+    std::set<SmbiosStructure::Contents> seen;
     SmbiosTable structures(table.substr(0, entry.tableLength));
     while (const auto structure = structures.next()) {
         const Fields fields{*structure, badIndexes};
         if (structure->type() == SYSTEM && !result.system) result.system = readSystem(fields, entry.version);
-        if (structure->type() == CHASSIS) result.chassis.push_back(readChassis(fields));
+        if (structure->type() == BASE_BOARD && !result.baseBoard) result.baseBoard = readBaseBoard(fields);
+        if (structure->type() == CHASSIS && seen.insert(structure->contents()).second)
+            result.chassis.push_back(readChassis(fields));
     }
-    if (!structures.problem().empty()) result.problems.push_back(structures.problem());
+    result.breakOff = structures.problem();
+    if (!result.breakOff.empty()) result.problems.push_back(result.breakOff);
     if (badIndexes > 0)
         result.problems.push_back(std::to_string(badIndexes) + " string(s) that the table refers to are not there");
     return result;

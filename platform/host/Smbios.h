@@ -18,6 +18,12 @@ struct SmbiosSystem {
     std::string uuid;
 };
 
+/// What the tables say of the base board.
+struct SmbiosBaseBoard {
+    std::string manufacturer;
+    std::string product;
+};
+
 /// What the tables say of one chassis; states and types as numbered there, 0 where the structure does not reach.
 struct SmbiosChassis {
     std::string manufacturer;
@@ -32,10 +38,12 @@ struct SmbiosChassis {
 
 struct Smbios {
     SmbiosVersion version;
-    std::optional<SmbiosSystem> system; ///< the first of them
-    std::vector<SmbiosChassis> chassis; ///< all of them, in order
-    std::string entryPointProblem;      ///< why nothing was read
-    std::vector<std::string> problems;  ///< what is wrong with the table; what stands before that was read
+    std::optional<SmbiosSystem> system;       ///< the first of them
+    std::optional<SmbiosBaseBoard> baseBoard; ///< the first of them
+    std::vector<SmbiosChassis> chassis;       ///< all of them, in order; one that repeats another only once
+    std::string entryPointProblem;            ///< why nothing was read
+    std::string breakOff;              ///< where and why the table cannot be read on; what stands before it was read
+    std::vector<std::string> problems; ///< all that is wrong with the table, that included
 };
 
 /// Reads what the kernel shows as `smbios_entry_point` and `DMI`.

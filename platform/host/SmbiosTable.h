@@ -7,7 +7,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <vector>
+#include <utility>
 
 namespace VK::Host {
 
@@ -32,12 +32,17 @@ public:
     std::optional<unsigned int> byteAt(std::size_t offset) const;
     std::optional<std::string_view> bytesAt(std::size_t offset, std::size_t length) const;
 
+    /// All but type and handle: what stands behind the header, and the strings.
+    using Contents = std::pair<std::string_view, std::string_view>;
+    Contents contents() const { return {formatted.substr(HEADER), strings}; }
+
     /// The string whose index stands at the offset, as it is there. Empty where there is no such field, its index
-    /// is 0
-    /// ("not specified") or there are fewer strings; `badIndexes` counts the last kind.
+    /// is 0 ("not specified") or there are fewer strings; `badIndexes` counts the last kind.
     std::string_view stringAt(std::size_t offset, std::size_t& badIndexes) const;
 
 private:
+    static constexpr std::size_t HEADER = 4; ///< type, length and handle
+
     std::string_view formatted;
     std::string_view strings; ///< each with its NUL
 };

@@ -3,6 +3,7 @@
 #include "logger/FileSink.h"
 #include "logger/Line.h"
 #include "logger/Settings.h"
+#include "logger/SyslogSink.h"
 #include "logger/Write.h"
 
 #include <cerrno>
@@ -60,7 +61,7 @@ void writeToSyslog(const Event& event) noexcept {
     Line line;
     appendEvent(line, event);
     line.append('\0');
-    if (!line.failed()) syslog(priorityOf(event.level), "%s", line.text().data());
+    if (!line.failed()) sendToSyslog(priorityOf(event.level), line.text().data());
 }
 
 /// Out of line, so that a dropped line costs its caller nothing of this.

@@ -1,6 +1,6 @@
 #include "product/UniqueIdentifier.h"
 
-#include "product/Sha256.h"
+#include "product/HmacSha256.h"
 
 namespace VK {
 

@@ -77,7 +77,7 @@ bool ProviderUtilities::transformMonikerToObjectPath(Moniker& moniker, CMPIObjec
         if (moniker.getName(name) && moniker.getValue(value))
             allTaken = setKeyProperty(*objectPath, name.c_str(), value) && allTaken;
     }
-    moniker.selectKey(0);
+    if (moniker.getKeyCount() > 0) moniker.selectKey(0);
     return allTaken;
 }
 

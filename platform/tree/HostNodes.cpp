@@ -1,5 +1,6 @@
 #include "tree/HostNodes.h"
 
+#include "common/Text.h"
 #include "host/State.h"
 #include "vk/NodeLexicon.h"
 #include "zone/ZoneInForce.h"
@@ -87,11 +88,18 @@ void fill(Node& node, const Row (&rows)[N], const View& view) {
         if (const Told value = row.tell(view)) node.properties[row.property] = *value;
 }
 
+std::string firstWord(const std::string& text) {
+    return lowerCase(text.substr(0, text.find_first_of(" ,")));
+}
+
+/// Manufacturer and model. Some models name their manufacturer themselves: "Dell Computer Corporation" makes a "Dell
+/// PowerEdge 8450".
 std::string describe(const Host::HardwareFacts& host) {
     const std::string& manufacturer = host.manufacturer.text;
     const std::string& model = host.model.text;
     if (manufacturer.empty() && model.empty()) return "Linux " + host.architecture;
-    return manufacturer + (manufacturer.empty() || model.empty() ? "" : " ") + model;
+    if (manufacturer.empty() || firstWord(model) == firstWord(manufacturer)) return model;
+    return manufacturer + (model.empty() ? "" : " ") + model;
 }
 
 } // namespace

@@ -16,9 +16,9 @@ namespace {
 
 void logProblems(const Host::HardwareFacts& facts) {
     for (const std::string& problem : facts.problems) logLine(FAILURE, "readOnce", __LINE__, problem);
-    if (facts.tablesError != 0)
-        logLine(facts.tablesError == ENOENT ? DETAIL : NOTICE, "readOnce", __LINE__,
-                "no SMBIOS tables: " + errorText(facts.tablesError));
+    if (const Host::Fact& none = facts.noTables; none.error != 0 && facts.problems.empty()) // damage is logged above
+        logLine(none.error == ENOENT ? DETAIL : NOTICE, "readOnce", __LINE__,
+                "no SMBIOS tables: " + none.source + ": " + errorText(none.error));
 }
 
 } // namespace

@@ -134,24 +134,13 @@ std::int64_t RuleDay::inYear(int year) const {
 
 bool PosixRule::isDaylightAt(std::int64_t instant) const {
     if (!hasDaylightSaving) return false;
-    // What came last before the instant, a begin or an end; local years need not be the years of UTC.
-    std::int64_t latest = INT64_MIN;
-    bool daylight = false;
+    // As the C library has it: the year of UTC is looked at by itself. Daylight saving of a whole year therefore has
+    // its gap between New Year in UTC and New Year in local time, which every program on the host sees.
     const int year = yearOf(instant);
-    for (int each = year - 1; each <= year + 1; ++each) {
-        const std::int64_t begins = begin.inYear(each) - standardOffset;
-        const std::int64_t ends = end.inYear(each) - daylightOffset;
-        if (begins <= instant && begins > latest) {
-            latest = begins;
-            daylight = true;
-        }
-        // An end at the very instant of a begin yields to it: that is how a year-round daylight saving is written.
-        if (ends <= instant && ends > latest) {
-            latest = ends;
-            daylight = false;
-        }
-    }
-    return daylight;
+    const std::int64_t begins = begin.inYear(year) - standardOffset;
+    const std::int64_t ends = end.inYear(year) - daylightOffset;
+    if (begins > ends) return instant < ends || instant >= begins; // over the end of the year
+    return begins <= instant && instant < ends;
 }
 
 std::optional<PosixRule> parsePosixRule(std::string_view text) {

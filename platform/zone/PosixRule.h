@@ -26,7 +26,7 @@ struct PosixRule {
     RuleDay begin; ///< of daylight saving
     RuleDay end;
 
-    /// Whether daylight saving is in force at an instant.
+    /// Whether daylight saving is in force at an instant, as the C library says.
     bool isDaylightAt(std::int64_t instant) const;
     std::int32_t offsetAt(std::int64_t instant) const {
         return isDaylightAt(instant) ? daylightOffset : standardOffset;

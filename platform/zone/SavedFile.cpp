@@ -12,12 +12,7 @@ namespace {
 constexpr std::string_view HEADER = "vk-zone 1\n";
 constexpr std::string_view KINDS[] = {"absent", "link", "file"};
 
-void append(std::string& bytes, const SavedFile& file) {
-    bytes += KINDS[file.kind];
-    bytes += " " + std::to_string(file.content.size()) + "\n" + file.content + "\n";
-}
-
-/// Takes what `append` wrote off the front.
+/// Takes one of the two off the front.
 bool take(std::string_view& bytes, SavedFile& file) {
     const std::size_t blank = bytes.find(' ');
     const std::size_t end = bytes.find('\n');
@@ -57,22 +52,11 @@ int lookAt(const Root& root, const std::string& path, SavedFile& found) {
     return 0;
 }
 
-int putBack(int folder, const std::string& name, const SavedFile& saved) {
-    switch (saved.kind) {
-    case SavedFile::Link:
-        return replaceLink(folder, name, saved.content);
-    case SavedFile::File:
-        return replaceFile(folder, name, saved.content, FileOwner{0644, geteuid(), getegid()});
-    default:
-        return unlinkat(folder, name.c_str(), 0) == 0 || errno == ENOENT ? 0 : errno;
-    }
-}
-
-std::string writeSavedZone(const SavedZone& zone) {
-    std::string bytes(HEADER);
-    append(bytes, zone.localTime);
-    append(bytes, zone.zoneName);
-    return bytes;
+int putBack(int folder, const std::string& name, const SavedFile& saved, int from) {
+    if (saved.kind == SavedFile::Absent) return removeFile(folder, name);
+    if (from >= 0 && replaceByLinking(folder, name, from) == 0) return 0;
+    if (saved.kind == SavedFile::Link) return replaceLink(folder, name, saved.content);
+    return replaceFile(folder, name, saved.content, FileOwner{0644, geteuid(), getegid()});
 }
 
 std::optional<SavedZone> readSavedZone(std::string_view bytes) {

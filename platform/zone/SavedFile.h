@@ -21,17 +21,22 @@ struct SavedFile {
 /// Looks at a path: 0, or the errno value why that cannot be told. Links are not followed.
 int lookAt(const Root& root, const std::string& path, SavedFile& found);
 
-/// Puts at the name in a folder what was saved, at one stroke: 0, or the errno value.
-int putBack(int folder, const std::string& name, const SavedFile& saved);
+/// Puts at the name in a directory what was saved, at one stroke: 0, or the errno value. Where `from` is a directory
+/// that has it under the same name, it becomes the very file with owner, mode and label; between file systems a copy.
+int putBack(int folder, const std::string& name, const SavedFile& saved, int from = -1);
 
 /// What a change of zone replaced.
 struct SavedZone {
     SavedFile localTime; ///< /etc/localtime
     SavedFile zoneName;  ///< /etc/timezone
+
+    friend bool operator==(const SavedZone& a, const SavedZone& b) {
+        return a.localTime == b.localTime && a.zoneName == b.zoneName;
+    }
 };
 
-/// As bytes of one file, and back; nothing for bytes that are no such file.
-std::string writeSavedZone(const SavedZone& zone);
+/// Reads the one file in which version 1.0.0 remembered a zone: the line `vk-zone 1`, then for each of the two a line
+/// `absent 0`, `link LENGTH` or `file LENGTH`, that many bytes and a line end. Nothing for other bytes.
 std::optional<SavedZone> readSavedZone(std::string_view bytes);
 
 } // namespace VK::Zone

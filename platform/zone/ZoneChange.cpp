@@ -24,40 +24,44 @@ std::string offsetText(int minutes) {
     return (minutes < 0 ? "-" : "+") + std::string(digits.size() < 3 ? 3 - digits.size() : 0, '0') + digits;
 }
 
-/// Ends a change: the log line, and the process's own idea of local time.
-bool finish(const Root& root, bool done, const std::string& what, const ZoneFiles& files) {
-    if (!done) return refuse(what + " not changed: " + files.problem());
-    if (files.after().empty()) return true;
-    if (root.isLive()) tzset();
-    logLine(NOTICE, "setProperty", __LINE__,
-            what + " (" + files.before() + " became " + files.after() + ") by uid " + std::to_string(getuid()));
-    return true;
+bool refuse(const std::string& what, const ZoneFiles& files) {
+    return refuse(what + ": " + files.problem());
 }
 
-std::string fromTo(const std::string& what, const std::string& from, const std::string& to) {
-    return what + " from " + from + " to " + to;
+/// Ends a change: the process's own idea of local time, and the log line.
+bool finish(const Root& root, const std::string& what, const ZoneFiles& files) {
+    if (!files.changed()) return true;
+    if (root.isLive()) tzset();
+    logLine(NOTICE, "setProperty", __LINE__,
+            what + " (" + files.before().name + " became " + files.after().name + ") by uid " +
+                std::to_string(getuid()));
+    return true;
 }
 
 } // namespace
 
 bool changeOffset(const Root& root, int minutes) {
-    const int now = offsetInForce(root);
     if (minutes < -FARTHEST || minutes > FARTHEST)
         return refuse("offset from UTC of " + std::to_string(minutes) + " minutes is not between -840 and +840");
-    if (minutes == now) return true;
-    ZoneFiles files(root, [&] { return offsetInForce(root) == minutes; });
-    const bool done = files.replaceByOffset(minutes, ZoneFiles::KeepFirst);
-    return finish(root, done, fromTo("offset from UTC", offsetText(now), offsetText(minutes)), files);
+    if (minutes == offsetInForce(root)) return true;
+    ZoneFiles files(root);
+    if (!files.putOffset(minutes)) return refuse("offset from UTC not set to " + offsetText(minutes), files);
+    return finish(
+        root, "offset from UTC from " + offsetText(files.before().offset) + " to " + offsetText(files.after().offset),
+        files);
 }
 
 bool changeDaylightSaving(const Root& root, bool on) {
-    const std::time_t now = std::time(nullptr);
-    const TimeZone zone = zoneInForce(root);
-    if (zone.hasDaylightSavingFrom(now) == on) return true;
-    ZoneFiles files(root, [&] { return hasDaylightSaving(root) == on; });
-    const bool done =
-        on ? files.bringBack() : files.replaceByOffset(zone.standardOffsetAt(now) / 60, ZoneFiles::KeepLatest);
-    return finish(root, done, fromTo("automatic daylight saving", on ? "0" : "1", on ? "1" : "0"), files);
+    if (hasDaylightSaving(root) == on) return true;
+    ZoneFiles files(root);
+    if (!(on ? files.bringBack() : files.dropDaylightSaving()))
+        return refuse(std::string("automatic daylight saving not set to ") + (on ? "1" : "0"), files);
+    const char* what = "automatic daylight saving from 1 to 0";
+    if (on && files.after().daylightSaving)
+        what = "automatic daylight saving from 0 to 1";
+    else if (on)
+        what = "the zone replaced before is back, without daylight saving";
+    return finish(root, what, files);
 }
 
 } // namespace VK::Zone

@@ -1,13 +1,14 @@
 #include "zone/ZoneFiles.h"
 
-#include "common/AtomicFile.h"
 #include "common/FileDescriptor.h"
 #include "common/FileLock.h"
 #include "logger/LogLine.h"
 #include "zone/ZoneInForce.h"
+#include "zone/ZoneMemory.h"
 
 #include <cerrno>
 #include <cstdlib>
+#include <ctime>
 #include <fcntl.h>
 #include <optional>
 #include <sys/stat.h>
@@ -17,9 +18,8 @@ namespace VK::Zone {
 
 namespace {
 
-const std::string STATE_FOLDER = "/var/lib/vk/instrumentation";
-const std::string KEPT_NAME = "replaced-zone";
-const std::string KEPT = STATE_FOLDER + "/" + KEPT_NAME;
+const std::string LOCAL_TIME = "/etc/localtime";
+const std::string ZONE_NAME = "/etc/timezone";
 const std::string ZONES = "/usr/share/zoneinfo/";
 
 /// Opens a folder, made with those above it where they are missing: a descriptor or a negative errno value.
@@ -59,18 +59,48 @@ std::string nameOfOffset(const Root& root, int minutes) {
     return right ? name : std::string();
 }
 
+/// Whether a zone would be in force if /etc/localtime were that. With none there it is UTC.
+bool makesZone(const Root& root, const SavedFile& localTime) {
+    const std::string& content = localTime.content;
+    switch (localTime.kind) {
+    case SavedFile::Link:
+        return zoneOfFile(root, content.front() == '/' ? content : "/etc/" + content).has_value();
+    case SavedFile::File:
+        return parseZoneFile(content).has_value();
+    default:
+        return true;
+    }
+}
+
+/// Whether /etc/localtime is that and puts a zone into force.
+bool isInForce(const Root& root, const SavedFile& wanted) {
+    SavedFile found;
+    return lookAt(root, LOCAL_TIME, found) == 0 && found == wanted &&
+           (wanted.kind == SavedFile::Absent || zoneOfFile(root, LOCAL_TIME).has_value());
+}
+
 /// What /etc/localtime and /etc/timezone are to be for a zone of that offset.
 SavedZone zoneOfOffset(const Root& root, int minutes) {
     SavedZone zone;
     zone.zoneName.kind = SavedFile::File;
     if (const std::string name = nameOfOffset(root, minutes); !name.empty()) {
         zone.localTime = {SavedFile::Link, ".." + ZONES + name};
+        // Where /etc is itself a link, the directory above it is not the root.
+        if (!makesZone(root, zone.localTime)) zone.localTime.content = ZONES + name;
         zone.zoneName.content = name + "\n";
     } else {
         zone.localTime = {SavedFile::File, makeZoneFile(minutes)};
         zone.zoneName.content = describeBytes(zone.localTime.content) + "\n";
     }
     return zone;
+}
+
+void logDamage(const ZoneMemory& memory) {
+    if (!memory.damage().empty()) logLine(FAILURE, "replace", __LINE__, memory.damage());
+}
+
+ZoneFiles::State stateOf(const Root& root, const SavedFile& localTime) {
+    return {describe(localTime), offsetInForce(root), hasDaylightSaving(root)};
 }
 
 } // namespace
@@ -80,71 +110,104 @@ struct ZoneFiles::Session {
     FileDescriptor state;
     FileDescriptor etc;
     std::optional<FileLock> lock;
+    std::optional<ZoneMemory> memory;
     SavedZone present;
+    int zoneNameError = 0; ///< why /etc/timezone cannot be told
 };
 
 bool ZoneFiles::fail(const std::string& what, int error) {
-    why = what;
-    if (error != 0) why += ": " + errorText(error);
-    if (error == EACCES || error == EPERM) why += "; this takes root, or the privilege CAP_DAC_OVERRIDE";
+    reason = what;
+    if (error != 0) reason += ": " + errorText(error);
+    if (error == EACCES || error == EPERM) reason += "; this takes root, or the privilege CAP_DAC_OVERRIDE";
     return false;
 }
 
 bool ZoneFiles::begin(Session& session) {
-    const int state = openFolder(root, STATE_FOLDER);
+    const int state = openFolder(root, ZoneMemory::FOLDER);
     session.state = FileDescriptor(state);
-    if (state < 0) return fail(STATE_FOLDER, -state);
+    if (state < 0) return fail(ZoneMemory::FOLDER, -state);
     const int etc = root.open("/etc", O_RDONLY | O_DIRECTORY);
     session.etc = FileDescriptor(etc);
     if (etc < 0) return fail("/etc", -etc);
-    session.lock.emplace(session.state.get(), "lock");
-    if (const int error = session.lock->error(); error != 0) return fail(STATE_FOLDER + "/lock", error);
-    if (const int error = lookAt(root, "/etc/localtime", session.present.localTime); error != 0)
-        return fail("/etc/localtime", error);
-    if (const int error = lookAt(root, "/etc/timezone", session.present.zoneName); error != 0)
-        return fail("/etc/timezone", error);
-    was = describe(session.present.localTime);
+    session.lock.emplace(state, "lock");
+    if (const int error = session.lock->error(); error != 0) return fail(ZoneMemory::FOLDER + "/lock", error);
+    if (const int error = lookAt(root, LOCAL_TIME, session.present.localTime); error != 0)
+        return fail(LOCAL_TIME, error);
+    session.zoneNameError = lookAt(root, ZONE_NAME, session.present.zoneName);
+    session.memory.emplace(root, state);
+    old = stateOf(root, session.present.localTime);
     return true;
 }
 
-bool ZoneFiles::put(const Session& session, const SavedZone& wanted) {
-    if (const int error = putBack(session.etc.get(), "localtime", wanted.localTime); error != 0)
-        return fail("/etc/localtime", error);
-    is = describe(wanted.localTime);
-    // The name is for people and old programs: the zone is in force without it.
-    if (session.present.zoneName.kind != SavedFile::Absent && wanted.zoneName.kind != SavedFile::Absent)
-        if (const int error = putBack(session.etc.get(), "timezone", wanted.zoneName); error != 0)
-            logLine(FAILURE, "put", __LINE__, "/etc/timezone does not follow: " + errorText(error));
+/// The name is for people and old programs: the zone is in force without it.
+void ZoneFiles::putName(const Session& session, const SavedFile& wanted, int from) const {
+    if (wanted.kind == SavedFile::Absent) return;
+    int error = session.zoneNameError;
+    if (error == 0 && session.present.zoneName.kind == SavedFile::Absent) return;
+    // One that cannot be read could not be brought back.
+    if (error == 0) error = putBack(session.etc.get(), "timezone", wanted, from);
+    if (error != 0) logLine(FAILURE, "put", __LINE__, ZONE_NAME + " does not follow: " + errorText(error));
+}
+
+/// `from` is a descriptor of the directory that holds what is wanted, or -1.
+bool ZoneFiles::put(const Session& session, const SavedZone& wanted, int from) {
+    if (const int error = putBack(session.etc.get(), "localtime", wanted.localTime, from); error != 0)
+        return fail(LOCAL_TIME, error);
+    if (!isInForce(root, wanted.localTime)) {
+        const int error = putBack(session.etc.get(), "localtime", session.present.localTime);
+        return fail(LOCAL_TIME + ": another zone was put into force" + (error == 0 ? "" : " and stays"), error);
+    }
+    putName(session, wanted.zoneName, from);
+    now = stateOf(root, wanted.localTime);
+    done = true;
     return true;
 }
 
-bool ZoneFiles::replaceByOffset(int minutes, Keep keep) {
+bool ZoneFiles::replace(Session& session, int minutes, bool keepsOlder) {
+    ZoneMemory& memory = *session.memory;
+    memory.recover(session.present.localTime);
+    std::optional<SavedZone> older;
+    if (const int error = memory.read(older); error != 0) return fail(ZoneMemory::FOLDER, error);
+    logDamage(memory);
+    if (older && keepsOlder) return put(session, zoneOfOffset(root, minutes), -1);
+    // Remembered before the zone changes: at no time is there a change that cannot be taken back.
+    if (const int error = memory.keep(session.etc.get(), session.present); error != 0)
+        return fail(ZoneMemory::FOLDER, error);
+    const bool isPut = put(session, zoneOfOffset(root, minutes), -1);
+    if (SavedFile found; lookAt(root, LOCAL_TIME, found) == 0 && found == session.present.localTime)
+        memory.revert();
+    else
+        memory.commit();
+    return isPut;
+}
+
+bool ZoneFiles::putOffset(int minutes) {
+    Session session;
+    return begin(session) && (old.offset == minutes || replace(session, minutes, true));
+}
+
+bool ZoneFiles::dropDaylightSaving() {
     Session session;
     if (!begin(session)) return false;
-    if (asWanted()) return true;
-    // Kept before the zone changes: at no time is there a change that cannot be taken back.
-    const bool keepThis = keep == KeepLatest || !root.exists(KEPT);
-    if (keepThis) {
-        const FileOwner owner{0644, geteuid(), getegid()};
-        const int error = replaceFile(session.state.get(), KEPT_NAME, writeSavedZone(session.present), owner);
-        if (error != 0) return fail(KEPT, error);
-    }
-    if (put(session, zoneOfOffset(root, minutes))) return true;
-    if (keepThis) unlinkat(session.state.get(), KEPT_NAME.c_str(), 0);
-    return false;
+    return !old.daylightSaving || replace(session, zoneInForce(root).standardOffsetAt(std::time(nullptr)) / 60, false);
 }
 
 bool ZoneFiles::bringBack() {
-    if (!root.exists(KEPT)) return fail("no zone with daylight saving was replaced");
+    const std::string nothing = "no zone with daylight saving was replaced";
+    if (!ZoneMemory::exists(root)) return fail(nothing);
     Session session;
     if (!begin(session)) return false;
-    if (asWanted()) return true;
-    const Root::Contents bytes = root.read(KEPT, Root::DEFAULT_LIMIT * 3);
-    if (!bytes) return fail(KEPT, bytes.error);
-    const std::optional<SavedZone> kept = readSavedZone(bytes.text);
-    if (!kept) return fail(KEPT + " is damaged");
-    if (!put(session, *kept)) return false;
-    unlinkat(session.state.get(), KEPT_NAME.c_str(), 0);
+    if (old.daylightSaving) return true;
+    ZoneMemory& memory = *session.memory;
+    memory.recover(session.present.localTime);
+    std::optional<SavedZone> zone;
+    if (const int error = memory.read(zone); error != 0) return fail(ZoneMemory::FOLDER, error);
+    if (!zone) return fail(memory.damage().empty() ? nothing : memory.damage());
+    logDamage(memory);
+    if (!makesZone(root, zone->localTime))
+        return fail(describe(zone->localTime) + ", which was replaced, is no zone now");
+    if (!(zone->localTime == session.present.localTime) && !put(session, *zone, memory.open().get())) return false;
+    memory.forget();
     return true;
 }
 

@@ -2,45 +2,54 @@
 
 #include "zone/SavedFile.h"
 
-#include <functional>
 #include <string>
 
 namespace VK::Zone {
 
-/// One change of the files that make the time zone: /etc/localtime, /etc/timezone where there is one, and in
-/// /var/lib/vk/instrumentation what they were before. Changes of several processes wait for each other.
+/// One change of the files that make the time zone: /etc/localtime, /etc/timezone where there is one, and the memory of
+/// what they were before. Changes of several processes wait for each other. Each answers true when the host is as
+/// asked once every other change is over, whether this one had to change anything or not; false when that failed, and
+/// then zone and memory are as before.
 class ZoneFiles {
 public:
-    /// Which of the zones replaced one after the other is kept.
-    enum Keep { KeepFirst, KeepLatest };
+    /// The zone in force.
+    struct State {
+        std::string name; ///< what /etc/localtime is, for people
+        int offset = 0;   ///< now, in minutes east of UTC
+        bool daylightSaving = false;
+    };
 
-    /// `isAsWanted` is asked once every other change is over: one of them may have made the host as this one is to.
-    ZoneFiles(const Root& hostRoot, std::function<bool()> isAsWanted)
-        : root(hostRoot), asWanted(std::move(isAsWanted)) {}
+    explicit ZoneFiles(const Root& hostRoot) : root(hostRoot) {}
 
-    /// Puts a zone of that offset for ever into force; false when that failed and nothing was changed.
-    bool replaceByOffset(int minutes, Keep keep);
-    /// Puts the zone that was kept into force again; false when that failed and nothing was changed.
+    /// Puts a zone of that offset for ever into force, unless that is the offset now. What it replaces is remembered,
+    /// unless something is already.
+    bool putOffset(int minutes);
+    /// The same at the standard offset of a zone with daylight saving, which is remembered instead of any other.
+    bool dropDaylightSaving();
+    /// Puts the zone that is remembered into force again, unless the one in force has daylight saving.
     bool bringBack();
 
     /// Why it failed.
-    const std::string& problem() const { return why; }
-    /// What /etc/localtime was and is, for people; the latter empty when nothing had to be changed.
-    const std::string& before() const { return was; }
-    const std::string& after() const { return is; }
+    const std::string& problem() const { return reason; }
+    /// Whether another zone is in force now, and from which to which it went.
+    bool changed() const { return done; }
+    const State& before() const { return old; }
+    const State& after() const { return now; }
 
 private:
     struct Session;
 
     bool fail(const std::string& what, int error = 0);
     bool begin(Session& session);
-    bool put(const Session& session, const SavedZone& wanted);
+    bool replace(Session& session, int minutes, bool keepsOlder);
+    bool put(const Session& session, const SavedZone& wanted, int from);
+    void putName(const Session& session, const SavedFile& wanted, int from) const;
 
     const Root& root;
-    const std::function<bool()> asWanted;
-    std::string why;
-    std::string was;
-    std::string is;
+    std::string reason;
+    bool done = false;
+    State old;
+    State now;
 };
 
 } // namespace VK::Zone

@@ -7,7 +7,8 @@ from .model import MofError, Place
 
 _CLASS = re.compile(r"^(?P<name>\w+)(?:\s*<\s*(?P<above>\w+))?(?P<association>\s+association)?$")
 _METHOD = re.compile(r"^(?P<type>\w+)\s+(?P<name>\w+)\((?P<parameters>.*)\)$")
-_PROPERTY = re.compile(r"^(?P<key>key\s+)?(?P<type>\w+)(?P<ref>\s+ref)?\s+(?P<name>\w+)(?P<array>\[\])?$")
+_PROPERTY = re.compile(r"^(?P<key>key\s+)?(?P<type>\w+)(?P<ref>\s+ref)?\s+(?P<name>\w+)(?P<array>\[\])?"
+                       r"(?:\s*=\s*(?P<default>\d+))?$")
 _PARAMETER = re.compile(
     r"^(?P<in>in\s+)?(?P<out>out\s+)?(?P<type>\w+)(?P<ref>\s+ref)?\s+(?P<name>\w+)(?P<array>\[\])?$")
 
@@ -68,7 +69,8 @@ class _Stub:
         self._declared[self._name].append(match["name"])
         qualifiers = f"[{', '.join(marks)}] " if marks else ""
         self._lines.append(f"    {qualifiers}{match['type']}{' REF' if match['ref'] else ''} "
-                           f"{match['name']}{match['array'] or ''};")
+                           f"{match['name']}{match['array'] or ''}"
+                           + (f" = {match['default']};" if match["default"] else ";"))
 
     def _method(self, match, place: Place) -> None:
         parameters = []
@@ -89,7 +91,7 @@ def _match(pattern, text: str, place: Place, what: str):
 
 def stub(text: str, file: str) -> str:
     """The stub in MOF of a facts file: a class a paragraph, `NAME`, `NAME < SUPERCLASS`, ` association` behind it; below
-    it, indented, `[key] TYPE [ref] NAME[[]]` for a property and `TYPE NAME([in] [out] TYPE [ref] NAME, ...)` for a
+    it, indented, `[key] TYPE [ref] NAME[[]] [= NUMBER]` for a property and `TYPE NAME([in] [out] TYPE [ref] NAME, ...)` for a
     method; `#` starts a comment. Raises MofError."""
     made = _Stub(file)
     for number, line in enumerate(text.splitlines(), 1):

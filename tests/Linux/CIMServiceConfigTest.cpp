@@ -7,6 +7,7 @@
 #include <gmock/gmock.h>
 
 #include <csignal>
+#include <thread>
 #include <unistd.h>
 
 namespace {
@@ -110,6 +111,21 @@ TEST_F(CIMServiceConfigTest, LogsASetThatRan) {
                                                 command() + " -s " + attemptsProperty + "=5 -p'")));
         EXPECT_THAT(log, Contains(ContainsRegex(" LOG 3000 .* command ran successfully$")));
         EXPECT_THAT(log, Not(Contains(testing::HasSubstr("command failed"))));
+    });
+}
+
+TEST_F(CIMServiceConfigTest, RunsOneSetAtATimeAmongTheThreads) {
+    addCommand(test::notingOverlaps(commands.path("").string()));
+    test::isolated([&] {
+        std::vector<std::thread> threads;
+        for (int i = 0; i < 6; ++i)
+            threads.emplace_back([i] {
+                CIMServiceConfig config;
+                EXPECT_EQ(i % 2 == 0 ? config.setIntervalParameter("30") : config.setAttemptParameter("5"), 0U);
+            });
+        for (std::thread& thread : threads) thread.join();
+        EXPECT_THAT(commands.take(), testing::SizeIs(6));
+        EXPECT_FALSE(std::filesystem::exists(commands.path("overlaps")));
     });
 }
 

@@ -162,10 +162,16 @@ class Facts(unittest.TestCase):
         self.assertIn('[Override("Name"), Key] string Name;', stub)
         self.assertIn("uint8 F([In, Out] string S[]);", stub)
 
+    def test_carry_default_values(self):
+        stub = facts.stub("CIM_A\n  uint16 State = 12\n  uint16 Other=2 # c\n", "f")
+        self.assertIn("uint16 State = 12;", stub)
+        self.assertIn("uint16 Other = 2;", stub)
+
     def test_refuse_what_is_no_fact(self):
         for text, complaint in [("  string A", "f:1: a property before the first class"),
                                 ("CIM_A ! CIM_B", "f:1: 'CIM_A ! CIM_B' is not a class"),
                                 ("CIM_A\n  key key string A", "f:2: 'key key string A' is not a property"),
+                                ("CIM_A\n  string A = ", "f:2: 'string A =' is not a property"),
                                 ("CIM_A\n  uint8 F(in)", "f:2: 'in' is not a parameter")]:
             with self.subTest(text), self.assertRaises(MofError) as caught:
                 facts.stub(text, "f")
@@ -215,6 +221,37 @@ class Command(unittest.TestCase):
             self.assertEqual(done.returncode, 1)
             self.assertEqual(done.stderr, f"{bad}:3: unknown qualifier Colour on VESKA_Thing.A\n")
             self.assertFalse((Path(folder) / "out.json").exists())
+
+
+class Descriptions(unittest.TestCase):
+    """What a class of ours says of the properties that it inherits and does not declare."""
+
+    def setUp(self):
+        checker = Checker()
+        checker.add(parse(facts.stub((SCHEMA / "superclasses.facts").read_text(encoding="utf-8"), "facts"), "stub"), ours=False)
+        names = facts.split((SCHEMA / "classes.list").read_text(encoding="utf-8"))
+        for name in names:
+            checker.add(parse((SCHEMA / name).read_text(encoding="utf-8"), name))
+        self.schema = checker.schema
+        self.ours = [self.schema.find(Path(name).stem) for name in names]
+
+    def inherited_defaults(self, declared):
+        own = {p.name for p in declared.properties}
+        above = self.schema.find(declared.superclass)
+        while above is not None:
+            for prop in above.properties:
+                if prop.default is not None and prop.name not in own:
+                    yield f"{prop.name} {prop.default}"
+            above = self.schema.find(above.superclass) if above.superclass else None
+
+    def test_name_the_default_values_that_an_object_manager_adds(self):
+        found = {}
+        for declared in self.ours:
+            found[declared.name] = list(self.inherited_defaults(declared))
+            for default in found[declared.name]:
+                self.assertIn(default, declared.qualifier("Description"), declared.name)
+        self.assertEqual({name: len(defaults) for name, defaults in found.items() if defaults},
+                         {"VESKA_ComputerSystem": 3, "VESKA_PhysicalPackage": 1, "VESKA_TimeService": 4})
 
 
 if __name__ == "__main__":

@@ -49,6 +49,11 @@ std::vector<std::string> FakeCommands::take() {
     return calls;
 }
 
+std::string notingOverlaps(const std::string& directory) {
+    const std::string busy = "'" + directory + "/busy'";
+    return "mkdir " + busy + " || echo overlap >>'" + directory + "/overlaps'\nsleep 0.03\nrmdir " + busy;
+}
+
 std::string printing(const std::vector<std::string>& lines) {
     std::string script;
     for (const std::string& line : lines) script += "printf '%s\\n' '" + line + "'\n";

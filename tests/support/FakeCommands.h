@@ -33,6 +33,10 @@ private:
     std::string formerPath;
 };
 
+/// A script that stays for a moment, and notes in the file `overlaps` of that directory that another run of it has not
+/// ended yet.
+std::string notingOverlaps(const std::string& directory);
+
 /// A script that prints these lines.
 std::string printing(const std::vector<std::string>& lines);
 

@@ -50,8 +50,6 @@ extern "C" int system(const char* command) {
     return 0;
 }
 
-#pragma GCC visibility pop
-
 namespace test {
 
 std::vector<std::string> takeCommands() {

@@ -1,4 +1,5 @@
-// The CIM server's configuration on KVM guests, where the command lies among the system's own.
+// The CIM server's configuration: on KVM guests, where the command lies among the system's own, and asked for by
+// several processes at once.
 
 #include "support/FakeCommands.h"
 #include "support/Isolated.h"
@@ -9,6 +10,9 @@
 #include <gmock/gmock.h>
 
 #include <optional>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 namespace {
 
@@ -77,6 +81,60 @@ TEST_F(ConfigurationCommands, StopAtAFailureOnAKvmGuest) {
         EXPECT_EQ(answer.code, CMPI_RC_ERR_FAILED);
         EXPECT_THAT(commands.take(),
                     ElementsAre("/usr/sbin/cimconfig [-s] [minIndicationDeliveryRetryInterval=30] [-p]"));
+    });
+}
+
+/// The same with a /run of the test's own.
+class ConfigurationLock : public ConfigurationCommands {
+protected:
+    void SetUp() override {
+        ConfigurationCommands::SetUp();
+        if (IsSkipped()) return;
+        run.emplace("/run");
+        test::simulate({}, {{"kvm", true}});
+    }
+
+    static void set() {
+        const om::Answer answer = test::invoke(test::path(className), "SetCIMconfig",
+                                               {{"deliveryRetryIntervalSec", {CMPI_uint32, std::uint64_t{30}}},
+                                                {"deliveryRetryAttempts", {CMPI_uint32, std::uint64_t{5}}}});
+        EXPECT_EQ(answer.code, CMPI_RC_OK);
+    }
+
+    std::optional<test::CoveredFolder> run;
+};
+
+TEST_F(ConfigurationLock, LetsOneProcessSetAtATime) {
+    commands.add("/usr/sbin/cimconfig", test::notingOverlaps(commands.path("").string()));
+    std::fflush(nullptr);
+    for (int i = 0; i < 6; ++i) {
+        if (fork() != 0) continue;
+        set();
+        _exit(HasFailure() ? 1 : 0);
+    }
+    for (int i = 0; i < 6; ++i) {
+        int status = -1;
+        EXPECT_GT(wait(&status), 0);
+        EXPECT_EQ(status, 0);
+    }
+    EXPECT_THAT(commands.take(), testing::SizeIs(12));
+    EXPECT_FALSE(std::filesystem::exists(commands.path("overlaps")));
+}
+
+TEST_F(ConfigurationLock, IsNotTakenForReading) {
+    test::isolated([] {
+        EXPECT_EQ(test::instances(className).results.size(), 1U);
+        EXPECT_TRUE(std::filesystem::is_empty("/run"));
+        set();
+        EXPECT_TRUE(std::filesystem::exists("/run/vk-cimconfig.lock"));
+    });
+}
+
+TEST_F(ConfigurationLock, IsNotNeededForSetting) {
+    ASSERT_EQ(chmod("/run", 01777), 0); // a file there would be anybody's
+    test::isolated([] {
+        set();
+        EXPECT_TRUE(std::filesystem::is_empty("/run"));
     });
 }
 

@@ -1,8 +1,11 @@
 """vk-host-snapshot --mask: a masked copy tells the same but for what names the machine."""
 
+import ast
 import os
+import re
 import struct
 import unittest
+from pathlib import Path
 
 from hosts import SYSTEM_UUID, instances, make_host, program, properties, structure, table, take
 
@@ -124,7 +127,7 @@ class Tables(unittest.TestCase):
         self.emptied(structure(22, 22, bytes(body), "BAT-6612"), b"\xD7\xC4", b"BAT-6612")
 
     def test_a_kind_that_nobody_knows_is_emptied(self):
-        for kind in (2, 4, 11, 17, 39, 43, 45, 99, 126, 128, 255):
+        for kind in (4, 11, 17, 39, 43, 45, 99, 126, 128, 255):
             self.emptied(structure(kind, 9, b"\x01SECRET-1", "SECRET-2", "SECRET-3"), b"SECRET-1", b"SECRET-2", b"SECRET-3")
 
     def test_strings_behind_an_empty_one_are_emptied(self):
@@ -148,6 +151,17 @@ class Tables(unittest.TestCase):
             self.assertNotIn(secret, copy)
         for kept in (b"Example\0RX200\0Rev B\0", b"SKU-42\0", b"Example\0V7\0", b"SKU-43\0"):
             self.assertIn(kept, copy)
+
+    def test_of_the_base_board_manufacturer_and_product_are_kept(self):
+        board = structure(2, 2, bytes([1, 2, 3, 4, 5, 9, 6]) + b"\x03\0\x0a", "ASRockRack", "X570D4U", "1.02", "BSN-0006",
+                          "TAG-0007", "Slot 9")
+        system = bytes([1, 1, 0, 2]) + SYSTEM_UUID.bytes_le + bytes([6, 0, 0])
+        data = b"".join([structure(1, 1, system, "To Be Filled By O.E.M.", "SYS-0001"), board, structure(127, 3, b"")])
+        copy = self.masked(data)
+        self.assertIn(b"ASRockRack\0X570D4U\0", copy)
+        for secret in (b"1.02", b"BSN-0006", b"TAG-0007", b"Slot 9", b"SYS-0001"):
+            self.assertIn(secret, data)
+            self.assertNotIn(secret, copy)
 
     def test_several_chassis_stay_in_their_order(self):
         others = [structure(3, 20 + n, bytes([1, kind, 2, 3, 0, 3, 3, 3, 2]), f"Maker {n}", f"V{n}", f"CHASSIS-SN-{n}00{n}")
@@ -179,6 +193,32 @@ class Tables(unittest.TestCase):
     def test_zeros_behind_the_structures_stay(self):
         data = table()[:-6] + bytes(20)
         self.assertEqual(self.masked(data)[-20:], bytes(20))
+
+
+class Fillers(unittest.TestCase):
+    """The texts that say nothing are those that the provider takes for such: its own tests read the same list."""
+
+    LIST = Path(__file__).resolve().parents[1] / "support/FirmwareTexts.inc"
+
+    def test_are_the_providers_placeholders(self):
+        is_filler = program().is_filler
+        compared = 0
+        for row in ast.parse(re.sub("^//.*", "", self.LIST.read_text(encoding="ascii"), flags=re.M)).body:
+            kind, text = row.value.args[0].id, row.value.args[1].value
+            if kind == "Other":  # serial numbers, which alone are masked, are no other kind
+                self.assertEqual(is_filler(text), row.value.func.id == "SAYS_NOTHING", text)
+                compared += 1
+        self.assertGreater(compared, 100)
+
+    def test_shared_uuids_stay_in_either_order(self):
+        program_ = program()
+        for text in ("00020003-0004-0005-0006-000700080009", "03000200-0400-0500-0006-000700080009",
+                     "03020100-0504-0706-0809-0a0b0c0d0e0f", "10000000-0000-8000-0040-000000000000",
+                     "12345678-1234-5678-90ab-cddeefaabbcc", "ffffff00-ffff-ffff-ffff-ffffffffffff",
+                     "4c4c4544-0000-2010-8020-80c04f202020"):
+            self.assertEqual(program_.Mask().uuid(text), text)
+        for text in (str(SYSTEM_UUID), "4c4c4544-0000-2010-8020-80c04f202031", "10000000-0000-0000-0000-0cc47a133878"):
+            self.assertNotEqual(program_.Mask().uuid(text), text)
 
 
 class Texts(unittest.TestCase):

@@ -18,6 +18,11 @@ namespace NVLog {
 ///
 /// Both operations may be called from any thread at any time, and in the child of a fork. They never throw, start a
 /// thread, raise a signal, change errno, or call openlog or closelog. A dropped line costs one table look-up.
+///
+/// In the child of a fork of a process with several threads, lines for syslog go to /dev/log directly, since one of
+/// those threads may have held the lock of the C library's syslog, which then nobody gives back. Such a line carries
+/// the program's short name, its process and the facility `user`, whatever openlog was given, and no time: the daemon
+/// adds it. It is dropped where no daemon listens, or one takes nothing for a second.
 class NVLogger {
 public:
     /// Writes one line to the log channel. `function`, `file` and `line` tell where the event happened, `category`

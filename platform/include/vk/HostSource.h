@@ -13,7 +13,8 @@ struct HostSource {
     };
 
     Kind kind = Live;
-    std::string location; ///< empty for Live
+    /// Empty for Live. A relative one is made absolute, links left as they are, when the source is chosen.
+    std::string location;
 
     /// The process's source. A tree wins over a root when both are set; an empty variable counts as not set.
     static const HostSource& current();

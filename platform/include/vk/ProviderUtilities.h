@@ -55,7 +55,7 @@ public:
     /// `FALSE`; references, nulls and other kinds are left out. False when the broker would not tell the keys.
     static bool transformObjectPathToMoniker(const CMPIObjectPath* objectPath, Moniker& moniker);
     /// Adds the moniker's pairs to the path as text keys, in order; false when one was refused. The moniker's cursor
-    /// stands on its first pair then.
+    /// stands on its first pair then; in a moniker without pairs it stays where it was.
     static bool transformMonikerToObjectPath(Moniker& moniker, CMPIObjectPath** objectPath);
 
     /// A new instance of that path, or null.

@@ -1,21 +1,36 @@
 // A provider that answers with what it was asked, for tests of the command line. The class asked for chooses more:
 // Echo_Everything has every type, Echo_Fail and Echo_Odd answer errors, Echo_Flaky fails every second time,
 // Echo_Crowd tells how many calls were inside at once, Echo_Missing knows no instance, Echo_Quiet takes changes without
-// a word.
+// a word. With ECHO_LOUD in the environment it prints on standard output in every way that there is.
 #include <cmpift.h>
 
 #include <atomic>
 #include <chrono>
 #include <cmath>
+#include <cstdio>
+#include <cstdlib>
 #include <limits>
 #include <string>
 #include <thread>
+#include <unistd.h>
 
 namespace {
 
 const CMPIBroker* broker;
 std::atomic<unsigned> calls{0};
 std::atomic<unsigned> inside{0};
+
+void printLoudly() {
+    if (std::getenv("ECHO_LOUD") == nullptr) return;
+    const bool done = write(STDOUT_FILENO, "loud write\n", 11) == 11 && std::system("echo loud command") == 0;
+    std::printf("loud buffer %d\n", done ? 1 : 0); // left in the buffer
+}
+
+/// Prints while the library is loaded and unloaded, too.
+struct Loudness {
+    Loudness() { printLoudly(); }
+    ~Loudness() { printLoudly(); }
+} const loudness;
 
 std::string textOf(CMPIString* string) {
     const char* text = string ? string->ft->getCharPtr(string, nullptr) : nullptr;
@@ -149,6 +164,7 @@ CMPIStatus enumInstances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* 
     bool answered;
     const CMPIStatus answer = trouble(path, answered);
     if (answered) return answer;
+    printLoudly();
     CMPIInstance* instance = classOf(path) == "Echo_Everything" ? everything(path) : echo(path, "EnumInstances", list);
     if (classOf(path) == "Echo_Crowd") setNumber(instance, "Crowd", &CMPIValue::uint32, crowd(4), CMPI_uint32);
     result->ft->returnInstance(result, instance);

@@ -158,12 +158,4 @@ TEST(Vkcim, FaultsOfTheBrokerAreListedAndHitEveryRun) {
     EXPECT_EQ(vkcim({"--fault", "newInstance:1", "report"}).status, 2);
 }
 
-TEST(Vkcim, TheLastOutputIsOnTheDiskOrItSaysSo) {
-    const Outcome outcome = support::runCommand(
-        {"/bin/sh", "-c",
-         std::string(VKCIM) + " --library " ECHO_PROVIDER " --provider Echo names Echo_Thing >/dev/full"});
-    EXPECT_EQ(outcome.status, 1);
-    EXPECT_THAT(outcome.error, HasSubstr("cannot be written"));
-}
-
 } // namespace

@@ -42,6 +42,10 @@ TEST(DateTime, PrintsTheSameInEveryFormat) {
         EXPECT_EQ(print(1704106800, format), "20240101110000.000000+000") << format;
 }
 
+TEST(DateTime, KeepsNothingButTheInstant) {
+    EXPECT_EQ(sizeof(DateTime), sizeof(long));
+}
+
 TEST(DateTime, DoesNotDependOnTheTimeZone) {
     setenv("TZ", "Asia/Kolkata", 1);
     EXPECT_EQ(print(1704106800), "20240101110000.000000+000");

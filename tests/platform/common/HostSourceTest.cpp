@@ -2,8 +2,10 @@
 #include "vk/Root.h"
 
 #include "support/InChild.h"
+#include "support/TemporaryDirectory.h"
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 using VK::HostSource;
 using VK::Root;
@@ -34,7 +36,26 @@ TEST(HostSource, IsThisHostByDefault) {
 TEST(HostSource, IsASnapshotOrASimulatedHost) {
     EXPECT_EQ(chosenWith("/usr/lib", nullptr), "Snapshot /usr/lib /usr/lib");
     EXPECT_EQ(chosenWith("/nowhere/at/all", ""), "Snapshot /nowhere/at/all /nowhere/at/all");
-    EXPECT_EQ(chosenWith(nullptr, "host.json"), "Simulated host.json /");
+    EXPECT_EQ(chosenWith(nullptr, "/srv/host.json"), "Simulated /srv/host.json /");
+}
+
+TEST(HostSource, IsTakenFromTheWorkingDirectoryOfTheFirstQuestion) {
+    const support::TemporaryDirectory first;
+    first.write("copy/etc/hostname", "node7\n");
+    const auto locationFrom = [&](const char* variable, const char* value) {
+        return support::inChild([&] {
+            unsetenv("VK_INSTRUMENTATION_ROOT");
+            unsetenv("VK_INSTRUMENTATION_TREE");
+            setenv(variable, value, 1);
+            if (chdir(first.path().c_str()) != 0) return std::string("no such directory");
+            HostSource::current();
+            if (chdir("/") != 0) return std::string("no root directory");
+            return HostSource::current().location + " " + Root::host().getDirectory();
+        });
+    };
+    EXPECT_EQ(locationFrom("VK_INSTRUMENTATION_TREE", "host.json"), first.path("host.json") + " /");
+    EXPECT_EQ(locationFrom("VK_INSTRUMENTATION_TREE", "/srv/host.json"), "/srv/host.json /");
+    EXPECT_EQ(locationFrom("VK_INSTRUMENTATION_ROOT", "copy"), first.path("copy") + " " + first.path("copy"));
 }
 
 TEST(HostSource, IsASnapshotAlsoAtTheTopWhereNothingOfTheRunningHostMayBeChanged) {
@@ -50,5 +71,5 @@ TEST(HostSource, IsASnapshotAlsoAtTheTopWhereNothingOfTheRunningHostMayBeChanged
 }
 
 TEST(HostSource, PrefersATreeToARoot) {
-    EXPECT_EQ(chosenWith("/usr/lib", "host.json"), "Simulated host.json /");
+    EXPECT_EQ(chosenWith("/usr/lib", "/srv/host.json"), "Simulated /srv/host.json /");
 }

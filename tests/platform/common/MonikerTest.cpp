@@ -57,6 +57,19 @@ TEST(Moniker, StandsOnNoPairBeyondTheEnd) {
     EXPECT_EQ(current(moniker), "Tag=1");
 }
 
+TEST(Moniker, ThatIsEmptyStandsOnItsFirstPairOnceThatComesUnlessASelectionFailed) {
+    Moniker untouched;
+    untouched.addKey("Name", "node7");
+    EXPECT_EQ(current(untouched), "Name=node7");
+
+    Moniker selected;
+    EXPECT_FALSE(selected.selectKey(0));
+    selected.addKey("Name", "node7");
+    EXPECT_EQ(current(selected), "-");
+    EXPECT_TRUE(selected.selectKey(0));
+    EXPECT_EQ(current(selected), "Name=node7");
+}
+
 TEST(Moniker, CopiesPairsAndCursor) {
     Moniker moniker;
     moniker.addKey("Name", "a");

@@ -16,9 +16,15 @@ TEST(ChassisType, HasThePackageTypeOfItsKind) {
 
 TEST(ChassisType, IsNamedInSmbiosWords) {
     EXPECT_EQ(chassisTypeName(1), "Other");
+    EXPECT_EQ(chassisTypeName(13), "All in One");
     EXPECT_EQ(chassisTypeName(17), "Main Server Chassis");
+    EXPECT_EQ(chassisTypeName(19), "SubChassis");
     EXPECT_EQ(chassisTypeName(23), "Rack Mount Chassis");
+    EXPECT_EQ(chassisTypeName(25), "Multi-system Chassis");
+    EXPECT_EQ(chassisTypeName(26), "CompactPCI");
+    EXPECT_EQ(chassisTypeName(27), "AdvancedTCA");
     EXPECT_EQ(chassisTypeName(28), "Blade");
+    EXPECT_EQ(chassisTypeName(29), "Blade Enclosure");
     EXPECT_EQ(chassisTypeName(36), "Stick PC");
     for (const ChassisType type : {0U, 2U, 37U, 127U, 4294967295U}) EXPECT_EQ(chassisTypeName(type), "Unknown");
 }

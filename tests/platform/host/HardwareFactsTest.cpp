@@ -45,7 +45,7 @@ TEST_F(HardwareFactsTest, ComeFromTheTables) {
         .writeTo(host);
     host.write("sys/class/dmi/id/sys_vendor", "Somebody else\n");
     const HardwareFacts facts = read();
-    EXPECT_EQ(facts.tablesError, 0);
+    EXPECT_EQ(facts.noTables.error, 0);
     EXPECT_EQ(facts.manufacturer.text, "Veska");
     EXPECT_EQ(facts.manufacturer.source, "/sys/firmware/dmi/tables/DMI");
     EXPECT_EQ(facts.model.text, "VS 200");
@@ -105,7 +105,7 @@ TEST_F(HardwareFactsTest, WithoutTablesTheKernelTells) {
                                                          {"chassis_serial", "None\n"}};
     for (const auto& [name, text] : files) host.write("sys/class/dmi/id/"s + name, text);
     const HardwareFacts facts = read();
-    EXPECT_EQ(facts.tablesError, ENOENT);
+    EXPECT_EQ(facts.noTables.error, ENOENT);
     EXPECT_EQ(facts.manufacturer.text, "Veska");
     EXPECT_EQ(facts.model.text, "VS 200");
     EXPECT_EQ(facts.serial.text, "CZ1234");
@@ -168,6 +168,141 @@ TEST_F(HardwareFactsTest, TablesWithoutChassisHaveNone) {
     EXPECT_TRUE(read().chassis.empty());
 }
 
+TEST_F(HardwareFactsTest, TheFirstChassisTellsTheSerialNumberThatTheSystemDoesNot) {
+    SmbiosImage(3, 2)
+        .add(SmbiosSystemImage{"Dell Inc.", "PowerEdge R610", {}, "Not Specified", {}, {}})
+        .add(SmbiosChassisImage{23, "Dell Inc.", {}, "C1JXK5J", {}, 3, 3, 3})
+        .add(SmbiosChassisImage{28, "Dell Inc.", {}, "OTHER77", {}, 3, 3, 3})
+        .writeTo(host);
+    EXPECT_EQ(read().serial.text, "C1JXK5J");
+}
+
+TEST_F(HardwareFactsTest, TheSystemsOwnSerialNumberComesBeforeTheChassis) {
+    SmbiosImage(3, 2)
+        .add(SmbiosSystemImage{"Veska", "VS 200", {}, {}, {}, {}})
+        .add(SmbiosChassisImage{23, {}, {}, "C1", {}, 3, 3, 3})
+        .writeTo(host);
+    host.write("sys/class/dmi/id/product_serial", "CZ1234\n");
+    EXPECT_EQ(read().serial.text, "CZ1234");
+}
+
+TEST_F(HardwareFactsTest, ASecondChassisTellsNothingOfTheComputer) {
+    SmbiosImage(3, 2)
+        .add(SmbiosChassisImage{23, {}, {}, "Chassis Serial Number", {}, 3, 3, 3})
+        .add(SmbiosChassisImage{28, {}, {}, "OTHER77", {}, 3, 3, 3})
+        .writeTo(host);
+    EXPECT_EQ(read().serial.text, "");
+}
+
+/// A system, which may be placeholders, and a base board.
+SmbiosImage withBoard(const SmbiosSystemImage& system, const char* manufacturer, const char* product) {
+    return SmbiosImage(3, 2).add(system).add(SmbiosStructureImage(2, 8).text(4, manufacturer).text(5, product));
+}
+
+const SmbiosSystemImage LEFT_AS_IT_CAME{
+    "To Be Filled By O.E.M.", "System Product Name", "System Version", "System Serial Number", "SKU", {}};
+
+TEST_F(HardwareFactsTest, ABoardThatIsSoldAloneTellsModelAndManufacturer) {
+    withBoard(LEFT_AS_IT_CAME, "ASRockRack", "X570D4U").writeTo(host);
+    EXPECT_EQ(read().model.text, "X570D4U");
+    EXPECT_EQ(read().manufacturer.text, "ASRockRack");
+    EXPECT_EQ(Tree::hostNodes(read()).front().description, "ASRockRack X570D4U");
+}
+
+TEST_F(HardwareFactsTest, TheKernelTellsOfTheBoardWhereTheTablesCannotBeRead) {
+    host.write("sys/class/dmi/id/sys_vendor", "To Be Filled By O.E.M.\n");
+    host.write("sys/class/dmi/id/board_vendor", "ASRockRack\n");
+    host.write("sys/class/dmi/id/board_name", "X570D4U\n");
+    EXPECT_EQ(read().model.text, "X570D4U");
+    EXPECT_EQ(read().manufacturer.text, "ASRockRack");
+}
+
+TEST_F(HardwareFactsTest, TheBoardIsNotAskedWhereTheSystemTellsItsMaker) {
+    withBoard({"Veska", "System Product Name", {}, {}, {}, {}}, "ASRockRack", "X570D4U").writeTo(host);
+    EXPECT_EQ(read().model.text, "");
+    EXPECT_EQ(read().manufacturer.text, "Veska");
+}
+
+TEST_F(HardwareFactsTest, ABoardWithoutProductTellsNoManufacturerEither) {
+    withBoard(LEFT_AS_IT_CAME, "ASRockRack", "Base Board Product Name").writeTo(host);
+    EXPECT_EQ(read().model.text, "");
+    EXPECT_EQ(read().manufacturer.text, "");
+    EXPECT_EQ(read().manufacturer.useless, "To Be Filled By O.E.M.");
+}
+
+TEST_F(HardwareFactsTest, LenovosModelStandsInTheVersion) {
+    for (const char* version : {"ThinkPad T480s", "ThinkCentre M920q", "ThinkStation P520", "Thinkpad X1"}) {
+        tables({"LENOVO", "20L7CTO1WW", version, {}, {}, {}});
+        EXPECT_EQ(read().model.text, version);
+    }
+    for (const char* version : {"ThinkSystem SR650", "Lenovo V330", "ThinkPad", ""}) {
+        tables({"LENOVO", "20L7CTO1WW", version, {}, {}, {}});
+        EXPECT_EQ(read().model.text, "20L7CTO1WW") << version;
+    }
+    tables({"Veska", "VS 200", "ThinkPad T480s", {}, {}, {}});
+    EXPECT_EQ(read().model.text, "VS 200");
+}
+
+TEST_F(HardwareFactsTest, TheKernelTellsLenovosModelToo) {
+    host.write("sys/class/dmi/id/sys_vendor", "LENOVO\n");
+    host.write("sys/class/dmi/id/product_name", "20L7CTO1WW\n");
+    host.write("sys/class/dmi/id/product_version", "ThinkPad T480s\n");
+    EXPECT_EQ(read().model.text, "ThinkPad T480s");
+}
+
+TEST_F(HardwareFactsTest, AChassisSkuThatOnlyNamesItsTypeGivesWayToTheSystems) {
+    SmbiosImage(3, 2)
+        .add(SmbiosSystemImage{"Veska", "VS 200", {}, {}, "P0815", {}})
+        .add(SmbiosChassisImage{10, {}, {}, {}, "Notebook", 3, 3, 3})
+        .writeTo(host);
+    const Tree::Node chassis = Tree::hostNodes(read()).at(1);
+    EXPECT_EQ(chassis.properties.at(86), Tree::Value("P0815"));
+}
+
+TEST_F(HardwareFactsTest, AChassisWithoutManufacturerHasTheSystems) {
+    SmbiosImage(3, 2)
+        .add(SmbiosSystemImage{"VMware, Inc.", "VMware Virtual Platform", {}, {}, {}, {}})
+        .add(SmbiosChassisImage{1, "No Enclosure", "N/A", {}, {}, 3, 3, 3})
+        .writeTo(host);
+    EXPECT_EQ(Tree::hostNodes(read()).at(1).properties.at(36), Tree::Value("VMware, Inc."));
+}
+
+TEST_F(HardwareFactsTest, ShortModelsThatCountAreModels) {
+    SmbiosImage(3, 2)
+        .add(SmbiosSystemImage{"Veska", "1234", {}, "1234", {}, {}})
+        .add(SmbiosChassisImage{23, {}, {}, {}, {}, 3, 3, 3})
+        .add(SmbiosChassisImage{28, {}, "4321", "4321", {}, 3, 3, 3})
+        .writeTo(host);
+    const HardwareFacts facts = read();
+    EXPECT_EQ(facts.model.text, "1234");
+    EXPECT_EQ(facts.serial.useless, "1234");
+    EXPECT_EQ(facts.chassis.at(1).version.text, "4321");
+    EXPECT_EQ(facts.chassis.at(1).serial.text, "");
+}
+
+TEST_F(HardwareFactsTest, TheKernelTellsOfTheChassisThatABrokenTableDoesNotReach) {
+    SmbiosImage(3, 2)
+        .add(SmbiosSystemImage{"Veska", "VS 200", {}, {}, {}, {}})
+        .addRaw("\x03\x02\0\0\0\0"s)
+        .writeTo(host);
+    host.write("sys/class/dmi/id/chassis_type", "23\n");
+    host.write("sys/class/dmi/id/chassis_serial", "C1\n");
+    const HardwareFacts facts = read();
+    EXPECT_EQ(facts.manufacturer.text, "Veska");
+    ASSERT_EQ(facts.chassis.size(), 1U);
+    EXPECT_EQ(facts.chassis[0].type, 23U);
+    EXPECT_EQ(facts.chassis[0].serial.text, "C1");
+    EXPECT_EQ(facts.chassis[0].serial.source, "/sys/class/dmi/id/chassis_serial");
+}
+
+TEST_F(HardwareFactsTest, ABrokenTableStillTellsOfTheChassisBeforeItsFault) {
+    SmbiosImage(3, 2).add(SmbiosChassisImage{28, {}, {}, "C2", {}, 3, 3, 3}).addRaw("\x03\x02\0\0\0\0"s).writeTo(host);
+    host.write("sys/class/dmi/id/chassis_serial", "C1\n");
+    const HardwareFacts facts = read();
+    ASSERT_EQ(facts.chassis.size(), 1U);
+    EXPECT_EQ(facts.chassis[0].serial.text, "C2");
+}
+
 TEST_F(HardwareFactsTest, BrokenTablesGiveWayToTheKernelAndAreNamed) {
     tables({"Veska", "VS 200", {}, {}, {}, {}});
     host.write("sys/firmware/dmi/tables/smbios_entry_point", "_SM3_ and nothing more, but long");
@@ -200,15 +335,16 @@ TEST_F(HardwareFactsTest, TellThatOnlyRootMayKnow) {
     const auto asNobody = [this] {
         if (setgid(65534) != 0 || setuid(65534) != 0) _exit(10);
         const HardwareFacts facts = read();
-        if (facts.tablesError != EACCES || facts.serial.error != EACCES) _exit(11);
+        if (facts.noTables.error != EACCES || facts.serial.error != EACCES) _exit(11);
         if (facts.manufacturer.text != "Veska") _exit(12);
         const std::vector<std::string> notes = notesOn(facts);
         const auto has = [&notes](const std::string& note) {
             return std::find(notes.begin(), notes.end(), note) != notes.end();
         };
-        if (!has("no SMBIOS tables: /sys/firmware/dmi/tables may be read by root alone")) _exit(13);
-        if (!has("no chassis: /sys/firmware/dmi/tables may be read by root alone")) _exit(14);
-        _exit(has("no serial number: /sys/firmware/dmi/tables/DMI may be read by root alone") ? 0 : 15);
+        const std::string file = "/sys/firmware/dmi/tables/smbios_entry_point"; // the first that is refused
+        if (!has("no SMBIOS tables: " + file + " may be read by root alone")) _exit(13);
+        if (!has("no chassis: " + file + " may be read by root alone")) _exit(14);
+        _exit(has("no serial number: " + file + " may be read by root alone") ? 0 : 15);
     };
     EXPECT_EXIT(asNobody(), testing::ExitedWithCode(0), "");
 }

@@ -1,82 +1,116 @@
 #include "host/Placeholder.h"
 
+#include "host/Smbios.h"
+#include "vk/Root.h"
+
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cctype>
+#include <cstdlib>
+#include <iterator>
+#include <map>
+#include <set>
+#include <string>
 
 namespace VK::Host {
 
 namespace {
 
+struct Row {
+    FirmwareText kind;
+    const char* text;
+};
+
+constexpr Row SAY_NOTHING[] = {
+#define SAYS_NOTHING(KIND, TEXT) {FirmwareText::KIND, TEXT},
+#define SAYS_SOMETHING(KIND, TEXT)
+#include "support/FirmwareTexts.inc"
+#undef SAYS_NOTHING
+#undef SAYS_SOMETHING
+};
+
+constexpr Row SAY_SOMETHING[] = {
+#define SAYS_NOTHING(KIND, TEXT)
+#define SAYS_SOMETHING(KIND, TEXT) {FirmwareText::KIND, TEXT},
+#include "support/FirmwareTexts.inc"
+#undef SAYS_NOTHING
+#undef SAYS_SOMETHING
+};
+
 TEST(Placeholder, IsSeenThrough) {
-    for (const char* text : {"",
-                             " ",
-                             ".",
-                             "....",
-                             "-",
-                             "----",
-                             "- -",
-                             "x",
-                             "xxxx",
-                             "XXXXXXX",
-                             "x.x.x",
-                             "0000000",
-                             "aaaa",
-                             "*****",
-                             "To Be Filled By O.E.M.",
-                             "To be filled by O.E.M.",
-                             "TO BE FILLED BY OEM",
-                             "To Be Filled By O.E.M. by More String",
-                             "to be filled by odm",
-                             "To be set by OEM.",
-                             "To Be Defined By O.E.M",
-                             "To Be Filled",
-                             "Default string",
-                             " default  STRING ",
-                             "Not Specified",
-                             "not available",
-                             "Not Applicable",
-                             "Not Defined",
-                             "Not set",
-                             "Not Present",
-                             "Not Supported",
-                             "None",
-                             "N/A",
-                             "na",
-                             "NULL",
-                             "(none)",
-                             "Unknown",
-                             "undefined",
-                             "INVALID",
-                             "empty",
-                             "O.E.M.",
-                             "OEM",
-                             "Standard",
-                             "System manufacturer",
-                             "System Product Name",
-                             "System Serial Number",
-                             "Chassis Manufacture",
-                             "Chassis Manufacturer",
-                             "Chassis Serial Number",
-                             "Chassis Version",
-                             "Asset Tag",
-                             "No Asset Tag",
-                             "SKU",
-                             "SKU Number",
-                             "Base Board Serial Number"})
-        EXPECT_TRUE(isPlaceholder(text)) << text;
+    for (const Row& row : SAY_NOTHING) EXPECT_TRUE(isPlaceholder(row.text, row.kind)) << row.text;
 }
 
 TEST(Placeholder, LeavesWhatTellsSomething) {
-    for (const char* text : {"Dell Inc.", "PowerEdge R740", "Standard PC (Q35 + ICH9, 2009)", "SKU=0777", "1.0", "7",
-                             "A", "NAS", "Oemtech", "Not Another Box", "To Be Or Not", "xServe", "0123456789",
-                             "00000001", "Unknown Pleasures", "None Such Ltd"})
-        EXPECT_FALSE(isPlaceholder(text)) << text;
+    for (const Row& row : SAY_SOMETHING) {
+        const PlaceholderRule* rule = placeholderRule(row.text, row.kind);
+        EXPECT_EQ(rule, nullptr) << row.text << " is taken for " << (rule != nullptr ? rule->reason : "");
+    }
 }
 
-TEST(Placeholder, SerialsThatOnlyCountTellNothing) {
-    for (const char* text : {"0123456789", " 123456789 ", "1234567890", "9876543210", "0", "00000000", "None"})
-        EXPECT_TRUE(isPlaceholderSerial(text)) << text;
-    for (const char* text : {"CZ1234", "12345678", "01234567890", "10", "7"})
-        EXPECT_FALSE(isPlaceholderSerial(text)) << text;
+TEST(Placeholder, IsOneInAnyLetterCaseWithBlanksAndDotsAround) {
+    for (const Row& row : SAY_NOTHING) {
+        std::string text = row.text;
+        std::transform(text.begin(), text.end(), text.begin(),
+                       [](unsigned char c) { return static_cast<char>(std::toupper(c)); });
+        EXPECT_TRUE(isPlaceholder(" ." + text + ". . ", row.kind)) << text;
+    }
+}
+
+TEST(Placeholder, HasTheRuleThatSaysWhy) {
+    const auto reason = [](const char* text) { return placeholderRule(text, FirmwareText::Other)->reason; };
+    EXPECT_THAT(std::string(reason("0123456789")), testing::StartsWith("counts up or down"));
+    EXPECT_THAT(std::string(reason("System SKU#")), testing::StartsWith("the name of the field itself"));
+    EXPECT_THAT(std::string(reason("SKU=NotProvided;ModelName=X")), testing::HasSubstr("without the SKU"));
+}
+
+TEST(Placeholder, RulesAllHaveATextThatTheyAreFor) {
+    std::set<std::string_view> reasons;
+    for (const Row& row : SAY_NOTHING)
+        if (const PlaceholderRule* const rule = placeholderRule(row.text, row.kind)) reasons.insert(rule->reason);
+    constexpr const char* ALL[] = {
+#define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) REASON,
+#include "host/Placeholders.inc"
+    };
+    for (const char* reason : ALL) EXPECT_EQ(reasons.count(reason), 1U) << reason;
+    EXPECT_EQ(reasons.size(), std::size(ALL)); // no two rules have the same
+}
+
+/// The reasons why texts of a machine's tables say nothing.
+std::set<std::string_view> reasonsOn(const Smbios& smbios) {
+    std::set<std::string_view> reasons;
+    const auto look = [&reasons](const std::string& text, FirmwareText kind) {
+        const PlaceholderRule* const rule = text.empty() ? nullptr : placeholderRule(text, kind);
+        if (rule != nullptr) reasons.insert(rule->reason);
+    };
+    if (const auto& system = smbios.system) {
+        for (const auto& text : {system->manufacturer, system->serial, system->sku}) look(text, FirmwareText::Other);
+        for (const auto& text : {system->product, system->version}) look(text, FirmwareText::Model);
+    }
+    for (const SmbiosChassis& chassis : smbios.chassis) {
+        for (const auto& text : {chassis.manufacturer, chassis.serial}) look(text, FirmwareText::Other);
+        look(chassis.version, FirmwareText::Model);
+        look(chassis.sku, FirmwareText::ChassisSku);
+    }
+    return reasons;
+}
+
+TEST(Placeholder, RulesStateOnHowManyOfTheTestsMachinesTheyWereSeen) {
+    const char* folder = std::getenv("VK_TEST_HOSTS");
+    if (folder == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a folder with snapshots of real machines";
+    std::map<std::string_view, unsigned int> machines;
+    for (const std::string& name : Root(folder).list("/").names) {
+        const Root machine(std::string(folder) + "/" + name);
+        const Smbios smbios = parseSmbios(machine.read("/sys/firmware/dmi/tables/smbios_entry_point").text,
+                                          machine.read("/sys/firmware/dmi/tables/DMI").text);
+        for (const std::string_view reason : reasonsOn(smbios)) ++machines[reason];
+    }
+    EXPECT_FALSE(machines.empty());
+    constexpr unsigned int NOT_COUNTED = 0;
+#define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) EXPECT_EQ(machines[REASON], MACHINES) << REASON;
+#include "host/Placeholders.inc"
 }
 
 } // namespace

@@ -58,6 +58,27 @@ TEST(Smbios, ReadsTheFirstSystemAndEveryChassis) {
     EXPECT_EQ(smbios.chassis[1].serial, "C2");
 }
 
+TEST(Smbios, TellsAChassisThatIsRepeatedOnce) {
+    const SmbiosChassisImage rack{23, "Veska", "V1", "C1", "S1", 3, 3, 3};
+    SmbiosChassisImage other = rack;
+    other.serial = "C2";
+    const SmbiosStructureImage longer = SmbiosStructureImage(3, 0x1A).text(4, "Veska");
+    const SmbiosStructureImage shorter = SmbiosStructureImage(3, 0x19).text(4, "Veska");
+    const Smbios smbios = parse(SmbiosImage(3, 2).add(rack).add(other).add(rack).add(longer).add(shorter).add(other));
+    ASSERT_EQ(smbios.chassis.size(), 4U); // the handles differ
+    EXPECT_EQ(smbios.chassis[0].serial, "C1");
+    EXPECT_EQ(smbios.chassis[1].serial, "C2");
+}
+
+TEST(Smbios, ReadsTheFirstBaseBoard) {
+    const Smbios smbios = parse(SmbiosImage(3, 2)
+                                    .add(SmbiosStructureImage(2, 8).text(4, " Veska ").text(5, "VB 7"))
+                                    .add(SmbiosStructureImage(2, 8).text(4, "Veska").text(5, "VB 8")));
+    ASSERT_TRUE(smbios.baseBoard.has_value());
+    EXPECT_EQ(smbios.baseBoard->manufacturer, "Veska");
+    EXPECT_EQ(smbios.baseBoard->product, "VB 7");
+}
+
 TEST(Smbios, ReadsOnlyTheFieldsOfAShortStructure) {
     const Smbios smbios = parse(SmbiosImage(2, 0, SmbiosImage::Version2)
                                     .add(SmbiosStructureImage(1, 8).text(4, "Veska").text(7, "CZ1"))
@@ -102,6 +123,7 @@ TEST(Smbios, TellsWhatIsWrong) {
     image.addRaw("\x03\x02\0\0\0\0"s);
     EXPECT_THAT(parse(image).problems, ElementsAre("structure shorter than 4 bytes at byte 21",
                                                    "3 string(s) that the table refers to are not there"));
+    EXPECT_EQ(parse(image).breakOff, "structure shorter than 4 bytes at byte 21");
     const Smbios none = parseSmbios("_SM3_", image.table());
     EXPECT_EQ(none.entryPointProblem, "entry point too short");
     EXPECT_FALSE(none.system.has_value());
@@ -122,11 +144,14 @@ TEST(Smbios, SurvivesRandomTables) {
 
 TEST(Smbios, ReadsAMegabyteOfChassisInReasonableTime) {
     SmbiosImage image(3, 0);
-    const std::string one = SmbiosStructureImage(3, 7).byte(4, 255).byte(6, 255).image(0);
+    SmbiosStructureImage one(3, 0x0F);
+    one.byte(4, 255).byte(6, 255);
+    const std::size_t length = one.image(0).size();
     std::string table;
-    while (table.size() + one.size() <= (1U << 20)) table += one;
+    for (unsigned int i = 0; table.size() + length <= (1U << 20); ++i) // each another one
+        table += one.byte(0x0C, i & 255).byte(0x0D, i >> 8 & 255).byte(0x0E, i >> 16 & 255).image(0);
     image.addRaw(table);
-    EXPECT_EQ(parse(image).chassis.size(), table.size() / one.size());
+    EXPECT_EQ(parse(image).chassis.size(), table.size() / length);
 }
 
 } // namespace

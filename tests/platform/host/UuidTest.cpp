@@ -1,6 +1,13 @@
 #include "host/Uuid.h"
 
+#include "host/SmbiosTable.h"
+#include "vk/Root.h"
+
 #include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <map>
 
 namespace VK::Host {
 
@@ -22,15 +29,47 @@ TEST(Uuid, TakesSixteenBytes) {
     EXPECT_EQ(uuidFromBytes("", {2, 6}), "");
 }
 
-TEST(Uuid, JunkIsNone) {
-    EXPECT_EQ(uuidFromText(uuidFromBytes(std::string(16, '\0'), {3, 0})), "");
-    EXPECT_EQ(uuidFromText(uuidFromBytes(std::string(16, '\xFF'), {3, 0})), "");
-    EXPECT_EQ(uuidFromText(uuidFromBytes("\x00\x02\x00\x03\x00\x04\x00\x05\x00\x06\x00\x07\x00\x08\x00\x09"sv, {3, 0})),
-              "");
-    EXPECT_EQ(uuidFromText(uuidFromBytes("\x03\x02\x01\x00\x05\x04\x07\x06\x08\x09\x0A\x0B\x0C\x0D\x0E\x0F"sv, {2, 4})),
-              "");
-    EXPECT_EQ(uuidFromText("10000000-0000-8000-0040-000000000000"), "");
-    EXPECT_EQ(uuidFromText("FEFEFEFE-FEFE-FEFE-FEFE-FEFEFEFEFEFE"), "");
+/// The UUID of a table's bytes, read as tables of that version are; empty for one that machines share.
+std::string ofBytes(std::string_view bytes, SmbiosVersion version) {
+    return uuidFromText(uuidFromBytes(bytes, version));
+}
+
+TEST(Uuid, ThatProductLinesShareIsNoneWhateverTheVersion) {
+    for (const std::string_view bytes : {
+             "\0\0\0\0\0\0\0\0\0\0\0\0\0\0\0\0"sv,
+             "\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF"sv,
+             "\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE\xFE"sv,
+             "\0\x02\0\x03\0\x04\0\x05\0\x06\0\x07\0\x08\0\x09"sv,
+             "\0\x01\x02\x03\x04\x05\x06\x07\x08\x09\x0A\x0B\x0C\x0D\x0E\x0F"sv,
+             "\x10\0\0\0\0\0\x80\0\0\x40\0\0\0\0\0\0"sv,
+             "\0\0\0\x10\0\0\0\x80\0\x40\0\0\0\0\0\0"sv,
+             "\x78\x56\x34\x12\x34\x12\x78\x56\x90\xAB\xCD\xDE\xEF\xAA\xBB\xCC"sv,
+             "\x12\x34\x56\x78\x12\x34\x56\x78\x90\xAB\xCD\xDE\xEF\xAA\xBB\xCC"sv,
+             "\0\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF"sv,
+             "DELL\0\0\x10 \x80 \x80\xC0\x4F   "sv,
+             "DELL\0\0\x10\0\x80\0\x80\xC0\x4F\0\0\0"sv,
+             "DELL \0\x10 \x80 \xA0\xC0\x4F   "sv,
+         })
+        for (const SmbiosVersion version : {SmbiosVersion{2, 3}, SmbiosVersion{2, 6}, SmbiosVersion{3, 2}})
+            EXPECT_EQ(ofBytes(bytes, version), "") << uuidFromBytes(bytes, version);
+}
+
+TEST(Uuid, ThatProductLinesShareIsNoneAsText) {
+    for (const char* text : {"03000200-0400-0500-0006-000700080009", "00020003-0004-0005-0006-000700080009",
+                             "03020100-0504-0706-0809-0a0b0c0d0e0f", "00010203-0405-0607-0809-0A0B0C0D0E0F",
+                             "10000000-0000-8000-0040-000000000000", "10000000-0000-0000-0000-000000000000",
+                             "12345678-1234-5678-90ab-cddeefaabbcc", "ffffff00-ffff-ffff-ffff-ffffffffffff",
+                             "FEFEFEFE-FEFE-FEFE-FEFE-FEFEFEFEFEFE", "4c4c4544-0000-2010-8020-80c04f202020"})
+        EXPECT_EQ(uuidFromText(text), "") << text;
+}
+
+TEST(Uuid, OfOneMachineIsKeptHoweverOdd) {
+    for (const char* text : {"4c4c4544-0031-5910-8052-b4c04f4e4e32", // Dell, service tag 1YR4NN2
+                             "4c4c4544-0000-2010-8020-80c04f202031", // the last character of a service tag
+                             "4c4c4544-0000-2010-8020-80c050202020", // not Dell's form
+                             "10000000-0000-0000-0000-0cc47a133878", "ffffff00-ffff-ffff-ffff-0cc47a133878",
+                             "12345678-1234-5678-90ab-cddeefaabbcd", "032e02b4-0499-0533-a106-940700080009"})
+        EXPECT_EQ(uuidFromText(text), text);
 }
 
 TEST(Uuid, ZerosBeforeAMacAddressAreOne) {
@@ -47,6 +86,28 @@ TEST(Uuid, OtherTextsAreNone) {
                              "4c4c4544-0031-5910-8052-b4c04f4e4e322", "4c4c4544-0031-5910-8052_b4c04f4e4e32",
                              "4c4c4544-0031-5910-8052-b4c04f4e4e3g", "4c4c454400315910-8052-b4c04f4e4e32-a"})
         EXPECT_EQ(uuidFromText(text), "") << text;
+}
+
+std::string hexDigits(std::string_view bytes) {
+    std::string digits = uuidFromBytes(bytes, {2, 3});
+    digits.erase(std::remove(digits.begin(), digits.end(), '-'), digits.end());
+    return digits;
+}
+
+TEST(Uuid, SharedOnesStateOnHowManyOfTheTestsMachinesTheyWereSeen) {
+    const char* folder = std::getenv("VK_TEST_HOSTS");
+    if (folder == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a folder with snapshots of real machines";
+    std::map<std::string, unsigned int> machines;
+    for (const std::string& name : Root(folder).list("/").names) {
+        const std::string table = Root(std::string(folder) + "/" + name).read("/sys/firmware/dmi/tables/DMI").text;
+        SmbiosTable structures(table);
+        while (const auto structure = structures.next())
+            if (structure->type() == 1) ++machines[hexDigits(structure->bytesAt(8, 16).value_or(""))];
+    }
+    EXPECT_FALSE(machines.empty());
+    constexpr unsigned int NOT_COUNTED = 0;
+#define SHARED_UUID(MACHINES, REASON, BYTES) EXPECT_EQ(machines[BYTES], MACHINES) << REASON;
+#include "host/Placeholders.inc"
 }
 
 } // namespace

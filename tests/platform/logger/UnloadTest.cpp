@@ -28,6 +28,7 @@ TEST(Unloading, ReallyHappensAndLeavesNothing) {
             destroy(&buffer);
             dlclose(library);
             if (dlopen(NVLOG_LIBRARY, RTLD_NOW | RTLD_NOLOAD) != nullptr) return std::string("still loaded");
+            if (support::inChild([] { return std::string("forked"); }) != "forked") return std::string("forks call it");
         }
         const int after = dup(0);
         close(after);

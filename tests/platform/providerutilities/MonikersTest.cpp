@@ -114,6 +114,15 @@ TEST_F(Monikers, BecomeTextKeysInOrder) {
     EXPECT_EQ(name, "Name");
 }
 
+TEST_F(Monikers, WithoutPairsStandOnTheirFirstPairOnceItComes) {
+    Moniker moniker;
+    EXPECT_TRUE(ProviderUtilities::transformMonikerToObjectPath(moniker, &path));
+    moniker.addKey("Name", "node7");
+    std::string name;
+    EXPECT_TRUE(moniker.getName(name));
+    EXPECT_EQ(name, "Name");
+}
+
 TEST_F(Monikers, SayWhenAKeyWasRefused) {
     Moniker moniker;
     EXPECT_TRUE(ProviderUtilities::transformMonikerToObjectPath(moniker, &path));

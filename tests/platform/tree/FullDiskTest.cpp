@@ -1,11 +1,11 @@
 // A disk that is full or read-only, and a limit on file sizes: the old file stays whole, nothing is left beside it, and
 // the process goes on.
-#include "support/LogCapture.h"
-#include "zone/ZoneInForce.h"
 #include "support/HostCopy.h"
 #include "support/InChild.h"
+#include "support/LogCapture.h"
 #include "tree/SimulatedHost.h"
 #include "zone/ZoneChange.h"
+#include "zone/ZoneInForce.h"
 
 #include <gmock/gmock.h>
 
@@ -46,6 +46,10 @@ void fill(const std::string& folder) {
 
 bool makeReadOnly(const std::string& folder) {
     return mount(nullptr, folder.c_str(), nullptr, MS_REMOUNT | MS_RDONLY, nullptr) == 0;
+}
+
+bool makeWritable(const std::string& folder) {
+    return mount(nullptr, folder.c_str(), nullptr, MS_REMOUNT, nullptr) == 0;
 }
 
 std::vector<std::string> namesIn(const std::string& folder) {
@@ -170,7 +174,7 @@ TEST_F(FullDiskOfZones, UnderTheZoneChangesNothingOrTheZoneAlone) {
             EXPECT_FALSE(Zone::changeOffset(root, 345)) << "a file of our own, for which there is no room";
             EXPECT_EQ(host.link("etc/localtime"), "/usr/share/zoneinfo/Europe/Berlin");
             EXPECT_THAT(namesIn(host.path("etc")), UnorderedElementsAre("localtime", "timezone", "filler"));
-            EXPECT_FALSE(host.exists("var/lib/vk/instrumentation/replaced-zone")) << "nothing was replaced";
+            EXPECT_FALSE(host.exists("var/lib/vk/instrumentation/former-zone")) << "nothing was replaced";
 
             takeLog();
             EXPECT_TRUE(Zone::changeOffset(root, -300)) << "a link, which takes no room";
@@ -190,7 +194,23 @@ TEST_F(FullDiskOfZones, ThatIsReadOnlyChangesNothing) {
             host.useZone("Europe/Berlin");
             ASSERT_TRUE(makeReadOnly(host.path("etc")));
             expectZoneUnchanged(host);
-            EXPECT_FALSE(host.exists("var/lib/vk/instrumentation/replaced-zone")) << "nothing was replaced";
+            EXPECT_FALSE(host.exists("var/lib/vk/instrumentation/former-zone")) << "nothing was replaced";
+        },
+        host.path("etc"));
+}
+
+TEST_F(FullDiskOfZones, ThatIsReadOnlyKeepsTheZoneRememberedBefore) {
+    mounting(
+        [this] {
+            host.useZone("Europe/Berlin");
+            ASSERT_TRUE(Zone::changeOffset(Root(host.path()), 330));
+            host.useZone("America/New_York");
+            ASSERT_TRUE(makeReadOnly(host.path("etc")));
+            EXPECT_FALSE(Zone::changeDaylightSaving(Root(host.path()), false));
+            ASSERT_TRUE(makeWritable(host.path("etc")));
+            host.useZone("Asia/Kolkata");
+            ASSERT_TRUE(Zone::changeDaylightSaving(Root(host.path()), true));
+            EXPECT_EQ(host.link("etc/localtime"), "/usr/share/zoneinfo/Europe/Berlin");
         },
         host.path("etc"));
 }

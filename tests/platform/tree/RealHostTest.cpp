@@ -89,7 +89,18 @@ TEST_F(RealHostTest, WithoutHardwareDataIsStillAComputer) {
     EXPECT_THAT(node("/computer/0").description, StartsWith("Linux "));
     EXPECT_EQ(host().status(node("/computer/0")), 0U);
     EXPECT_TRUE(host().tree()->ofType(1).empty());
-    EXPECT_THAT(takeLog(), ElementsAre("4000 no SMBIOS tables: No such file or directory"));
+    EXPECT_THAT(takeLog(), ElementsAre("4000 no SMBIOS tables: /sys/firmware/dmi/tables: No such file or directory"));
+}
+
+TEST_F(RealHostTest, LogsWhichOfTheTablesIsMissingOrDamagedOnce) {
+    const std::string tables = "/sys/firmware/dmi/tables/";
+    files.write(tables.substr(1) + "smbios_entry_point", SmbiosImage(3, 2).entryPoint());
+    host().tree();
+    EXPECT_THAT(takeLog(), ElementsAre("4000 no SMBIOS tables: " + tables + "DMI: No such file or directory"));
+    files.write(tables.substr(1) + "smbios_entry_point", std::string(24, 'x'));
+    files.write(tables.substr(1) + "DMI", "");
+    RealHost(Root(files.path())).tree();
+    EXPECT_THAT(takeLog(), ElementsAre("6000 " + tables + "smbios_entry_point: no entry point"));
 }
 
 TEST_F(RealHostTest, ReadsWhatCannotChangeOnceAndTheRestEachTime) {

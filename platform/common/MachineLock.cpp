@@ -1,0 +1,56 @@
+#include "vk/MachineLock.h"
+
+#include "common/FileDescriptor.h"
+
+#include <cerrno>
+#include <fcntl.h>
+#include <new>
+#include <pthread.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace VK {
+
+namespace {
+
+/// One for all names. Closing any descriptor of a file ends the process's record locks on it: so this process may have
+/// no two open at a time.
+std::mutex amongThreads;
+
+/// The thread that held it may not exist in the child.
+[[maybe_unused]] const int watched = pthread_atfork(nullptr, nullptr, [] { new (&amongThreads) std::mutex; });
+
+bool onlyRootWrites(int directory) {
+    struct stat status {};
+    return fstat(directory, &status) == 0 && status.st_uid == 0 && (status.st_mode & (S_IWGRP | S_IWOTH)) == 0;
+}
+
+FileDescriptor openLockFile(const std::string& directory, const std::string& name) {
+    const FileDescriptor where(::open(directory.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+    if (!where || !onlyRootWrites(where.get())) return FileDescriptor();
+    return FileDescriptor(openat(where.get(), name.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
+}
+
+bool waitForLock(int file) {
+    struct flock whole {};
+    whole.l_type = F_WRLCK;
+    whole.l_whence = SEEK_SET;
+    while (fcntl(file, F_SETLKW, &whole) != 0)
+        if (errno != EINTR) return false;
+    return true;
+}
+
+} // namespace
+
+MachineLock::MachineLock(const std::string& name, const std::string& directory)
+    : threads(amongThreads), holder(getpid()) {
+    FileDescriptor opened = openLockFile(directory, name);
+    if (opened && waitForLock(opened.get())) file = opened.release();
+}
+
+MachineLock::~MachineLock() {
+    if (file >= 0) ::close(file);
+    if (getpid() != holder) threads.release();
+}
+
+} // namespace VK
