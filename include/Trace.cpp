@@ -1,17 +1,41 @@
 #include "include/Trace.h"
 
 #include <cxxabi.h>
+#include <pthread.h>
 
+#include <exception>
 #include <stdexcept>
 
 namespace VK {
 namespace {
 
-/// Runs a step whose exceptions must go nowhere: it stands in a destructor.
+/// Puts off a cancellation while an exception unwinds: nothing else may leave a destructor then.
+class CancellationPutOff {
+public:
+    CancellationPutOff() : unwinding(std::uncaught_exceptions() > 0) {
+        if (unwinding) pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &before);
+    }
+    ~CancellationPutOff() {
+        if (unwinding) pthread_setcancelstate(before, nullptr);
+    }
+    CancellationPutOff(const CancellationPutOff&) = delete;
+    CancellationPutOff& operator=(const CancellationPutOff&) = delete;
+
+private:
+    const bool unwinding;
+    int before = PTHREAD_CANCEL_ENABLE;
+};
+
+/// Runs a step whose exceptions must go nowhere: it stands in a destructor. Only a thread's end goes on, since the C
+/// library ends the process when it is swallowed. It is caught by a reference to no object, which is how the
+/// compiler's runtime has it.
 template <class Step>
-void swallowing(Step step) noexcept {
+__attribute__((no_sanitize("null"))) void swallowing(Step step) {
+    const CancellationPutOff putOff;
     try {
         step();
+    } catch (const abi::__forced_unwind&) {
+        throw;
     } catch (...) { // NOLINT(bugprone-empty-catch): a line that the logger refused is all that is lost
     }
 }
@@ -38,12 +62,12 @@ void writeMarker(const std::string& logger, const char* marker, unsigned int lin
 
 } // namespace
 
-void rethrowFromLogger() {
+__attribute__((no_sanitize("null"))) void rethrowFromLogger() {
     try {
         throw;
     } catch (const std::exception&) {
         throw;
-    } catch (abi::__forced_unwind&) { // a cancelled thread
+    } catch (const abi::__forced_unwind&) { // a cancelled thread
         throw;
     } catch (...) {
         throw std::runtime_error("The logger failed");
@@ -89,7 +113,7 @@ void traceVariable(const TracePoint& at, const char* name, unsigned int value, i
     hand(at, level, trace(name, at.source.file.data(), at.line, value));
 }
 
-void traceDestructor(const TracePoint& at) noexcept {
+void traceDestructor(const TracePoint& at) {
     swallowing([&] { writeLine(at, DebugLevel, METHOD_INVOKED); });
 }
 
@@ -97,15 +121,15 @@ TraceScope::TraceScope(const TracePoint& point, int entryLevel) : at(point) {
     writeLine(at, entryLevel, ENTERING);
 }
 
-TraceScope::~TraceScope() {
+TraceScope::~TraceScope() noexcept(false) {
     swallowing([&] { writeLine(at, DebugLevel, EXITING); });
 }
 
-DestructorTraceScope::DestructorTraceScope(const TracePoint& point) noexcept : at(point) {
+DestructorTraceScope::DestructorTraceScope(const TracePoint& point) : at(point) {
     swallowing([&] { writeLine(at, DebugLevel, ENTERING); });
 }
 
-DestructorTraceScope::~DestructorTraceScope() {
+DestructorTraceScope::~DestructorTraceScope() noexcept(false) {
     swallowing([&] { writeLine(at, DebugLevel, EXITING); });
 }
 
@@ -113,7 +137,7 @@ void ParameterTraceScope::enter() {
     writeLine(at, parameters, ENTERING);
 }
 
-ParameterTraceScope::~ParameterTraceScope() {
+ParameterTraceScope::~ParameterTraceScope() noexcept(false) {
     swallowing([&] { writeLine(at, parameters, EXITING); });
 }
 
