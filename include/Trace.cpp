@@ -3,26 +3,33 @@
 #include <cxxabi.h>
 #include <pthread.h>
 
-#include <exception>
 #include <stdexcept>
 
 namespace VK {
 namespace {
 
-/// Puts off a cancellation while an exception unwinds: nothing else may leave a destructor then.
+/// What the C++ ABI keeps for each thread.
+struct ExceptionGlobals {
+    const void* caught;
+    unsigned int uncaught;
+};
+
+/// std::uncaught_exceptions() > 0 at a third of its price: this is asked at the end of every scope.
+bool isUnwinding() {
+    static thread_local const ExceptionGlobals* globals = nullptr;
+    if (globals == nullptr) globals = reinterpret_cast<const ExceptionGlobals*>(abi::__cxa_get_globals());
+    return globals->uncaught > 0;
+}
+
+/// Puts off a cancellation.
 class CancellationPutOff {
 public:
-    CancellationPutOff() : unwinding(std::uncaught_exceptions() > 0) {
-        if (unwinding) pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &before);
-    }
-    ~CancellationPutOff() {
-        if (unwinding) pthread_setcancelstate(before, nullptr);
-    }
+    CancellationPutOff() { pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &before); }
+    ~CancellationPutOff() { pthread_setcancelstate(before, nullptr); }
     CancellationPutOff(const CancellationPutOff&) = delete;
     CancellationPutOff& operator=(const CancellationPutOff&) = delete;
 
 private:
-    const bool unwinding;
     int before = PTHREAD_CANCEL_ENABLE;
 };
 
@@ -30,14 +37,26 @@ private:
 /// library ends the process when it is swallowed. It is caught by a reference to no object, which is how the
 /// compiler's runtime has it.
 template <class Step>
-__attribute__((no_sanitize("null"))) void swallowing(Step step) {
-    const CancellationPutOff putOff;
+__attribute__((no_sanitize("null"))) void swallowingAllButTheEnd(Step step) {
     try {
         step();
     } catch (const abi::__forced_unwind&) {
         throw;
     } catch (...) { // NOLINT(bugprone-empty-catch): a line that the logger refused is all that is lost
     }
+}
+
+/// The same while an exception unwinds: nothing else may leave a destructor then, so that a cancellation waits.
+template <class Step>
+__attribute__((noinline, cold)) void swallowingInUnwinding(Step step) {
+    const CancellationPutOff putOff;
+    swallowingAllButTheEnd(step);
+}
+
+template <class Step>
+void swallowing(Step step) {
+    if (__builtin_expect(isUnwinding(), false)) return swallowingInUnwinding(step);
+    swallowingAllButTheEnd(step);
 }
 
 void hand(const TracePoint& at, int level, const char* text) {
