@@ -329,7 +329,7 @@ TEST(RefusedParts, AreNoneWhereNothingWasFoundAndTheResultCannotBeClosed) {
     const om::Answer answer = test::provider().run(request);
     EXPECT_EQ(answer.code, CMPI_RC_OK);
     EXPECT_TRUE(answer.faulted) << "it was tried";
-    EXPECT_THAT(test::events(test::takeLog()), Not(testing::Contains(refusedPart("BaseServer_GetInstance"))));
+    EXPECT_THAT(test::takeLog(), Not(testing::Contains(testing::HasSubstr("refused a part of the answer"))));
 }
 
 TEST(ModifyInstance, IsNotSupportedForAnyClassButTheTimeService) {
