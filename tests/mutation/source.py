@@ -4,6 +4,8 @@ import dataclasses
 import pathlib
 import re
 
+LONGEST = 200  # of a change, as it is printed
+
 
 @dataclasses.dataclass(frozen=True, order=True)
 class Mutant:
@@ -25,7 +27,8 @@ class Mutant:
         return f"{' '.join(self.old.split())} -> {' '.join(self.new.split()) or 'nothing'}"
 
     def __str__(self):
-        return f"{self.file}:{self.line}: {self.function}: {self.kind}: {self.change()}"
+        change = self.change() if len(self.change()) <= LONGEST else f"{self.change()[:LONGEST]}..."
+        return f"{self.file}:{self.line}: {self.function}: {self.kind}: {change}"
 
 
 class Source:
