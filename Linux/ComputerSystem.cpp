@@ -27,9 +27,10 @@ const TraceSource& ComputerSystem::traceSource() {
 
 ComputerSystem::ComputerSystem() {
     const TraceScope scope(source);
+    selectFirst();
 }
 
-ComputerSystem::~ComputerSystem() {
+ComputerSystem::~ComputerSystem() noexcept(false) {
     const DestructorTraceScope scope(source);
 }
 

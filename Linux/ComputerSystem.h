@@ -17,7 +17,7 @@ enum class ComputerSystemFilter : unsigned int {
 class ComputerSystem : public NodeCursor<ComputerSystem, ComputerSystemFilter> {
 public:
     ComputerSystem();
-    ~ComputerSystem();
+    ~ComputerSystem() noexcept(false);
 
     bool getName(std::string& name) const;
     /// The same as the name.
@@ -63,6 +63,7 @@ public:
 
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::ComputerSystemNode;
+    static constexpr bool evaluatesUnfiltered = true;
     bool passes(const Filter& filter) const;
 };
 

@@ -28,7 +28,7 @@ ComputerSystemPackage::ComputerSystemPackage() {
     traceMethod(source);
 }
 
-ComputerSystemPackage::~ComputerSystemPackage() {
+ComputerSystemPackage::~ComputerSystemPackage() noexcept(false) {
     traceDestructor(source);
 }
 
@@ -47,9 +47,9 @@ void ComputerSystemPackage::getComputerSystemMoniker(Moniker& monikerPackage) {
 
 void ComputerSystemPackage::getPhysicalPackageMoniker(Moniker& monikerComputer) {
     const ParameterTraceScope scope(source, " monikerComputer=", &monikerComputer);
+    Instrumentation computer;
     const std::string name = requiredKey(monikerComputer, "Name");
     traceVariable(source, "name", name.c_str());
-    Instrumentation computer;
     selectComputer(computer, name);
     if (!computer) throw InstrumentationException("Concerned Computer Could Not Be Found.");
     replaceMoniker(monikerComputer, "SystemName", computer.getPathToNode());

@@ -13,7 +13,7 @@ namespace VK::BaseServerProvider {
 class ComputerSystemPackage {
 public:
     ComputerSystemPackage();
-    ~ComputerSystemPackage();
+    ~ComputerSystemPackage() noexcept(false);
     ComputerSystemPackage(const ComputerSystemPackage&) = delete;
     ComputerSystemPackage& operator=(const ComputerSystemPackage&) = delete;
 

@@ -14,7 +14,7 @@ ElementCapabilities::ElementCapabilities() {
     traceMethod(source);
 }
 
-ElementCapabilities::~ElementCapabilities() {
+ElementCapabilities::~ElementCapabilities() noexcept(false) {
     traceDestructor(source);
 }
 

@@ -10,7 +10,7 @@ namespace VK::BaseServerProvider {
 class ElementCapabilities {
 public:
     ElementCapabilities();
-    ~ElementCapabilities();
+    ~ElementCapabilities() noexcept(false);
     ElementCapabilities(const ElementCapabilities&) = delete;
     ElementCapabilities& operator=(const ElementCapabilities&) = delete;
 

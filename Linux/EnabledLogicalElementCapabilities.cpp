@@ -11,9 +11,10 @@ const TraceSource& EnabledLogicalElementCapabilities::traceSource() {
 
 EnabledLogicalElementCapabilities::EnabledLogicalElementCapabilities() {
     const TraceScope scope(source);
+    selectFirst();
 }
 
-EnabledLogicalElementCapabilities::~EnabledLogicalElementCapabilities() {
+EnabledLogicalElementCapabilities::~EnabledLogicalElementCapabilities() noexcept(false) {
     const DestructorTraceScope scope(source);
 }
 

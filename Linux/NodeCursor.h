@@ -13,8 +13,9 @@ namespace VK::BaseServerProvider {
 /// type that pass a list of filters.
 ///
 /// `Self` says its node type (`nodeType`), whose trace lines it writes (`traceSource()`) and what each filter compares
-/// (`passes(const Filter&)`). `FilterTypes` is its enumeration of filters. Filters only narrow what lies ahead: the
-/// current node is never rewound, except by initialize().
+/// (`passes(const Filter&)`), and whether a step asks evaluate() also without a filter (`evaluatesUnfiltered`).
+/// `FilterTypes` is its enumeration of filters. Filters only narrow what lies ahead: the current node is never rewound,
+/// except by initialize().
 template <class Self, class FilterTypes>
 class NodeCursor {
 public:
@@ -31,7 +32,7 @@ public:
     /// Drops all filters and starts again at the first node.
     void initialize() {
         const TraceScope scope(Self::traceSource());
-        instrumentation.selectNode(Self::nodeType);
+        selectFirst();
         filters.clear();
     }
 
@@ -61,19 +62,22 @@ public:
     NodeCursor& operator++() {
         const TraceScope scope(Self::traceSource());
         ++instrumentation;
-        skipFiltered();
+        if (Self::evaluatesUnfiltered || !filters.empty()) skipFiltered();
         return *this;
     }
 
 protected:
-    NodeCursor() { instrumentation.selectNode(Self::nodeType); }
+    NodeCursor() = default;
     ~NodeCursor() = default;
+
+    /// Stands on the first node; for the constructor, whose entry line comes before.
+    void selectFirst() { instrumentation.selectNode(Self::nodeType); }
 
     const Instrumentation& node() const { return instrumentation; }
 
 private:
     void skipFiltered() {
-        while (instrumentation && !filters.empty() && !evaluate()) ++instrumentation;
+        while (instrumentation && !evaluate()) ++instrumentation;
     }
 
     std::vector<Filter> filters;

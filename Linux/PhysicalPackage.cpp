@@ -13,9 +13,10 @@ const TraceSource& PhysicalPackage::traceSource() {
 
 PhysicalPackage::PhysicalPackage() {
     const TraceScope scope(source);
+    selectFirst();
 }
 
-PhysicalPackage::~PhysicalPackage() {
+PhysicalPackage::~PhysicalPackage() noexcept(false) {
     traceDestructor(source);
 }
 

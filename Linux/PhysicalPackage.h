@@ -18,7 +18,7 @@ enum class PhysicalPackageFilter : unsigned int {
 class PhysicalPackage : public NodeCursor<PhysicalPackage, PhysicalPackageFilter> {
 public:
     PhysicalPackage();
-    ~PhysicalPackage();
+    ~PhysicalPackage() noexcept(false);
 
     bool getCreationClassName(std::string& className) const;
     /// The serial number.
@@ -63,6 +63,7 @@ public:
 
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::SystemChassisNode;
+    static constexpr bool evaluatesUnfiltered = false; // meant: unlike the computer
     bool passes(const Filter& filter) const;
 };
 

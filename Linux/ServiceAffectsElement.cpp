@@ -13,7 +13,7 @@ TimeServiceAffectsElement::TimeServiceAffectsElement() {
     hostName = HostName().text();
 }
 
-TimeServiceAffectsElement::~TimeServiceAffectsElement() {
+TimeServiceAffectsElement::~TimeServiceAffectsElement() noexcept(false) {
     const DestructorTraceScope scope(source);
 }
 

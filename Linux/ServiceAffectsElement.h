@@ -12,7 +12,7 @@ class TimeServiceAffectsElement {
 public:
     /// Reads the host name; empty when it cannot be read.
     TimeServiceAffectsElement();
-    ~TimeServiceAffectsElement();
+    ~TimeServiceAffectsElement() noexcept(false);
     TimeServiceAffectsElement(const TimeServiceAffectsElement&) = delete;
     TimeServiceAffectsElement& operator=(const TimeServiceAffectsElement&) = delete;
 

@@ -29,7 +29,7 @@ TimeService::TimeService() : name("TimeService") {
     instrumentation.selectNode(NodeLexicon::ComputerSystemNode);
 }
 
-TimeService::~TimeService() {
+TimeService::~TimeService() noexcept(false) {
     const DestructorTraceScope scope(source);
 }
 

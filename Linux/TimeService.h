@@ -15,7 +15,7 @@ namespace VK::BaseServerProvider {
 class TimeService : public SingleElement {
 public:
     TimeService();
-    ~TimeService();
+    ~TimeService() noexcept(false);
 
     /// "TimeService@" and the host name.
     bool getName(std::string& name) const;

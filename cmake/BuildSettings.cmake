@@ -40,11 +40,11 @@ if(VK_FUZZ)
     target_compile_options(vk_settings INTERFACE -fsanitize=fuzzer-no-link)
 endif()
 if(VK_COVERAGE)
-    # The counters lie in files that are mapped (%c): so they outlive children that are killed or leave by _exit. One
-    # file holds those of a program or library, from all of its runs (%m); scripts/coverage reads them.
-    target_compile_options(vk_settings INTERFACE -O0 -fcoverage-mapping -fprofile-update=atomic
-        -fprofile-instr-generate=${CMAKE_BINARY_DIR}/profiles/%m%c.profraw "SHELL:-mllvm -runtime-counter-relocation=true")
-    target_link_options(vk_settings INTERFACE -fprofile-instr-generate)
+    # Counted by gcc, in a file beside each object; all programs and libraries that hold the object add to it. Threads
+    # count, too.
+    target_compile_options(vk_settings INTERFACE -O0 --coverage -fprofile-abs-path -fprofile-update=atomic)
+    target_compile_definitions(vk_settings INTERFACE VK_COVERAGE)
+    target_link_options(vk_settings INTERFACE --coverage)
 endif()
 if(NOT CMAKE_BUILD_TYPE STREQUAL "Debug" AND NOT VK_COVERAGE AND NOT VK_SANITIZE)
     # Some distributions' compilers set a level of their own. It wants optimisation, which test programs do without.

@@ -11,10 +11,13 @@ string(REPEAT "/." 200 room)
 set_target_properties(${runtime_libraries} PROPERTIES BUILD_WITH_INSTALL_RPATH ON INSTALL_RPATH "$ORIGIN${room}")
 
 # Debug information names the sources from the tree's root on, not where the tree lay when it was built.
-foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_core vkcim)
-    target_compile_options(${target} PRIVATE
-        -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)
-endforeach()
+# gcov's notes name them as they are.
+if(NOT VK_COVERAGE)
+    foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_core vkcim)
+        target_compile_options(${target} PRIVATE
+            -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)
+    endforeach()
+endif()
 
 install(TARGETS ${runtime_libraries}
     LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT provider NAMELINK_COMPONENT development)

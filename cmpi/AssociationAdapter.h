@@ -19,28 +19,26 @@ enum : unsigned short { ComputerSystemClassId = 1 };
 ///
 /// `Self` says its class (`className`), the identifiers of the association and of the partner's class
 /// (`associationClassId`, `partnerClassId`), the reference names in order (`computerRole`, `partnerRole`,
-/// `computerFirst`) and whose trace lines it writes (`traceSource()`).
+/// `computerFirst`), whether there is a pair to make a path of (`hasPair()`) and whose trace lines it writes
+/// (`traceSource()`).
 template <class Self, class Partner, class Ends>
 class AssociationAdapter {
 public:
     AssociationAdapter(const AssociationAdapter&) = delete;
     AssociationAdapter& operator=(const AssociationAdapter&) = delete;
 
-    /// The path of the association that stands now, with both references; null when one end is missing, and when the
-    /// broker could not tell the class of the request's path, whose keys then have chosen nothing.
+    /// The path of the association that stands now, with both references; null when none does, when a path was refused,
+    /// and when the broker could not tell the class of the request's path, whose keys then have chosen nothing.
     CMPIObjectPath* getObjectPath() const {
         const TraceScope scope(Self::traceSource());
         if (requestedClassId == ProviderUtilities::CLASS_ID_UNKNOWN) return nullptr;
-        if (!computer || !partner) return nullptr;
-        CMPIObjectPath* const computerPath = computer.getObjectPath();
-        if (computerPath == nullptr) return nullptr; // what was refused is logged
-        CMPIObjectPath* const partnerPath = partner.getObjectPath();
-        if (partnerPath == nullptr) return nullptr;
+        if (!static_cast<const Self&>(*this).hasPair()) return nullptr;
         CMPIObjectPath* path = keylessPath(Self::className);
-        if (path == nullptr) return nullptr;
-        for (const char* role : roles())
-            if (!ProviderUtilities::setKeyProperty(path, role, role == Self::computerRole ? computerPath : partnerPath))
-                return nullptr;
+        if (path == nullptr) return nullptr; // what was refused is logged
+        for (const char* role : roles()) {
+            CMPIObjectPath* const end = role == Self::computerRole ? computer.getObjectPath() : partner.getObjectPath();
+            if (end == nullptr || !ProviderUtilities::setKeyProperty(path, role, end)) return nullptr;
+        }
         return path;
     }
 

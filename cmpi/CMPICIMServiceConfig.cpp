@@ -1,5 +1,7 @@
 #include "cmpi/CMPICIMServiceConfig.h"
 
+#include "vk/CmpiSlots.h"
+
 #include <cstdio>
 
 #include <strings.h>
@@ -37,18 +39,28 @@ unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CM
     const ParameterTraceScope scope(source, " methodName=", methodName, " in=", in, " out=", out, " result=", result);
     if (methodName == nullptr || strcasecmp(methodName, "SetCIMconfig") != 0) return CMPI_RC_ERR_METHOD_NOT_FOUND;
 
+    // The count itself does not matter.
+    if (!Cmpi::hasSlot(in, &CMPIArgsFT::getArgCount)) return CMPI_RC_ERR_INVALID_PARAMETER;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    if (in != nullptr) in->ft->getArgCount(in, &status); // the count itself does not matter
-    if (in == nullptr || status.rc != CMPI_RC_OK) return CMPI_RC_ERR_INVALID_PARAMETER;
+    in->ft->getArgCount(in, &status);
+    if (status.rc != CMPI_RC_OK) return CMPI_RC_ERR_INVALID_PARAMETER;
+
+    struct Argument {
+        const char* name;
+        unsigned int value;
+        bool given;
+    };
+    Argument arguments[] = {{"deliveryRetryIntervalSec", 0, false}, {"deliveryRetryAttempts", 0, false}};
+    for (Argument& argument : arguments)
+        argument.given = ProviderUtilities::getProperty(in, argument.name, argument.value);
 
     // In this order; the first failure ends it, and otherwise the last setting's result is the answer.
     unsigned int answer = CMPI_RC_ERR_INVALID_PARAMETER;
-    for (const char* name : {"deliveryRetryIntervalSec", "deliveryRetryAttempts"}) {
-        unsigned int value = 0;
-        if (!ProviderUtilities::getProperty(in, name, value)) continue;
+    for (const Argument& argument : arguments) {
+        if (!argument.given) continue;
         char request[256] = {};
         // Meant: signed, so that a value above 2147483647 goes out negative.
-        std::snprintf(request, sizeof request, "%s%s%d", name, "=", static_cast<int>(value));
+        std::snprintf(request, sizeof request, "%s%s%d", argument.name, "=", static_cast<int>(argument.value));
         answer = executeMethod(request) != 0 ? CMPI_RC_ERR_FAILED : CMPI_RC_OK;
         if (answer != CMPI_RC_OK) break;
     }

@@ -11,8 +11,14 @@ const TraceSource& CMPITimeServiceAffectsElement::traceSource() {
 
 CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
                                                              const CMPIObjectPath* objectPath)
+    : CMPITimeServiceAffectsElement(
+          theBroker, context, objectPath,
+          ParameterTraceScope(source, " _broker=", theBroker, " _context=", context, " objectPath=", objectPath)) {}
+
+CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
+                                                             const CMPIObjectPath* objectPath,
+                                                             const ParameterTraceScope&)
     : AssociationAdapter(theBroker, context, objectPath) {
-    const ParameterTraceScope scope(source, " _broker=", theBroker, " _context=", context, " objectPath=", objectPath);
     traceVariable(source, "requestedClassId", requestedClassId);
     if (requestedClassId == partnerClassId)
         narrowed = narrow(computer, locateComputer(objectPath));
@@ -22,7 +28,7 @@ CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* t
         narrowed = narrow(partner, locateTimeService(objectPath));
 }
 
-CMPITimeServiceAffectsElement::~CMPITimeServiceAffectsElement() {
+CMPITimeServiceAffectsElement::~CMPITimeServiceAffectsElement() noexcept(false) {
     traceDestructor(source);
 }
 

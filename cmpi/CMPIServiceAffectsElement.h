@@ -13,12 +13,15 @@ class CMPITimeServiceAffectsElement
 public:
     CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
                                   const CMPIObjectPath* objectPath);
-    ~CMPITimeServiceAffectsElement();
+    ~CMPITimeServiceAffectsElement() noexcept(false);
 
     /// Whether there is an element at the other end from the request's; for the association, whether both ends stand.
     explicit operator bool() const;
     /// Moves on at the other end; for the association at both ends in step, so that there is one pair.
     CMPITimeServiceAffectsElement& operator++();
+
+    /// False when the broker refused the path that chooses the other end; writes no line.
+    bool hasPair() const { return narrowed; }
 
     /// The path of a computer's time service, of a time service's computer; keyless for a keyless path.
     CMPIObjectPath* locateTimeService(const CMPIObjectPath* objectPath);
@@ -33,7 +36,11 @@ public:
     static const TraceSource& traceSource();
 
 private:
-    bool narrowed = true; ///< false when the broker refused the path that chooses the other end
+    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
+                                  const CMPIObjectPath* objectPath, const ParameterTraceScope&);
+
+    bool narrowed = true;
 };
 
 } // namespace VK::BaseServerProvider

@@ -1,5 +1,7 @@
 #include "cmpi/CMPITimeService.h"
 
+#include "vk/CmpiSlots.h"
+
 #include <cmpimacs.h>
 
 #include <cstdlib>
@@ -52,29 +54,32 @@ void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** 
 
 namespace {
 
+using Cmpi::hasService;
+using Cmpi::hasSlot;
+
 /// An argument's data; of type CMPI_null when it is not there.
 CMPIData argument(const CMPIArgs* in, const char* name) {
+    CMPIData absent = {};
+    absent.state = CMPI_nullValue | CMPI_notFound;
+    if (!hasSlot(in, &CMPIArgsFT::getArg)) return absent;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPIData data = in->ft->getArg(in, name, &status);
-    if (status.rc != CMPI_RC_OK) {
-        data = CMPIData{};
-        data.state = CMPI_nullValue | CMPI_notFound;
-    }
-    return data;
+    const CMPIData data = in->ft->getArg(in, name, &status);
+    return status.rc == CMPI_RC_OK ? data : absent;
 }
 
 /// Refuses an argument of the wrong type. The status with its message stays here, which is meant: the caller sees the
 /// code alone.
 unsigned int refuse(const CMPIBroker* broker, const char* message) {
     CMPIStatus status = {CMPI_RC_ERR_INVALID_PARAMETER, nullptr};
-    if (broker != nullptr) status.msg = CMNewString(broker, message, nullptr);
+    if (hasService(broker, &CMPIBrokerEncFT::newString)) status.msg = CMNewString(broker, message, nullptr);
     static_cast<void>(status);
     return CMPI_RC_ERR_FAILED;
 }
 
 /// Answers the host's time now, in "TimeData".
 unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
-    if (broker == nullptr || out == nullptr) return CMPI_RC_ERR_FAILED;
+    if (!hasService(broker, &CMPIBrokerEncFT::newDateTime) || !hasSlot(out, &CMPIArgsFT::addArg))
+        return CMPI_RC_ERR_FAILED;
     CMPIValue now = {};
     now.dateTime = CMNewDateTime(broker, nullptr);
     if (now.dateTime == nullptr || now.dateTime->hdl == nullptr) return CMPI_RC_ERR_FAILED;
@@ -83,8 +88,9 @@ unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
 
 /// The 25 characters of a date-time; false where the broker does not tell them.
 bool textOf(const CMPIDateTime* dateTime, std::string& text) {
+    if (!hasSlot(dateTime, &CMPIDateTimeFT::getStringFormat)) return false;
     const CMPIString* string = dateTime->ft->getStringFormat(dateTime, nullptr);
-    if (string == nullptr) return false;
+    if (!hasSlot(string, &CMPIStringFT::getCharPtr)) return false;
     const char* characters = string->ft->getCharPtr(string, nullptr);
     if (characters == nullptr) return false;
     text = characters;
@@ -94,6 +100,7 @@ bool textOf(const CMPIDateTime* dateTime, std::string& text) {
 /// Whole seconds since 1970-01-01 UTC; false where the broker knows none, as for a date-time with asterisks.
 bool secondsOf(const CMPIDateTime* dateTime, long& seconds) {
     constexpr CMPIUint64 microsecondsPerSecond = 1000000;
+    if (!hasSlot(dateTime, &CMPIDateTimeFT::getBinaryFormat)) return false;
     CMPIStatus status = {CMPI_RC_OK, nullptr}; // some brokers write it only on failure
     const CMPIUint64 microseconds = dateTime->ft->getBinaryFormat(dateTime, &status);
     if (status.rc != CMPI_RC_OK) return false;
@@ -120,7 +127,7 @@ unsigned int CMPITimeService::invokeMethod(const char* methodName, const CMPIArg
     const ParameterTraceScope scope(source, " methodName=", methodName, " in=", in, " out=", out, " result=", result);
     if (methodName == nullptr || strcasecmp(methodName, "ManageTime") != 0) return CMPI_RC_ERR_METHOD_NOT_FOUND;
 
-    if (in == nullptr) return CMPI_RC_ERR_INVALID_PARAMETER;
+    if (!hasSlot(in, &CMPIArgsFT::getArgCount)) return CMPI_RC_ERR_INVALID_PARAMETER;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPICount count = in->ft->getArgCount(in, &status);
     if (status.rc != CMPI_RC_OK || (count != 2 && count != 3)) return CMPI_RC_ERR_INVALID_PARAMETER;

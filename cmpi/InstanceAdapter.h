@@ -34,11 +34,9 @@ class InstanceAdapter {
 public:
     /// For the elements that the path names; all of the class when it has no keys.
     InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, const CMPIObjectPath* objectPath)
-        : broker(theBroker), context(theContext), nameSpace(ProviderUtilities::getNamespace(objectPath)) {
-        const ParameterTraceScope scope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=", theBroker,
-                                        " _context=", theContext, " objectPath=", objectPath);
-        setObjectPath(objectPath);
-    }
+        : InstanceAdapter(theBroker, theContext, objectPath,
+                          ParameterTraceScope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=",
+                                              theBroker, " _context=", theContext, " objectPath=", objectPath)) {}
 
     /// For all elements, to walk one end of an association.
     InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, std::string theNameSpace)
@@ -100,12 +98,20 @@ public:
     }
 
 protected:
-    ~InstanceAdapter() { traceDestructor(TracePoint(Self::traceSource(), Self::destructorName)); }
+    ~InstanceAdapter() noexcept(false) { traceDestructor(TracePoint(Self::traceSource(), Self::destructorName)); }
 
     const CMPIBroker* const broker;
     const CMPIContext* const context;
     const std::string nameSpace;
     Data data;
+
+private:
+    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, const CMPIObjectPath* objectPath,
+                    const ParameterTraceScope&)
+        : broker(theBroker), context(theContext), nameSpace(ProviderUtilities::getNamespace(objectPath)) {
+        setObjectPath(objectPath);
+    }
 };
 
 } // namespace VK::BaseServerProvider

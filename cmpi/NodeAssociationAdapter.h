@@ -16,19 +16,9 @@ public:
     /// Throws InstrumentationException "Could not find instance" for an association path that names none, and what the
     /// data class throws for an end that is not there.
     NodeAssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath)
-        : Base(theBroker, context, objectPath) {
-        const ParameterTraceScope scope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=", theBroker,
-                                        " _context=", context, " objectPath=", objectPath);
-        traceVariable(TracePoint(Self::traceSource(), Self::adapterName), "requestedClassId", requestedClassId);
-        if (requestedClassId == ComputerSystemClassId) {
-            valid = narrow(partner, self().locatePartner(objectPath)) && partner;
-        } else if (requestedClassId == Self::partnerClassId) {
-            valid = narrow(computer, self().locateComputer(objectPath)) && computer;
-        } else if (requestedClassId == Self::associationClassId) {
-            if (!setObjectPath(objectPath)) throw InstrumentationException("Could not find instance");
-        }
-        // Meant: for any other class there is nothing to return, once.
-    }
+        : NodeAssociationAdapter(theBroker, context, objectPath,
+                                 ParameterTraceScope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=",
+                                                     theBroker, " _context=", context, " objectPath=", objectPath)) {}
 
     explicit operator bool() const {
         const TraceScope scope(Self::traceSource());
@@ -52,6 +42,9 @@ public:
         return *this;
     }
 
+    /// Whether a pair stands, as operator bool says it, but without a line.
+    bool hasPair() const { return valid; }
+
     /// Stands on the association that the path names, or for a path without keys on the first of all. False when there
     /// is none: a reference missing, the two not belonging together, no computer at all. A path that the broker refused
     /// on the way is no reason for that: true, and nothing to walk.
@@ -61,7 +54,9 @@ public:
     }
 
 protected:
-    ~NodeAssociationAdapter() { traceDestructor(TracePoint(Self::traceSource(), Self::destructorName)); }
+    ~NodeAssociationAdapter() noexcept(false) {
+        traceDestructor(TracePoint(Self::traceSource(), Self::destructorName));
+    }
 
     using Base::computer;
     using Base::narrow;
@@ -69,6 +64,21 @@ protected:
     using Base::requestedClassId;
 
 private:
+    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    NodeAssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath,
+                           const ParameterTraceScope&)
+        : Base(theBroker, context, objectPath) {
+        traceVariable(TracePoint(Self::traceSource(), Self::adapterName), "requestedClassId", requestedClassId);
+        if (requestedClassId == ComputerSystemClassId) {
+            valid = narrow(partner, self().locatePartner(objectPath)) && partner;
+        } else if (requestedClassId == Self::partnerClassId) {
+            valid = narrow(computer, self().locateComputer(objectPath)) && computer;
+        } else if (requestedClassId == Self::associationClassId) {
+            if (!setObjectPath(objectPath)) throw InstrumentationException("Could not find instance");
+        }
+        // Meant: for any other class there is nothing to return, once.
+    }
+
     Self& self() { return static_cast<Self&>(*this); }
 
     bool selectFirst() {

@@ -5,13 +5,13 @@
 
 namespace VK {
 
-/// Data is missing on the host.
-class InstrumentationException : public std::exception {
+/// What both exceptions of the provider are: a text.
+class TextException : public std::exception {
 public:
-    explicit InstrumentationException(const char* text) : message(text) {}
-    InstrumentationException(const InstrumentationException&) = default;
-    InstrumentationException& operator=(const InstrumentationException&) = delete;
-    ~InstrumentationException() override = default;
+    explicit TextException(const char* text) : message(text) {}
+    TextException(const TextException&) = default;
+    TextException& operator=(const TextException&) = delete;
+    ~TextException() override = default;
 
     const char* what() const noexcept override { return message.c_str(); }
 
@@ -19,18 +19,16 @@ private:
     std::string message;
 };
 
-/// A key that the caller had to give is missing.
-class FrameworkException : public std::exception {
+/// Data is missing on the host.
+class InstrumentationException : public TextException {
 public:
-    explicit FrameworkException(const char* text) : message(text) {}
-    FrameworkException(const FrameworkException&) = default;
-    FrameworkException& operator=(const FrameworkException&) = delete;
-    ~FrameworkException() override = default;
+    using TextException::TextException;
+};
 
-    const char* what() const noexcept override { return message.c_str(); }
-
-private:
-    std::string message;
+/// A key that the caller had to give is missing.
+class FrameworkException : public TextException {
+public:
+    using TextException::TextException;
 };
 
 } // namespace VK

@@ -1,19 +1,62 @@
 #include "include/Trace.h"
 
 #include <cxxabi.h>
+#include <pthread.h>
 
 #include <stdexcept>
 
 namespace VK {
 namespace {
 
-/// Runs a step whose exceptions must go nowhere: it stands in a destructor.
+/// What the C++ ABI keeps for each thread.
+struct ExceptionGlobals {
+    const void* caught;
+    unsigned int uncaught;
+};
+
+/// std::uncaught_exceptions() > 0 at a third of its price: this is asked at the end of every scope.
+bool isUnwinding() {
+    static thread_local const ExceptionGlobals* globals = nullptr;
+    if (globals == nullptr) globals = reinterpret_cast<const ExceptionGlobals*>(abi::__cxa_get_globals());
+    return globals->uncaught > 0;
+}
+
+/// Puts off a cancellation.
+class CancellationPutOff {
+public:
+    CancellationPutOff() { pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &before); }
+    ~CancellationPutOff() { pthread_setcancelstate(before, nullptr); }
+    CancellationPutOff(const CancellationPutOff&) = delete;
+    CancellationPutOff& operator=(const CancellationPutOff&) = delete;
+
+private:
+    int before = PTHREAD_CANCEL_ENABLE;
+};
+
+/// Runs a step whose exceptions must go nowhere: it stands in a destructor. Only a thread's end goes on, since the C
+/// library ends the process when it is swallowed. It is caught by a reference to no object, which is how the
+/// compiler's runtime has it.
 template <class Step>
-void swallowing(Step step) noexcept {
+__attribute__((no_sanitize("null"))) void swallowingAllButTheEnd(Step step) {
     try {
         step();
+    } catch (const abi::__forced_unwind&) {
+        throw;
     } catch (...) { // NOLINT(bugprone-empty-catch): a line that the logger refused is all that is lost
     }
+}
+
+/// The same while an exception unwinds: nothing else may leave a destructor then, so that a cancellation waits.
+template <class Step>
+__attribute__((noinline, cold)) void swallowingInUnwinding(Step step) {
+    const CancellationPutOff putOff;
+    swallowingAllButTheEnd(step);
+}
+
+template <class Step>
+void swallowing(Step step) {
+    if (__builtin_expect(isUnwinding(), false)) return swallowingInUnwinding(step);
+    swallowingAllButTheEnd(step);
 }
 
 void hand(const TracePoint& at, int level, const char* text) {
@@ -38,12 +81,12 @@ void writeMarker(const std::string& logger, const char* marker, unsigned int lin
 
 } // namespace
 
-void rethrowFromLogger() {
+__attribute__((no_sanitize("null"))) void rethrowFromLogger() {
     try {
         throw;
     } catch (const std::exception&) {
         throw;
-    } catch (abi::__forced_unwind&) { // a cancelled thread
+    } catch (const abi::__forced_unwind&) { // a cancelled thread
         throw;
     } catch (...) {
         throw std::runtime_error("The logger failed");
@@ -89,7 +132,7 @@ void traceVariable(const TracePoint& at, const char* name, unsigned int value, i
     hand(at, level, trace(name, at.source.file.data(), at.line, value));
 }
 
-void traceDestructor(const TracePoint& at) noexcept {
+void traceDestructor(const TracePoint& at) {
     swallowing([&] { writeLine(at, DebugLevel, METHOD_INVOKED); });
 }
 
@@ -97,15 +140,15 @@ TraceScope::TraceScope(const TracePoint& point, int entryLevel) : at(point) {
     writeLine(at, entryLevel, ENTERING);
 }
 
-TraceScope::~TraceScope() {
+TraceScope::~TraceScope() noexcept(false) {
     swallowing([&] { writeLine(at, DebugLevel, EXITING); });
 }
 
-DestructorTraceScope::DestructorTraceScope(const TracePoint& point) noexcept : at(point) {
+DestructorTraceScope::DestructorTraceScope(const TracePoint& point) : at(point) {
     swallowing([&] { writeLine(at, DebugLevel, ENTERING); });
 }
 
-DestructorTraceScope::~DestructorTraceScope() {
+DestructorTraceScope::~DestructorTraceScope() noexcept(false) {
     swallowing([&] { writeLine(at, DebugLevel, EXITING); });
 }
 
@@ -113,7 +156,7 @@ void ParameterTraceScope::enter() {
     writeLine(at, parameters, ENTERING);
 }
 
-ParameterTraceScope::~ParameterTraceScope() {
+ParameterTraceScope::~ParameterTraceScope() noexcept(false) {
     swallowing([&] { writeLine(at, parameters, EXITING); });
 }
 

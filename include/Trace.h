@@ -137,15 +137,19 @@ void traceMessage(const TracePoint& at, const char* message, int level);
 void traceVariable(const TracePoint& at, const char* name, const char* value, int level = DebugLevel);
 void traceVariable(const TracePoint& at, const char* name, unsigned int value, int level = DebugLevel);
 
-/// A METHOD line from a destructor: what the logger throws ends here.
-void traceDestructor(const TracePoint& at) noexcept;
+// --- Scopes. What the logger throws at a scope's end or in a destructor ends there. A thread that ends in the logger
+// --- (it is cancelled, or leaves by pthread_exit) is unwound from there all the same: so these destructors, and those
+// --- of classes that trace in theirs, are noexcept(false). While an exception unwinds, a cancellation waits for the
+// --- first chance after the line; leaving by pthread_exit ends the process then, as from any C++ destructor.
 
-/// The entry line now and the exit line when the scope ends, by return or by exception. What the logger throws at the
-/// exit ends there.
+/// A METHOD line from a destructor.
+void traceDestructor(const TracePoint& at);
+
+/// The entry line now and the exit line when the scope ends, by return or by exception.
 class TraceScope {
 public:
     explicit TraceScope(const TracePoint& point, int entryLevel = DebugLevel);
-    ~TraceScope();
+    ~TraceScope() noexcept(false);
     TraceScope(const TraceScope&) = delete;
     TraceScope& operator=(const TraceScope&) = delete;
 
@@ -156,8 +160,8 @@ private:
 /// The same for a destructor: what the logger throws at the entry ends there, too.
 class DestructorTraceScope {
 public:
-    explicit DestructorTraceScope(const TracePoint& point) noexcept;
-    ~DestructorTraceScope();
+    explicit DestructorTraceScope(const TracePoint& point);
+    ~DestructorTraceScope() noexcept(false);
     DestructorTraceScope(const DestructorTraceScope&) = delete;
     DestructorTraceScope& operator=(const DestructorTraceScope&) = delete;
 
@@ -176,7 +180,7 @@ public:
     } catch (...) {
         rethrowFromLogger();
     }
-    ~ParameterTraceScope();
+    ~ParameterTraceScope() noexcept(false);
     ParameterTraceScope(const ParameterTraceScope&) = delete;
     ParameterTraceScope& operator=(const ParameterTraceScope&) = delete;
 

@@ -9,7 +9,7 @@ namespace {
 
 struct Request {
     const CMPIContext* context;
-    const CMPIResult* result;
+    Answer& answer;
     const CMPIObjectPath* op;
     const char* assocClass;
     const char* resultClass;
@@ -36,13 +36,12 @@ void walk(const Request& request, Return returnCurrent) {
 
 template <class Adapter>
 void walkNames(const Request& request) {
-    walk<Adapter>(request, [&](Adapter& adapter) { returnPath(request.result, adapter.getAssociatorNames()); });
+    walk<Adapter>(request, [&](Adapter& adapter) { request.answer.add(adapter.getAssociatorNames()); });
 }
 
 template <class Adapter>
 void walkInstances(const Request& request) {
-    walk<Adapter>(request,
-                  [&](Adapter& adapter) { returnInstance(request.result, adapter.getAssociator(request.properties)); });
+    walk<Adapter>(request, [&](Adapter& adapter) { request.answer.add(adapter.getAssociator(request.properties)); });
 }
 
 struct AssociationRow {
@@ -95,13 +94,17 @@ CMPIStatus serve(const OperationFrame& frame, void (*AssociationRow::*column)(co
                 return;
             }
         }
-        closeResult(request.result);
+        request.answer.close();
     });
 }
 
 } // namespace
 
 bool getClassId(const char* className, const char* nameSpace, std::vector<unsigned short>& ids) {
+    if (className == nullptr || *className == '\0') { // no class in particular
+        for (const AssociationRow& associationRow : associationRows) ids.push_back(associationRow.classId);
+        return true;
+    }
     const unsigned short classId = ProviderUtilities::getClassId(className);
     if (classId != ProviderUtilities::CLASS_ID_UNKNOWN) {
         ids.push_back(classId);
@@ -119,15 +122,17 @@ bool getClassId(const char* className, const char* nameSpace, std::vector<unsign
 CMPIStatus BaseServer_AssociatorNames(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
                                       const CMPIObjectPath* op, const char* assocClass, const char* resultClass,
                                       const char*, const char*) {
-    return serve(OperationFrame(), &AssociationRow::associatorNames,
-                 {context, result, op, assocClass, resultClass, nullptr});
+    const OperationFrame frame;
+    Answer answer(frame, result);
+    return serve(frame, &AssociationRow::associatorNames, {context, answer, op, assocClass, resultClass, nullptr});
 }
 
 CMPIStatus BaseServer_Associators(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
                                   const CMPIObjectPath* op, const char* assocClass, const char* resultClass,
                                   const char*, const char*, const char** properties) {
-    return serve(OperationFrame(), &AssociationRow::associators,
-                 {context, result, op, assocClass, resultClass, properties});
+    const OperationFrame frame;
+    Answer answer(frame, result);
+    return serve(frame, &AssociationRow::associators, {context, answer, op, assocClass, resultClass, properties});
 }
 
 CMPIStatus BaseServer_References(CMPIAssociationMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,

@@ -54,7 +54,9 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext*, const CMPI
                                    const char* methodName, const CMPIArgs* in, CMPIArgs* out);
 
 /// The class identifiers that an association class stands for: its own, or those of the associations that the schema
-/// relates it to, in the order 33, 24, 162. False when there are none.
+/// relates it to, in the order 33, 24, 162. A null or empty name stands for all three: object managers that ask every
+/// association provider of a namespace give none, and an error would fail the others' answers. False when there are
+/// none.
 bool getClassId(const char* className, const char* nameSpace, std::vector<unsigned short>& ids);
 
 } // namespace VK::BaseServerProvider

@@ -12,42 +12,51 @@
 namespace VK::BaseServerProvider {
 namespace {
 
-struct Request {
-    const OperationFrame& frame;
-    const CMPIContext* context;
-    const CMPIResult* result;
-    const CMPIObjectPath* ref;
-    const char** properties;
-    unsigned short classId;
-};
-
-template <class Adapter>
-void walkNames(const Request& request, bool traceEachPath) {
-    Adapter adapter(broker, request.context, request.ref);
-    for (; adapter; ++adapter) {
-        if (traceEachPath) request.frame.traceClassId(request.classId);
-        returnPath(request.result, adapter.getObjectPath());
-    }
-}
-
-template <class Adapter>
-void walkInstances(const Request& request, bool) {
-    Adapter adapter(broker, request.context, request.ref);
-    for (; adapter; ++adapter) returnInstance(request.result, adapter.getCMPIInstance(request.properties));
-}
-
 /// What an operation does with a class.
 enum Service : unsigned {
     NotServed = 0,
     Open = 1,           ///< served; the result is not closed
     Done = 2,           ///< served; the result is closed with CMReturnDone
-    DoneTracingEach = 3 ///< the same, and 'classId' is traced for every path
+    DoneTracingEach = 3 ///< the same, and 'classId' is traced for every path that is returned
 };
+
+struct Request {
+    const OperationFrame& frame;
+    const CMPIContext* context;
+    Answer& answer;
+    const CMPIObjectPath* ref;
+    const char** properties;
+    unsigned short classId;
+    Service service;
+
+    /// To be called while the adapter stands: administrators read the lines of its end as the end of the answer.
+    void closeIfDone() const {
+        if (service != Open) answer.close();
+    }
+};
+
+template <class Adapter>
+void walkNames(const Request& request) {
+    Adapter adapter(broker, request.context, request.ref);
+    for (; adapter; ++adapter) {
+        const CMPIObjectPath* const path = adapter.getObjectPath();
+        if (path != nullptr && request.service == DoneTracingEach) request.frame.traceClassId(request.classId);
+        request.answer.add(path);
+    }
+    request.closeIfDone();
+}
+
+template <class Adapter>
+void walkInstances(const Request& request) {
+    Adapter adapter(broker, request.context, request.ref);
+    for (; adapter; ++adapter) request.answer.add(adapter.getCMPIInstance(request.properties));
+    request.closeIfDone();
+}
 
 struct ClassRow {
     unsigned short classId;
-    void (*names)(const Request&, bool);
-    void (*instances)(const Request&, bool);
+    void (*names)(const Request&);
+    void (*instances)(const Request&);
     Service enumInstanceNames;
     Service enumInstances;
     Service getInstance;
@@ -82,7 +91,7 @@ const ClassRow* findRow(unsigned short classId) {
 
 struct Column {
     Service ClassRow::*service;
-    void (*ClassRow::*walk)(const Request&, bool);
+    void (*ClassRow::*walk)(const Request&);
     bool traceUnserved; ///< whether 'classId' is traced once more for a class that is not served
 };
 
@@ -103,8 +112,8 @@ CMPIStatus serve(const OperationFrame& frame, const Column& column, const CMPICo
             status.rc = CMPI_RC_ERR_INVALID_CLASS;
             return;
         }
-        (classRow->*column.walk)({frame, context, result, ref, properties, classId}, service == DoneTracingEach);
-        if (service != Open) closeResult(result);
+        Answer answer(frame, result);
+        (classRow->*column.walk)({frame, context, answer, ref, properties, classId, service});
     });
 }
 

@@ -1,12 +1,14 @@
 #include "cmpi/CMPICIMServiceConfig.h"
 #include "cmpi/CMPITimeService.h"
 #include "provider/OperationFrame.h"
+#include "vk/CmpiSlots.h"
 #include "vk/ProviderUtilities.h"
 
 namespace VK::BaseServerProvider {
 namespace {
 
 struct Request {
+    const OperationFrame& frame;
     const CMPIContext* context;
     const CMPIResult* result;
     const CMPIObjectPath* ref;
@@ -18,7 +20,9 @@ struct Request {
 template <class Adapter>
 unsigned int invoke(const Request& request, const char* methodName) {
     Adapter adapter(broker, request.context, request.ref);
-    return adapter.invokeMethod(methodName, request.in, request.out, request.result);
+    const unsigned int rc = adapter.invokeMethod(methodName, request.in, request.out, request.result);
+    if (rc == 0) traceVariable(request.frame.here(), "returnCode", rc);
+    return rc;
 }
 
 struct MethodRow {
@@ -45,35 +49,32 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, co
                                    CMPIArgs* out) {
     const OperationFrame frame;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPIValue returnCode = {};
-    returnCode.uint32 = 0;
+    unsigned int returnCode = 0;
 
     const auto work = [&] {
         const MethodRow* const methodRow = findRow(ProviderUtilities::getClassId(ref));
         if (methodRow == nullptr) {
-            returnCode.uint32 = CMPI_RC_ERR_INVALID_CLASS;
+            returnCode = CMPI_RC_ERR_INVALID_CLASS;
             status.rc = CMPI_RC_ERR_INVALID_CLASS;
             return;
         }
-        const Request request = {context, result, ref, methodName, in, out};
+        const Request request = {frame, context, result, ref, methodName, in, out};
         const unsigned int rc =
             methodRow->invoke(request, methodRow->fixedName != nullptr ? methodRow->fixedName : methodName);
         if (rc != 0) {
-            returnCode.uint32 = rc;
+            returnCode = rc;
             status.rc = static_cast<CMPIrc>(rc); // meant: one number is both
-        } else {
-            traceVariable(frame.here(), "returnCode", returnCode.uint32);
         }
     };
     frame.run(work, [&](const std::exception& exception) {
         const CMPIBroker* const theBroker = broker;
         status.rc = CMPI_RC_ERR_FAILED;
-        status.msg = theBroker != nullptr ? CMNewString(theBroker, exception.what(), nullptr) : nullptr;
+        if (Cmpi::hasService(theBroker, &CMPIBrokerEncFT::newString))
+            status.msg = CMNewString(theBroker, exception.what(), nullptr);
     });
-    const CMPIStatus returned = CMReturnData(result, &returnCode, CMPI_uint32);
-    contained([&] { noteRefusal(frameSource, returned); });
-    const CMPIStatus closed = CMReturnDone(result);
-    contained([&] { noteRefusal(frameSource, closed); });
+    Answer answer(frame, result);
+    contained([&] { answer.add(returnCode); });
+    contained([&] { answer.close(); });
     return status; // meant: there is no exit marker here
 }
 

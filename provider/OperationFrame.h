@@ -6,9 +6,9 @@
 
 namespace VK::BaseServerProvider {
 
-/// Runs a step whose exceptions end here: what a logger throws never reaches the object manager.
+/// Runs a step whose exceptions end here: what a logger throws never reaches the object manager. A thread's end does.
 template <class Step>
-void contained(Step step) noexcept {
+void contained(Step step) {
     try {
         step();
     } catch (const std::exception&) { // NOLINT(bugprone-empty-catch): there is nobody left to tell
@@ -60,21 +60,26 @@ private:
     const char* const function;
 };
 
-/// Tells of a part of the answer that the object manager did not take. The rest is handed over all the same.
-inline void noteRefusal(const TracePoint& at, const CMPIStatus& status) {
-    if (status.rc != CMPI_RC_OK) traceMessage(at, "The object manager refused a part of the answer", FailureLevel);
-}
+/// An operation's answer on its way to the object manager. A part that is refused is logged in the operation's name;
+/// the rest is handed over all the same.
+class Answer {
+public:
+    Answer(const OperationFrame& theFrame, const CMPIResult* theResult) : frame(theFrame), result(theResult) {}
 
-/// Hand an adapter's answer to the object manager; a null, which stands for nothing, is not handed over.
-inline void returnPath(const CMPIResult* result, CMPIObjectPath* path) {
-    if (path != nullptr) noteRefusal(frameSource, CMReturnObjectPath(result, path));
-}
-inline void returnInstance(const CMPIResult* result, CMPIInstance* instance) {
-    if (instance != nullptr) noteRefusal(frameSource, CMReturnInstance(result, instance));
-}
-/// Says that the answer is whole.
-inline void closeResult(const CMPIResult* result) {
-    noteRefusal(frameSource, CMReturnDone(result));
-}
+    /// Hand over one element of an adapter; a null, which stands for nothing, is not handed over.
+    void add(const CMPIObjectPath* path);
+    void add(const CMPIInstance* instance);
+    /// Hands over a method's return value.
+    void add(unsigned int returnValue);
+    /// Says that the answer is whole. Some object managers refuse that where nothing was found: no line then.
+    void close();
+
+private:
+    void note(const CMPIStatus& status) const;
+
+    const OperationFrame& frame;
+    const CMPIResult* const result;
+    bool empty = true; ///< nothing was handed over
+};
 
 } // namespace VK::BaseServerProvider

@@ -1,5 +1,7 @@
 #include "objectmanager/broker/Fault.h"
 
+#include <utility>
+
 namespace om {
 
 #define OM_NAME(name) #name,
@@ -19,11 +21,12 @@ std::optional<FaultKind> faultKind(std::string_view name) {
     return std::nullopt;
 }
 
-FaultWatch::FaultWatch(const std::optional<Fault>& fault) : fault_(fault.value_or(Fault())) {
-    if (fault && current_ == nullptr) current_ = this;
+CallWatch::CallWatch(const std::optional<Fault>& fault, CallObserver observer)
+    : fault_(fault.value_or(Fault())), observer_(std::move(observer)) {
+    if ((fault || observer_) && current_ == nullptr) current_ = this;
 }
 
-FaultWatch::~FaultWatch() {
+CallWatch::~CallWatch() {
     if (current_ == this) current_ = nullptr;
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -52,20 +53,25 @@ struct Fault {
     bool unstated = false; ///< the status says OK, as some object managers leave it; not for slots that return it
 };
 
-/// The calls that count towards a fault: those that this thread's providers make while this lives. One within another
-/// changes nothing: a provider's call back is part of the operation.
-class FaultWatch {
+/// Is told of a call to the broker, by its slot's name, before it is done: so that a test can write it into the log
+/// between the provider's lines. Slots that never fail on request are not told of.
+using CallObserver = std::function<void(const std::string& slot)>;
+
+/// Watches the calls that this thread's providers make while it lives: counts those that may fail, and tells of them.
+/// One within another changes nothing: a provider's call back is part of the operation.
+class CallWatch {
 public:
-    explicit FaultWatch(const std::optional<Fault>& fault);
-    ~FaultWatch();
-    FaultWatch(const FaultWatch&) = delete;
-    FaultWatch& operator=(const FaultWatch&) = delete;
+    explicit CallWatch(const std::optional<Fault>& fault, CallObserver observer = {});
+    ~CallWatch();
+    CallWatch(const CallWatch&) = delete;
+    CallWatch& operator=(const CallWatch&) = delete;
 
-    /// The present thread's; null, as nearly always, when nothing is to fail.
-    static FaultWatch* current() { return current_; }
+    /// The present thread's; null, as nearly always, when there is nothing to watch for.
+    static CallWatch* current() { return current_; }
 
-    /// Counts one call; whether it is to fail.
+    /// Takes note of one call; whether it is to fail.
     bool fails(FaultKind kind) {
+        if (observer_) observer_(faultNames()[static_cast<std::size_t>(kind) - 1]);
         if (kind != fault_.kind) return false;
         ++calls_;
         const bool due = fault_.lasting ? calls_ >= fault_.call : calls_ == fault_.call;
@@ -78,9 +84,10 @@ public:
 
 private:
     // A plain pointer, so that it costs every call next to nothing and needs no destructor when a thread ends.
-    inline static thread_local FaultWatch* current_ = nullptr;
+    inline static thread_local CallWatch* current_ = nullptr;
 
     Fault fault_;
+    CallObserver observer_;
     std::size_t calls_ = 0;
     bool happened_ = false;
 };

@@ -161,7 +161,7 @@ invoke(Broker& broker, const Request& request, std::vector<ContextEntry> entries
         return answer;
     }
     Invocation invocation(broker, request, std::move(entries), answer);
-    FaultWatch watch(request.fault);
+    CallWatch watch(request.fault, request.onCall);
     try {
         const CMPIStatus answered = invocation.run(elapsed);
         answer.code = answered.rc;

@@ -58,7 +58,7 @@ public:
         report(out, CMPI_RC_OK);
         CMPIrc code = CMPI_RC_ERR_FAILED;
         if constexpr (Kind != FaultKind::None) {
-            FaultWatch* const watch = FaultWatch::current();
+            CallWatch* const watch = CallWatch::current();
             if (watch != nullptr && watch->fails(Kind)) {
                 if (!watch->unstated()) report(out, code);
                 return failed<R>(code);

@@ -94,7 +94,8 @@ private:
             ->capture_default_str()
             ->type_name("FORMAT")
             ->check(CLI::IsMember(&formats).description(""));
-        app.add_option("--assoc-class", arguments.assocClass, "For the association commands: the association's class")
+        app.add_option("--assoc-class", arguments.assocClass,
+                       "For the association commands: the association's class (all)")
             ->type_name("C");
         app.add_option("--result-class", arguments.resultClass, "For the association commands: the results' class")
             ->type_name("C");

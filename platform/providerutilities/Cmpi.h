@@ -1,5 +1,7 @@
 #pragma once
 
+#include "vk/CmpiSlots.h"
+
 #include <cmpidt.h>
 #include <cmpift.h>
 
@@ -19,17 +21,11 @@ constexpr bool succeeded(const CMPIStatus& status) {
     return status.rc == CMPI_RC_OK;
 }
 
-/// Whether an object is there and its broker offers the operation: hasSlot(path, &CMPIObjectPathFT::getKey). The
-/// tables' version numbers are not to be trusted.
-template <typename Object, typename Slot, typename Table>
-bool hasSlot(const Object* object, Slot Table::*slot) {
-    return object != nullptr && object->ft != nullptr && object->ft->*slot != nullptr;
-}
-
-/// The same for the broker's own factories and services.
-template <typename Slot>
-bool hasService(const CMPIBroker* broker, Slot CMPIBrokerEncFT::*slot) {
-    return broker != nullptr && broker->eft != nullptr && broker->eft->*slot != nullptr;
+/// Whether the broker made an object. A null is a failure, also where the status says OK: it does then no longer.
+template <typename Object>
+bool isMade(const Object* object, CMPIStatus& status) {
+    if (object == nullptr && succeeded(status)) status.rc = CMPI_RC_ERR_FAILED;
+    return succeeded(status);
 }
 
 /// Some brokers count a class's keys that the path does not have, and say so when asked for them.

@@ -25,8 +25,7 @@ CMPIString* makeString(const CMPIBroker* broker, const std::string& text, CMPISt
     if (!Cmpi::hasService(broker, &CMPIBrokerEncFT::newString)) return nullptr;
     status = Cmpi::freshStatus();
     CMPIString* const string = broker->eft->newString(broker, text.c_str(), &status);
-    if (string == nullptr && Cmpi::succeeded(status)) status.rc = CMPI_RC_ERR_FAILED;
-    return string;
+    return Cmpi::isMade(string, status) ? string : nullptr;
 }
 
 CMPIArray* makeArray(const CMPIBroker* broker, std::size_t size, CMPIType elementType, CMPIStatus& status) {
@@ -34,8 +33,7 @@ CMPIArray* makeArray(const CMPIBroker* broker, std::size_t size, CMPIType elemen
     if (!Cmpi::hasService(broker, &CMPIBrokerEncFT::newArray)) return nullptr;
     status = Cmpi::freshStatus();
     CMPIArray* const array = broker->eft->newArray(broker, static_cast<CMPICount>(size), elementType, &status);
-    if (array == nullptr && Cmpi::succeeded(status)) status.rc = CMPI_RC_ERR_FAILED;
-    return array;
+    return Cmpi::isMade(array, status) ? array : nullptr;
 }
 
 /// Sets an array property; `makeValue` turns an element into a value of that type, or fails its status.
@@ -73,7 +71,7 @@ bool setDateTime(const CMPIBroker* broker, CMPIInstance* instance, const char* n
         status = Cmpi::freshStatus();
         value.dateTime = broker->eft->newDateTimeFromChars(broker, text.c_str(), &status);
     }
-    if (value.dateTime == nullptr || !Cmpi::succeeded(status)) return refusedProperty(name, status);
+    if (!Cmpi::isMade(value.dateTime, status)) return refusedProperty(name, status);
     return set(instance, name, &value, CMPI_dateTime);
 }
 
@@ -83,7 +81,7 @@ CMPIInstance* ProviderUtilities::createInstance(const CMPIBroker* broker, CMPIOb
     if (objectPath == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newInstance)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();
     CMPIInstance* const instance = broker->eft->newInstance(broker, objectPath, &status);
-    if (instance != nullptr && Cmpi::succeeded(status)) return instance;
+    if (Cmpi::isMade(instance, status)) return instance;
     Cmpi::refused("createInstance", __LINE__, "an instance of the class", classOf(objectPath), status);
     return nullptr;
 }

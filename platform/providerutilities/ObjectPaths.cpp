@@ -18,7 +18,6 @@ CMPIData absent() {
 
 /// For brokers that compare key names by case, and for those that count keys which nobody set.
 CMPIData findKey(const CMPIObjectPath* path, const char* name) {
-    if (!Cmpi::hasSlot(path, &CMPIObjectPathFT::getKeyAt)) return absent();
     const unsigned int count = ProviderUtilities::getKeyCount(path);
     for (unsigned int i = 0; i < count; ++i) {
         CMPIStatus status = Cmpi::freshStatus();
@@ -34,13 +33,16 @@ CMPIData findKey(const CMPIObjectPath* path, const char* name) {
 }
 
 CMPIData getKey(const CMPIObjectPath* path, const char* name) {
-    if (name == nullptr) return absent();
+    if (path == nullptr || name == nullptr) return absent();
+    CMPIStatus status{CMPI_RC_ERR_NOT_SUPPORTED, nullptr}; // of a broker that offers no way of asking
     if (Cmpi::hasSlot(path, &CMPIObjectPathFT::getKey)) {
-        CMPIStatus status = Cmpi::freshStatus();
+        status = Cmpi::freshStatus();
         const CMPIData key = path->ft->getKey(path, name, &status);
         if (Cmpi::hasValue(key, status)) return key;
     }
-    return findKey(path, name);
+    if (Cmpi::hasSlot(path, &CMPIObjectPathFT::getKeyAt)) return findKey(path, name);
+    Cmpi::requireTold(status, keysOfPath);
+    return absent();
 }
 
 bool addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, CMPIType type) {
@@ -66,7 +68,7 @@ CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, co
     if (className == nullptr || !Cmpi::hasService(broker, &CMPIBrokerEncFT::newObjectPath)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();
     CMPIObjectPath* const path = broker->eft->newObjectPath(broker, nameSpace.c_str(), className, &status);
-    if (path != nullptr && Cmpi::succeeded(status)) return path;
+    if (Cmpi::isMade(path, status)) return path;
     Cmpi::refused("createObjectPath", __LINE__, "a path of the class", className, status);
     return nullptr;
 }

@@ -4,6 +4,7 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
@@ -254,6 +255,48 @@ TEST(ComputerSystem, LeavesTheOutputOfWhatTheHostCannotSupply) {
                               &ComputerSystem::getOtherDedicatedDescriptions})
         expectUntouched(system, getter, Texts{"before"});
     expectUntouched(system, &ComputerSystem::getAvailableRequestedStates, Numbers{77});
+}
+
+/// How often a step asks whether a node passes.
+long questionsOfAStep(ComputerSystem& system) {
+    test::takeLog();
+    ++system;
+    const std::vector<std::string> lines = test::takeLog();
+    return std::count_if(lines.begin(), lines.end(), [](const std::string& line) {
+        return line.find(" LOG ") != std::string::npos && line.find("ENTERING: evaluate()") != std::string::npos;
+    });
+}
+
+TEST(ComputerSystem, AsksWhetherANodePassesAtEveryStepAlsoWithoutFilters) {
+    simulateThree();
+    ComputerSystem unfiltered;
+    EXPECT_EQ(questionsOfAStep(unfiltered), 1);
+    EXPECT_EQ(questionsOfAStep(unfiltered), 1);
+    EXPECT_EQ(questionsOfAStep(unfiltered), 0) << "past the end there is nothing to ask of";
+    ComputerSystem filtered;
+    filtered.setFilter(Filter::Name, "node7");
+    EXPECT_EQ(questionsOfAStep(filtered), 1) << "the nameless one passes";
+    EXPECT_EQ(questionsOfAStep(filtered), 1) << "node8 does not";
+    EXPECT_FALSE(static_cast<bool>(filtered));
+}
+
+TEST(ComputerSystem, WritesNoLineForWhatTheHostCannotSupply) {
+    simulateThree();
+    const ComputerSystem system;
+    test::takeLog();
+    std::string text;
+    unsigned short number = 0;
+    Texts texts;
+    Numbers numbers;
+    EXPECT_FALSE(system.getCaption(text) || system.getInstallDate(text) || system.getOtherEnabledState(text) ||
+                 system.getTimeOfLastStateChange(text) || system.getNameFormat(text));
+    EXPECT_FALSE(system.getPrimaryStatus(number) || system.getDetailedStatus(number) ||
+                 system.getOperatingStatus(number) || system.getCommunicationStatus(number) ||
+                 system.getRequestedState(number) || system.getEnabledDefault(number) ||
+                 system.getTransitioningToState(number) || system.getResetCapability(number));
+    EXPECT_FALSE(system.getStatusDescriptions(texts) || system.getRoles(texts) ||
+                 system.getOtherDedicatedDescriptions(texts) || system.getAvailableRequestedStates(numbers));
+    EXPECT_THAT(test::takeLog(), IsEmpty());
 }
 
 } // namespace

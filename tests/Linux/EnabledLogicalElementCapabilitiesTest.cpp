@@ -102,4 +102,26 @@ TEST(EnabledLogicalElementCapabilities, SupplyNothingElse) {
     EXPECT_EQ(mask, "untouched");
 }
 
+TEST(EnabledLogicalElementCapabilities, AreAskedWhetherTheyPassAtEveryStepAlsoWithoutFilters) {
+    test::simulate({test::computer(0, "a"), test::computer(1, "b")});
+    EnabledLogicalElementCapabilities capabilities;
+    test::takeLog();
+    ++capabilities;
+    EXPECT_THAT(test::takeLog(), testing::Contains(testing::ContainsRegex(" LOG .*ENTERING: evaluate\\(\\)")).Times(1));
+    ++capabilities;
+    EXPECT_THAT(test::takeLog(), testing::Not(testing::Contains(testing::HasSubstr("evaluate"))));
+}
+
+TEST(EnabledLogicalElementCapabilities, WriteNoLineForWhatTheHostCannotSupply) {
+    test::simulate({test::computer(0, "node7")});
+    const EnabledLogicalElementCapabilities capabilities;
+    test::takeLog();
+    std::string text;
+    unsigned short number = 0;
+    std::vector<unsigned short> numbers;
+    EXPECT_FALSE(capabilities.getMaxElementNameLen(number) || capabilities.getRequestedStatesSupported(numbers) ||
+                 capabilities.getElementNameMask(text) || capabilities.getStateAwareness(numbers));
+    EXPECT_THAT(test::takeLog(), testing::IsEmpty());
+}
+
 } // namespace

@@ -160,4 +160,46 @@ TEST(PhysicalPackage, TracesItsDestructionAsAMethod) {
     EXPECT_THAT(test::withoutPlaces(test::takeLog()), testing::ElementsAre("LOG" + line, "TRACE" + line));
 }
 
+TEST(PhysicalPackage, IsAskedWhetherItPassesAtAStepOnlyOnceThereIsAFilter) {
+    test::simulate({test::computer(0, "node7"), test::chassis(0, 0, "A"), test::chassis(0, 1, "B"),
+                    test::chassis(0, 2, "A"), test::chassis(0, 3, "A")});
+    PhysicalPackage package;
+    const auto asked = Contains(testing::ContainsRegex(" LOG .*ENTERING: evaluate\\(\\)"));
+    test::takeLog();
+    ++package;
+    EXPECT_THAT(test::takeLog(), testing::Not(asked));
+    package.setFilter(PhysicalPackage::FilterType::TAG, "A");
+    test::takeLog();
+    ++package;
+    EXPECT_THAT(test::takeLog(), asked.Times(1));
+    package.initialize();
+    test::takeLog();
+    ++package;
+    EXPECT_THAT(test::takeLog(), testing::Not(asked));
+}
+
+TEST(PhysicalPackage, WritesNoLineForWhatTheHostCannotSupply) {
+    test::simulate({test::chassis(0, 0, "A")});
+    const PhysicalPackage package;
+    test::takeLog();
+    std::string text;
+    bool flag = false;
+    float length = 0;
+    unsigned short number = 0;
+    std::vector<std::string> texts;
+    std::vector<unsigned short> numbers;
+    EXPECT_FALSE(package.getCaption(text) || package.getInstallDate(text) || package.getName(text) ||
+                 package.getVersion(text) || package.getPartNumber(text) || package.getOtherIdentifyingInfo(text) ||
+                 package.getManufactureDate(text) || package.getVendorEquipmentType(text) ||
+                 package.getUserTracking(text) || package.getOtherPackageType(text));
+    EXPECT_FALSE(package.getHealthState(number) || package.getPrimaryStatus(number) ||
+                 package.getDetailedStatus(number) || package.getOperatingStatus(number) ||
+                 package.getCommunicationStatus(number) || package.getRemovalConditions(number));
+    EXPECT_FALSE(package.isPoweredOn(flag) || package.canBeFRUed(flag) || package.getHeight(length) ||
+                 package.getDepth(length) || package.getWidth(length) || package.getWeight(length));
+    EXPECT_FALSE(package.getOperationalStatus(numbers) || package.getStatusDescriptions(texts) ||
+                 package.getVendorCompatibilityStrings(texts));
+    EXPECT_THAT(test::takeLog(), testing::IsEmpty());
+}
+
 } // namespace

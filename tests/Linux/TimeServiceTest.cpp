@@ -69,12 +69,14 @@ TEST_F(TimeServiceTest, IsNamedAfterTheHost) {
     EXPECT_EQ(text, "VESKA_ComputerSystem");
 }
 
-TEST_F(TimeServiceTest, HasNoRegionAndLeavesTheArgumentUnchanged) {
+TEST_F(TimeServiceTest, HasNoRegionAndLeavesTheArgumentUnchangedWithoutALine) {
     TimeService service;
+    test::takeLog();
     std::string region = "before";
     EXPECT_FALSE(service.getRegion(region));
     EXPECT_EQ(region, "before");
     EXPECT_FALSE(service.setRegion("Europe"));
+    EXPECT_THAT(test::takeLog(), IsEmpty());
 }
 
 TEST_F(TimeServiceTest, TellsDaylightSavingByTheHostsNumber) {

@@ -208,6 +208,8 @@ TEST_F(CMPICIMServiceConfigTest, RefusesMissingArgumentsAndACountThatFails) {
     };
     const CMPIArgs failing = {arguments->hdl, &table};
     EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 4U);
+    table.getArgCount = nullptr;
+    EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 4U);
 }
 
 TEST_F(CMPICIMServiceConfigTest, CannotBeModified) {

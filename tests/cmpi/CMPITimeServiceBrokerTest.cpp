@@ -206,4 +206,84 @@ TEST_F(CMPITimeServiceBrokerTest, StandsOnOneElement) {
     EXPECT_FALSE(static_cast<bool>(adapter));
 }
 
+/// Arguments and a date-time whose slots can be taken away; those that are there ask the real ones.
+class WithoutSlots {
+public:
+    WithoutSlots(const CMPIBroker* broker, const CMPIArgs* arguments) {
+        realArguments = arguments;
+        realTime = CMNewDateTimeFromChars(broker, "20240101120000.000000+060", nullptr);
+        poorTime = &time;
+        argumentTable.getArgCount = [](const CMPIArgs*, CMPIStatus* status) {
+            return realArguments->ft->getArgCount(realArguments, status);
+        };
+        argumentTable.getArg = [](const CMPIArgs*, const char* name, CMPIStatus* status) {
+            CMPIData data = realArguments->ft->getArg(realArguments, name, status);
+            if (data.type == CMPI_dateTime) data.value.dateTime = poorTime;
+            return data;
+        };
+        timeTable.getStringFormat = [](const CMPIDateTime*, CMPIStatus* status) {
+            return realTime->ft->getStringFormat(realTime, status);
+        };
+        timeTable.getBinaryFormat = [](const CMPIDateTime*, CMPIStatus* status) {
+            return realTime->ft->getBinaryFormat(realTime, status);
+        };
+    }
+
+    CMPIArgsFT argumentTable = {};
+    CMPIDateTimeFT timeTable = {};
+    const CMPIArgs in = {this, &argumentTable};
+
+private:
+    inline static const CMPIArgs* realArguments = nullptr;
+    inline static CMPIDateTime* realTime = nullptr;
+    inline static CMPIDateTime* poorTime = nullptr;
+
+    CMPIDateTime time = {this, &timeTable};
+};
+
+TEST_F(CMPITimeServiceBrokerTest, FailsWhereTheBrokerLacksASlot) {
+    const CMPIArgs* const given = arguments(false);
+    WithoutSlots counting(real, given);
+    counting.argumentTable.getArgCount = nullptr;
+    EXPECT_EQ(invoke(&counting.in), 4U);
+    WithoutSlots reading(real, given);
+    reading.argumentTable.getArg = nullptr;
+    EXPECT_EQ(invoke(&reading.in), 4U);
+    WithoutSlots text(real, given);
+    text.timeTable.getStringFormat = nullptr;
+    EXPECT_EQ(invoke(&text.in), 1U);
+    WithoutSlots seconds(real, given);
+    seconds.timeTable.getBinaryFormat = nullptr;
+    EXPECT_EQ(invoke(&seconds.in), 1U);
+    expectUntouchedHost();
+    const WithoutSlots whole(real, given);
+    EXPECT_EQ(invoke(&whole.in), 0U) << "with all of them";
+}
+
+TEST_F(CMPITimeServiceBrokerTest, AnswersNoTimeWhereTheBrokerLacksASlot) {
+    const CMPIArgs* const in = arguments(true);
+    CMPIArgs* const usual = out;
+    CMPIArgsFT outTable = *usual->ft;
+    CMPIArgs poorOut = {usual->hdl, &outTable};
+    outTable.addArg = nullptr;
+    out = &poorOut;
+    EXPECT_EQ(invoke(in), 1U);
+    out = usual;
+
+    CMPIBrokerEncFT factories = *real->eft;
+    CMPIBroker poor = *real;
+    poor.eft = &factories;
+    broker = &poor;
+    factories.newDateTime = nullptr;
+    EXPECT_EQ(invoke(in), 1U);
+    factories.newString = nullptr; // of a text that stays in the provider
+    CMPIArgs* const withoutElement = CMNewArgs(real, nullptr);
+    CMPIValue get = {};
+    get.boolean = 1;
+    CMAddArg(withoutElement, "GetRequest", &get, CMPI_boolean);
+    CMAddArg(withoutElement, "ManagedElement", &get, CMPI_boolean);
+    EXPECT_EQ(invoke(withoutElement), 1U);
+    EXPECT_EQ(outCount(), 0U);
+}
+
 } // namespace

@@ -11,22 +11,28 @@
 #include <new>
 #include <pthread.h>
 #include <stdexcept>
+#include <vector>
 
 namespace {
 
 std::function<void()> logging;
+std::vector<const char*> logged; ///< the texts' own characters
+std::vector<const char*> traced;
 
 } // namespace
 
 namespace NVLog {
 
 void NVLogger::logLevelMessage(const char*, const char*, int, const std::string&, int, char*, int, int,
-                               const std::string&) {
+                               const std::string& text) {
+    logged.push_back(text.data());
     logging();
 }
 
 void NVLogger::traceLevelMessage(const char*, const char*, int, const std::string&, int, char*, int, int,
-                                 const std::string&) {}
+                                 const std::string& text) {
+    traced.push_back(text.data());
+}
 
 } // namespace NVLog
 
@@ -71,22 +77,117 @@ TEST(ThrowingLogger, IsNotHeardAtTheEndOfAScope) {
     }
 }
 
-void* leaveThread(void*) {
+/// Ends its thread, in either way. A cancellation that is put off stays pending.
+void leaveByExit() {
     static int answer = 0;
-    logging = [] { pthread_exit(&answer); };
-    VK::traceMethod(source);
-    return nullptr;
+    pthread_exit(&answer);
+}
+void leaveByCancellation() {
+    pthread_cancel(pthread_self());
+    pthread_testcancel();
 }
 
-TEST(ThrowingLogger, MayEndItsThread) {
-#ifdef __SANITIZE_ADDRESS__
-    GTEST_SKIP() << "what ends a thread is caught as a reference to nothing, which the sanitizers report";
-#endif
+/// Whether a thread that runs `lines` ends before it comes to their end, and what it owns is destroyed on the way.
+bool endsThread(const std::function<void()>& lines) {
+    struct Run {
+        const std::function<void()>& lines;
+        bool unwound = false;
+        bool wentOn = false;
+    } run{lines};
+    const auto start = [](void* argument) -> void* {
+        Run& all = *static_cast<Run*>(argument);
+        struct Owned {
+            bool& gone;
+            ~Owned() { gone = true; }
+        };
+        const Owned owned{all.unwound};
+        all.lines();
+        all.wentOn = true;
+        return nullptr;
+    };
+    logging = [] {};
     pthread_t thread{};
-    ASSERT_EQ(pthread_create(&thread, nullptr, leaveThread, nullptr), 0);
-    void* answer = nullptr;
-    ASSERT_EQ(pthread_join(thread, &answer), 0);
-    EXPECT_NE(answer, nullptr) << "the thread went on";
+    EXPECT_EQ(pthread_create(&thread, nullptr, start, &run), 0);
+    EXPECT_EQ(pthread_join(thread, nullptr), 0);
+    EXPECT_TRUE(run.unwound);
+    return !run.wentOn;
+}
+
+// A line is formatted once, and the same bytes are handed over twice.
+TEST(Logger, IsHandedTheSameTextTwice) {
+    logging = [] {};
+    logged.clear();
+    traced.clear();
+    {
+        const VK::ParameterTraceScope scope(source, " count=", 7U);
+        VK::traceVariable(source, "name", "a value that is longer than a short string is inside");
+        VK::traceMessage(source, "text", VK::FailureLevel);
+    }
+    EXPECT_EQ(logged.size(), 4U);
+    EXPECT_EQ(logged, traced);
+}
+
+class EndedThread : public testing::TestWithParam<void (*)()> {};
+
+TEST_P(EndedThread, IsUnwoundFromALine) {
+    EXPECT_TRUE(endsThread([] {
+        logging = GetParam();
+        VK::traceMethod(source);
+    }));
+}
+
+TEST_P(EndedThread, IsUnwoundFromTheEntryOfAScope) {
+    EXPECT_TRUE(endsThread([] {
+        logging = GetParam();
+        const VK::ParameterTraceScope scope(source, " count=", 7U);
+    }));
+    EXPECT_TRUE(endsThread([] {
+        logging = GetParam();
+        const VK::DestructorTraceScope scope(source);
+    }));
+}
+
+template <class Scope, class... Parameters>
+void leaveAtTheEnd(const Parameters&... parameters) {
+    const Scope scope(source, parameters...);
+    logging = [] {
+        const auto leave = EndedThread::GetParam();
+        logging = [] {};
+        leave();
+    };
+}
+
+TEST_P(EndedThread, IsUnwoundFromTheEndOfAScope) {
+    EXPECT_TRUE(endsThread([] { leaveAtTheEnd<VK::TraceScope>(); }));
+    EXPECT_TRUE(endsThread([] { leaveAtTheEnd<VK::ParameterTraceScope>(" count=", 7U); }));
+    EXPECT_TRUE(endsThread([] { leaveAtTheEnd<VK::DestructorTraceScope>(); }));
+}
+
+TEST_P(EndedThread, IsUnwoundFromADestructorsLine) {
+    EXPECT_TRUE(endsThread([] {
+        logging = GetParam();
+        VK::traceDestructor(source);
+    }));
+}
+
+INSTANTIATE_TEST_SUITE_P(, EndedThread, testing::Values(leaveByExit, leaveByCancellation),
+                         [](const auto& each) { return each.index == 0 ? "ByExit" : "ByCancellation"; });
+
+// Nothing but the exception can leave a destructor while it unwinds.
+TEST(CancelledThread, EndsAfterTheScopesThatAnExceptionLeaves) {
+    static bool caught = false;
+    EXPECT_TRUE(endsThread([] {
+        try {
+            const VK::TraceScope outer(source);
+            const VK::ParameterTraceScope inner(source, " count=", 7U);
+            logging = leaveByCancellation;
+            throw std::runtime_error("out");
+        } catch (const std::runtime_error&) {
+            caught = true;
+        }
+        pthread_testcancel();
+    }));
+    EXPECT_TRUE(caught);
 }
 
 } // namespace

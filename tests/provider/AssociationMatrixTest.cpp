@@ -29,7 +29,7 @@ enum Association {
 enum Source { Computer, Chassis, Capabilities, TimeService, Foreign };
 enum Keys { Keyless, Right, WrongValue, WrongName };
 enum ResultClass { None, Blank, Veska, Cim, OtherCase, Unrelated };
-enum Outcome { Nothing, TheComputer, TheChassis, TheCapabilities, TheTimeService };
+enum Outcome { Nothing, TheComputer, TheChassis, TheCapabilities, TheTimeService, Everything, AllButTheChassis };
 
 constexpr Association associations[] = {CapVeska,  CapCim,  PkgVeska, PkgCim, PkgBase, PkgBaseBase,
                                         TimeVeska, TimeCim, Unknown,  NotOne, Null,    Empty};
@@ -56,7 +56,40 @@ struct Group {
 };
 
 const std::vector<Group> groups = {
-    {"no such association", {Unknown, NotOne, Null, Empty}, {}, {}, {}, Nothing, CMPI_RC_ERR_INVALID_CLASS, open},
+    {"no such association", {Unknown, NotOne}, {}, {}, {}, Nothing, CMPI_RC_ERR_INVALID_CLASS, open},
+
+    // No class stands for all three. An end that is not found ends the request.
+    {"computer to all", {Null, Empty}, {Computer}, {Keyless, Right}, reachable, Everything, CMPI_RC_OK, closed},
+    {"computer to all but the chassis",
+     {Null, Empty},
+     {Computer},
+     {Keyless, Right},
+     {Unrelated},
+     AllButTheChassis,
+     CMPI_RC_OK,
+     closed},
+    {"unknown computer to all", {Null, Empty}, {Computer}, {WrongValue, WrongName}, {}, Nothing, CMPI_RC_OK, open},
+    {"chassis through all", {Null, Empty}, {Chassis}, {Keyless, Right}, reachable, TheComputer, CMPI_RC_OK, closed},
+    {"chassis through all to another class",
+     {Null, Empty},
+     {Chassis},
+     {Keyless, Right},
+     {Unrelated},
+     Nothing,
+     CMPI_RC_OK,
+     closed},
+    {"unknown chassis through all", {Null, Empty}, {Chassis}, {WrongValue, WrongName}, {}, Nothing, CMPI_RC_OK, open},
+    {"capabilities through all", {Null, Empty}, {Capabilities}, {Keyless, Right}, {}, TheComputer, CMPI_RC_OK, closed},
+    {"unknown capabilities through all",
+     {Null, Empty},
+     {Capabilities},
+     {WrongValue, WrongName},
+     {},
+     Nothing,
+     CMPI_RC_OK,
+     open},
+    {"time service through all", {Null, Empty}, {TimeService}, {}, {}, TheComputer, CMPI_RC_OK, closed},
+    {"others through all", {Null, Empty}, {Foreign}, {}, {}, Nothing, CMPI_RC_OK, closed},
 
     // The result class is only looked at by the package association.
     {"computer to capabilities",
@@ -230,6 +263,15 @@ std::optional<std::string> nameOf(ResultClass resultClass, const std::string& ot
     throw std::logic_error("result class");
 }
 
+std::vector<std::string> expectedPaths(Outcome outcome);
+
+std::vector<std::string> expectedPaths(const std::vector<Outcome>& outcomes) {
+    std::vector<std::string> all;
+    for (const Outcome each : outcomes)
+        for (const std::string& path : expectedPaths(each)) all.push_back(path);
+    return all;
+}
+
 std::vector<std::string> expectedPaths(Outcome outcome) {
     const std::string host = hostName();
     switch (outcome) {
@@ -245,6 +287,10 @@ std::vector<std::string> expectedPaths(Outcome outcome) {
         return {"VESKA_TimeService.Name=\"TimeService@" + host +
                 "\",CreationClassName=\"VESKA_TimeService\",SystemName=\"" + host +
                 "\",SystemCreationClassName=\"VESKA_ComputerSystem\""};
+    case Everything:
+        return expectedPaths(std::vector{TheCapabilities, TheChassis, TheTimeService});
+    case AllButTheChassis:
+        return expectedPaths(std::vector{TheCapabilities, TheTimeService});
     }
     throw std::logic_error("outcome");
 }

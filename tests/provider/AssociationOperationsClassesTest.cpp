@@ -64,11 +64,14 @@ TEST_F(ClassResolution, AnswersSeveralNumbersInTheOrderOfTheTable) {
     EXPECT_THAT(resolve("Test_AnyAssociation"), ElementsAre(33, 24, 162));
 }
 
-TEST_F(ClassResolution, FindsNothingForUnrelatedUnknownOrMissingNames) {
+TEST_F(ClassResolution, FindsNothingForUnrelatedOrUnknownNames) {
     EXPECT_THAT(resolve("CIM_ComputerSystem"), IsEmpty());
     EXPECT_THAT(resolve("NoSuchClass"), IsEmpty());
-    EXPECT_THAT(resolve(""), IsEmpty());
-    EXPECT_THAT(resolve(nullptr), IsEmpty());
+}
+
+TEST_F(ClassResolution, TakesNoNameForAllAssociations) {
+    EXPECT_THAT(resolve(nullptr), ElementsAre(33, 24, 162));
+    EXPECT_THAT(resolve(""), ElementsAre(33, 24, 162));
 }
 
 TEST_F(ClassResolution, AppendsToWhatIsThere) {

@@ -78,6 +78,18 @@ TEST_F(AssociationOperations, TraceANullResultClassAsNull) {
     EXPECT_THAT(test::takeLog(), Contains(HasSubstr("VARIABLE: 'resultClass' has Value '(null)'")));
 }
 
+TEST_F(AssociationOperations, TraceAMissingAssociationClassAsNullTextsAre) {
+    for (const auto& [assocClass, traced] :
+         {std::pair<std::optional<std::string>, const char*>({}, "(null)"), {"", ""}}) {
+        test::takeLog();
+        test::associatorNames(node7, assocClass);
+        const std::vector<std::string> log = test::takeLog();
+        EXPECT_THAT(log, Contains(HasSubstr(std::string("VARIABLE: 'associationClass' has Value '") + traced + "'")));
+        EXPECT_THAT(log, Contains(HasSubstr("LOG 4000 Norvane.BaseServerProvider BaseServerProvider")).Times(5))
+            << "two classes and three times 'rcode'";
+    }
+}
+
 TEST_F(AssociationOperations, LogAnExceptionAndEndWithoutClosing) {
     test::takeLog();
     const om::Answer answer =

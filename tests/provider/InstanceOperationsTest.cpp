@@ -151,12 +151,12 @@ TEST(GetInstance, LogsEachStepOnceToEitherChannel) {
     const Events standing = around(adapter, "operator bool", around(data, "operator bool", {}));
     const std::string pathList = " objectPath=ADDRESS";
     const Events constructing =
-        around(data, "ComputerSystem", {}) +
         around(adapter, "CMPIComputerSystem",
-               around(adapter, "setObjectPath",
-                      Events{test::variable(adapter, "setObjectPath", "name", "node7")} +
-                          around(data, "setFilter", around(data, "evaluate", {}), " filterType=0 reference=node7"),
-                      pathList),
+               around(data, "ComputerSystem", {}) +
+                   around(adapter, "setObjectPath",
+                          Events{test::variable(adapter, "setObjectPath", "name", "node7")} +
+                              around(data, "setFilter", around(data, "evaluate", {}), " filterType=0 reference=node7"),
+                          pathList),
                " _broker=ADDRESS _context=ADDRESS" + pathList);
 
     Events reading =
@@ -282,6 +282,54 @@ TEST(GetInstance, LogsTheExceptionBetweenTheAdaptersEndAndTheExitMarker) {
         EXPECT_LT(at(test::method(std::string(owned).substr(1), owned)), at(message)) << owned;
     EXPECT_LT(at(test::exiting("ComputerSystem", "~ComputerSystem")), at(message));
     EXPECT_EQ(at(message) + 3, static_cast<std::ptrdiff_t>(events.size()));
+}
+
+std::string refusedPart(const std::string& operation) {
+    return test::event(6000, frame, operation,
+                       "MESSAGE [File: BaseServerProvider, Line: N]: The object manager refused a part of the answer");
+}
+
+TEST(RefusedParts, AreLoggedInTheNameOfTheOperationWhoseAnswerItIs) {
+    simulateOneComputer();
+    const struct {
+        Operation operation;
+        const char* name;
+        om::FaultKind part;
+        const char* className;
+    } refusals[] = {
+        {Operation::EnumInstanceNames, "BaseServer_EnumInstanceNames", om::FaultKind::returnObjectPath,
+         "VESKA_ComputerSystem"},
+        {Operation::EnumInstances, "BaseServer_EnumInstances", om::FaultKind::returnInstance, "VESKA_ComputerSystem"},
+        {Operation::GetInstance, "BaseServer_GetInstance", om::FaultKind::returnInstance, "VESKA_ComputerSystem"},
+        {Operation::Associators, "BaseServer_Associators", om::FaultKind::returnInstance, "VESKA_ComputerSystem"},
+        {Operation::AssociatorNames, "BaseServer_AssociatorNames", om::FaultKind::returnObjectPath,
+         "VESKA_ComputerSystem"},
+        {Operation::InvokeMethod, "BaseServer_InvokeMethod", om::FaultKind::returnData, "VESKA_TimeService"},
+    };
+    for (const auto& row : refusals)
+        for (const om::FaultKind kind : {row.part, om::FaultKind::returnDone}) {
+            om::Request request;
+            request.operation = row.operation;
+            request.path = test::path(row.className);
+            request.assocClass = "VESKA_ComputerCapabilities";
+            request.fault = om::Fault{kind};
+            test::takeLog();
+            test::provider().run(request);
+            EXPECT_THAT(test::events(test::takeLog()), testing::Contains(refusedPart(row.name)).Times(1)) << row.name;
+        }
+}
+
+TEST(RefusedParts, AreNoneWhereNothingWasFoundAndTheResultCannotBeClosed) {
+    simulateOneComputer();
+    om::Request request;
+    request.operation = Operation::GetInstance;
+    request.path = test::path("VESKA_ComputerSystem", {{"Name", "other"}});
+    request.fault = om::Fault{om::FaultKind::returnDone};
+    test::takeLog();
+    const om::Answer answer = test::provider().run(request);
+    EXPECT_EQ(answer.code, CMPI_RC_OK);
+    EXPECT_TRUE(answer.faulted) << "it was tried";
+    EXPECT_THAT(test::takeLog(), Not(testing::Contains(testing::HasSubstr("refused a part of the answer"))));
 }
 
 TEST(ModifyInstance, IsNotSupportedForAnyClassButTheTimeService) {

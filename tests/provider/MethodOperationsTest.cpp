@@ -155,6 +155,23 @@ TEST_F(InvokeMethodException, BecomesFailedWithItsText) {
     EXPECT_THAT(log, Not(Contains(HasSubstr("markProviderExit"))));
 }
 
+TEST_F(InvokeMethodException, IsOneLineAtTheLevelOfNotices) {
+    test::takeLog();
+    run(test::provider().broker());
+    EXPECT_THAT(test::withoutPlaces(test::takeLog()), Contains(HasSubstr("Could not find instance")).Times(2))
+        << "one in each channel";
+}
+
+TEST_F(InvokeMethodException, HasNoMessageWhereTheBrokerMakesNoTexts) {
+    CMPIBroker poor = *test::provider().broker();
+    CMPIBrokerEncFT factories = *poor.eft;
+    factories.newString = nullptr;
+    poor.eft = &factories;
+    const CMPIStatus status = run(&poor);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(status.msg, nullptr);
+}
+
 TEST_F(InvokeMethodException, HasNoMessageWithoutABroker) {
     const CMPIStatus status = run(nullptr);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);

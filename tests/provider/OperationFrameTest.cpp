@@ -87,11 +87,65 @@ TEST(OperationFrame, IsNamedAfterTheFunctionThatMakesIt) {
     EXPECT_THAT(takeEvents(), ElementsAre(test::method(file, "TestBody")));
 }
 
-TEST(ReturnedObjects, AreNeverNull) {
-    // A result without slots would crash if it were called.
-    const CMPIResult result = {};
-    returnPath(&result, nullptr);
-    returnInstance(&result, nullptr);
+/// A result that refuses, by its hdl: false for nothing, true for all.
+CMPIResultFT resultTable() {
+    CMPIResultFT table = {};
+    const auto refusal = [](const CMPIResult* result) {
+        return CMPIStatus{*static_cast<const bool*>(result->hdl) ? CMPI_RC_ERR_FAILED : CMPI_RC_OK, nullptr};
+    };
+    static const auto answer = refusal;
+    table.returnObjectPath = [](const CMPIResult* result, const CMPIObjectPath*) { return answer(result); };
+    table.returnInstance = [](const CMPIResult* result, const CMPIInstance*) { return answer(result); };
+    table.returnData = [](const CMPIResult* result, const CMPIValue*, CMPIType) { return answer(result); };
+    table.returnDone = [](const CMPIResult* result) { return answer(result); };
+    return table;
+}
+
+class AnswerTest : public testing::Test {
+protected:
+    AnswerTest() { test::takeLog(); }
+
+    bool refusing = true;
+    CMPIResultFT table = resultTable();
+    const CMPIResult result = {&refusing, &table};
+    const OperationFrame frame{"Sample"};
+    Answer answer{frame, &result};
+    const CMPIObjectPath path = {};
+    const CMPIInstance instance = {};
+    const std::string refused =
+        test::event(6000, file, "Sample",
+                    "MESSAGE [File: BaseServerProvider, Line: N]: The object manager refused a part of the answer");
+};
+
+TEST_F(AnswerTest, LogsEachRefusedPartInTheOperationsName) {
+    answer.add(&path);
+    answer.add(&instance);
+    answer.add(7U);
+    answer.close();
+    EXPECT_THAT(takeEvents(), ElementsAre(refused, refused, refused, refused));
+}
+
+TEST_F(AnswerTest, WritesNoLineForWhatIsTaken) {
+    refusing = false;
+    answer.add(&path);
+    answer.close();
+    EXPECT_THAT(takeEvents(), testing::IsEmpty());
+}
+
+TEST_F(AnswerTest, WritesNoLineWhenAnEmptyOneMayNotBeClosed) {
+    answer.add(static_cast<const CMPIObjectPath*>(nullptr));
+    answer.add(static_cast<const CMPIInstance*>(nullptr));
+    answer.close();
+    EXPECT_THAT(takeEvents(), testing::IsEmpty());
+}
+
+TEST_F(AnswerTest, TakesAMissingSlotForARefusal) {
+    table = {};
+    answer.add(&path);
+    answer.add(&instance);
+    answer.add(7U);
+    answer.close();
+    EXPECT_THAT(takeEvents(), ElementsAre(refused, refused, refused, refused));
 }
 
 } // namespace

@@ -7,8 +7,18 @@
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 #include <unistd.h>
+#ifdef VK_COVERAGE
+extern "C" void __gcov_dump();
+#endif
 
 namespace test {
+
+/// Writes what a process has counted for coverage, which _exit would lose.
+inline void keepCoverage() {
+#ifdef VK_COVERAGE
+    __gcov_dump();
+#endif
+}
 
 /// Runs a part of a test in a process of its own, for what the libraries read once per process and for what changes the
 /// process. Its failures are printed there and fail the calling test.
@@ -23,6 +33,7 @@ inline void isolated(const std::function<void()>& body) {
             ADD_FAILURE() << "an exception came out: " << exception.what();
         }
         std::fflush(nullptr);
+        keepCoverage();
         _exit(testing::Test::HasFailure() ? 1 : 0); // the parent's objects are not the child's to destroy
     }
     int status = 0;

@@ -14,6 +14,7 @@ namespace {
 struct Asked {
     std::mutex mutex;
     std::vector<std::string> commands;
+    std::function<void(const std::string&, const std::string&)> told;
 };
 
 Asked& asked() {
@@ -21,9 +22,10 @@ Asked& asked() {
     return one;
 }
 
-void keep(const char* command) {
+void keep(const char* function, const char* command) {
     const std::lock_guard lock(asked().mutex);
     asked().commands.emplace_back(command);
+    if (asked().told) asked().told(function, command);
 }
 
 const char* outputOf(const char* command) {
@@ -35,7 +37,7 @@ const char* outputOf(const char* command) {
 } // namespace
 
 extern "C" FILE* popen(const char* command, const char*) {
-    keep(command);
+    keep("popen", command);
     const char* const output = outputOf(command);
     if (*output == '\0') return std::fopen("/dev/null", "re");
     return fmemopen(const_cast<char*>(output), std::strlen(output), "r"); // which only reads
@@ -46,7 +48,7 @@ extern "C" int pclose(FILE* stream) {
 }
 
 extern "C" int system(const char* command) {
-    if (command != nullptr) keep(command);
+    if (command != nullptr) keep("system", command);
     return 0;
 }
 
@@ -55,6 +57,11 @@ namespace test {
 std::vector<std::string> takeCommands() {
     const std::lock_guard lock(asked().mutex);
     return std::exchange(asked().commands, {});
+}
+
+void tellCommands(std::function<void(const std::string& function, const std::string& command)> told) {
+    const std::lock_guard lock(asked().mutex);
+    asked().told = std::move(told);
 }
 
 } // namespace test

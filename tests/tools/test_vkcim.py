@@ -1,5 +1,6 @@
 """vkcim as somebody at a terminal meets it: colours, completion in a shell, the examples of its help."""
 
+import json
 import os
 import pty
 import re
@@ -123,9 +124,14 @@ class Errors(unittest.TestCase):
         self.assertIn("did you mean VESKA_ComputerCapabilities?",
                       self.asked("associators", "VESKA_ComputerSystem", "--assoc-class", "VESKA_ComputerCapabilites"))
 
-    def test_tell_that_an_association_is_not_named(self):
-        self.assertIn("--assoc-class", self.asked("associator-names", "VESKA_ComputerSystem"))
-        self.assertNotIn("--assoc-class", self.asked("names", "Something_Else"))
+
+class Associators(unittest.TestCase):
+    def test_without_an_association_class_are_all_partners(self):
+        for command in ("associators", "associator-names"):
+            done = run(VKCIM, "--format", "json", command, "VESKA_ComputerSystem", env=HOST)
+            self.assertEqual(done.returncode, 0, done.stderr)
+            self.assertEqual([result["class"] for result in json.loads(done.stdout)["results"]],
+                             ["VESKA_EnabledLogicalElementCapabilities", "VESKA_PhysicalPackage", "VESKA_TimeService"])
 
 
 if __name__ == "__main__":

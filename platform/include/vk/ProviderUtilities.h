@@ -43,7 +43,7 @@ public:
 
     /// Reads a text or a reference key, its name without regard to case: true and the value, or false (no such key, of
     /// another type, or null) with `value` untouched. Throws std::runtime_error when the broker answers an error, other
-    /// than that the key is not there, to every way of asking.
+    /// than that the key is not there, to every way of asking that it offers, and when it offers none.
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, std::string& value);
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, CMPIObjectPath** value);
 

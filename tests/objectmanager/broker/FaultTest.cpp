@@ -25,7 +25,7 @@ TEST_F(FaultTest, KindsAreNamedAfterSlots) {
 }
 
 TEST_F(FaultTest, OneCallFailsAndNoOtherOne) {
-    FaultWatch watch(Fault{FaultKind::newString, 2});
+    CallWatch watch(Fault{FaultKind::newString, 2});
     EXPECT_EQ(textOf(string("one")), "one");
     EXPECT_FALSE(watch.happened());
     EXPECT_NE(path("A"), nullptr) << "another kind";
@@ -37,21 +37,21 @@ TEST_F(FaultTest, OneCallFailsAndNoOtherOne) {
 }
 
 TEST_F(FaultTest, ALastingOneGoesOn) {
-    const FaultWatch watch(Fault{FaultKind::newString, 2, true});
+    const CallWatch watch(Fault{FaultKind::newString, 2, true});
     EXPECT_NE(string("one"), nullptr);
     EXPECT_EQ(string("two"), nullptr);
     EXPECT_EQ(string("three"), nullptr);
 }
 
 TEST_F(FaultTest, AnUnstatedOneAnswersNullAndOK) {
-    const FaultWatch watch(Fault{FaultKind::newString, 1, false, true});
+    const CallWatch watch(Fault{FaultKind::newString, 1, false, true});
     EXPECT_EQ(string("one"), nullptr);
     EXPECT_EQ(rc.rc, CMPI_RC_OK);
 }
 
 TEST_F(FaultTest, WhatFailsIsNotDone) {
     CMPIObjectPath* const made = path("A");
-    const FaultWatch watch(Fault{FaultKind::addKey, 1, false, true});
+    const CallWatch watch(Fault{FaultKind::addKey, 1, false, true});
     EXPECT_EQ(made->ft->addKey(made, "Name", chars("x"), CMPI_chars).rc, CMPI_RC_ERR_FAILED)
         << "a status that is returned always tells";
     EXPECT_EQ(made->ft->getKeyCount(made, nullptr), 0u);
@@ -60,7 +60,7 @@ TEST_F(FaultTest, WhatFailsIsNotDone) {
 TEST_F(FaultTest, FailedDataIsNotThere) {
     CMPIObjectPath* const made = path("A");
     made->ft->addKey(made, "Name", chars("x"), CMPI_chars);
-    const FaultWatch watch(Fault{FaultKind::getKey, 1, true, true});
+    const CallWatch watch(Fault{FaultKind::getKey, 1, true, true});
     const CMPIData data = made->ft->getKey(made, "Name", &rc);
     EXPECT_EQ(data.state, CMPI_nullValue | CMPI_notFound);
     EXPECT_EQ(rc.rc, CMPI_RC_OK);
@@ -69,7 +69,7 @@ TEST_F(FaultTest, FailedDataIsNotThere) {
 TEST_F(FaultTest, SlotsOfOneNameCountTogether) {
     CMPIObjectPath* const made = path("A");
     const CMPIInstance* const one = instance("A");
-    const FaultWatch watch(Fault{FaultKind::clone, 2});
+    const CallWatch watch(Fault{FaultKind::clone, 2});
     CMPIObjectPath* const copy = made->ft->clone(made, &rc);
     ASSERT_NE(copy, nullptr);
     EXPECT_EQ(one->ft->clone(one, &rc), nullptr);
@@ -78,21 +78,41 @@ TEST_F(FaultTest, SlotsOfOneNameCountTogether) {
 
 TEST_F(FaultTest, ItEndsWithTheWatchAndStaysOnItsThread) {
     {
-        const FaultWatch watch(Fault{FaultKind::newString, 1, true});
-        const FaultWatch within(Fault{FaultKind::newArray, 1, true}); // of a call back: the outer one goes on
+        const CallWatch watch(Fault{FaultKind::newString, 1, true});
+        const CallWatch within(Fault{FaultKind::newArray, 1, true}); // of a call back: the outer one goes on
         EXPECT_EQ(string("one"), nullptr);
         EXPECT_NE(array(1, CMPI_uint16), nullptr);
         std::thread([this] { EXPECT_NE(broker->eft->newString(broker, "elsewhere", nullptr), nullptr); }).join();
     }
     EXPECT_NE(string("two"), nullptr);
-    const FaultWatch none{std::nullopt};
-    EXPECT_EQ(FaultWatch::current(), nullptr);
+    const CallWatch none{std::nullopt};
+    EXPECT_EQ(CallWatch::current(), nullptr);
+}
+
+TEST_F(FaultTest, AnObserverIsToldOfEachCallBeforeItIsDone) {
+    std::vector<std::string> calls;
+    CMPIObjectPath* made = nullptr;
+    const CallWatch watch(std::nullopt, [&](const std::string& slot) {
+        calls.push_back(slot + (slot == "addKey" ? std::to_string(made->ft->getKeyCount(made, nullptr)) : ""));
+    });
+    made = path("A");
+    made->ft->addKey(made, "Name", chars("x"), CMPI_chars);
+    made->ft->addKey(made, nullptr, chars("x"), CMPI_chars); // refused, and told of all the same
+    EXPECT_THAT(calls, testing::ElementsAre("newObjectPath", "getKeyCount", "addKey0", "getKeyCount", "addKey1"));
+}
+
+TEST_F(FaultTest, AnObserverIsToldOfACallThatFails) {
+    std::vector<std::string> calls;
+    const CallWatch watch(Fault{FaultKind::newString}, [&](const std::string& slot) { calls.push_back(slot); });
+    EXPECT_EQ(string("one"), nullptr);
+    EXPECT_NE(array(1, CMPI_uint16), nullptr);
+    EXPECT_THAT(calls, testing::ElementsAre("newString", "newArray"));
 }
 
 /// Whether a fault of that kind hits what `use` calls.
 template <class Use>
 bool hits(const char* name, Use use) {
-    FaultWatch watch(Fault{*faultKind(name)});
+    CallWatch watch(Fault{*faultKind(name)});
     use();
     return watch.happened();
 }

@@ -243,6 +243,9 @@ CMPIInstance* echoLink(const CMPIObjectPath* path, const char* operation, const 
 CMPIStatus associators(CMPIAssociationMI*, const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* path,
                        const char* assocClass, const char* resultClass, const char* role, const char* resultRole,
                        const char** list) {
+    bool answered = false;
+    const CMPIStatus error = trouble(path, answered);
+    if (answered) return error;
     result->ft->returnInstance(result, echoLink(path, "Associators", assocClass, resultClass, role, resultRole, list));
     return status(CMPI_RC_OK);
 }

@@ -112,6 +112,11 @@ TEST(VkcimOperations, AssociationOperationsGetTheirFilters) {
     EXPECT_EQ(answer({"reference-names", "Echo_Thing"}).at("results").at(0).at("path"), "Echo_Thing.Name=\"none\"");
 }
 
+TEST(VkcimOperations, AnInvalidClassMayBeAMissingAssociationClass) {
+    EXPECT_THAT(vkcim({"associators", "VESKA_ComputerSystem"}).error, testing::HasSubstr("--assoc-class"));
+    EXPECT_THAT(vkcim({"names", "VESKA_ComputerSystem"}).error, testing::Not(testing::HasSubstr("--assoc-class")));
+}
+
 TEST(VkcimOperations, InvokeAnswersReturnValueAndOutArguments) {
     const json all = answer({"invoke", "Echo_Thing", "Run", "When=datetime:20261121060000.123456+000", "X=null:uint32",
                              "Ref=ref:root/x:Echo_Thing.Name=\"a\"", "List=string[]:a\\,b,c"});

@@ -51,6 +51,12 @@ TEST_F(Instances, AreMadeOfAPath) {
     EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
     EXPECT_THAT(takeLog(), ElementsAre("LOG 6000 Norvane.ProviderUtilities The broker refused an instance of the class "
                                        "CIM_System, return code 6"));
+    fake.refusals = {};
+    fake.nullAnswers = {"newInstance"};
+    EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
+    EXPECT_THAT(takeLog(), ElementsAre("LOG 6000 Norvane.ProviderUtilities The broker refused an instance of the class "
+                                       "CIM_System, return code 1"))
+        << "failed, whatever the status says";
     fake.encapsulated.newInstance = nullptr;
     EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
 }
@@ -87,6 +93,7 @@ TEST_F(Instances, LeaveABadDateTimeUnset) {
     EXPECT_THAT(takeLog(), ElementsAre(REFUSED + "4", REFUSED + "4"));
     fake.nullAnswers = {"newDateTimeFromChars"};
     EXPECT_FALSE(setText("20240101110000.000000+000", true));
+    EXPECT_THAT(takeLog(), ElementsAre(REFUSED + "1")) << "failed, whatever the status says";
     fake.encapsulated.newDateTimeFromChars = nullptr;
     EXPECT_FALSE(setText("20240101110000.000000+000", true));
     EXPECT_EQ(contents(), "");

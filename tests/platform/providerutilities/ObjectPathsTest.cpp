@@ -86,7 +86,9 @@ TEST_F(ObjectPaths, AreNullWhereTheBrokerMakesNone) {
     fake.refusals = {};
     fake.nullAnswers = {"newObjectPath"};
     EXPECT_EQ(make(), nullptr);
-    EXPECT_EQ(takeLog().size(), 1U);
+    EXPECT_THAT(takeLog(), ElementsAre("LOG 6000 Norvane.ProviderUtilities The broker refused a path of the class "
+                                       "CIM_System, return code 1"))
+        << "failed, whatever the status says";
     fake.nullAnswers = {};
     fake.writesStatus = false;
     EXPECT_NE(make(), nullptr);
@@ -139,8 +141,21 @@ TEST_F(Keys, AreFoundAmongAllWhereTheBrokerFindsNone) {
     EXPECT_EQ(text("name"), "node7");
     fake.pathTable.getKey = nullptr;
     EXPECT_EQ(text("name"), "node7");
+}
+
+TEST_F(Keys, AreAbsentWhereTheOneWayOfAskingFindsNone) {
     fake.pathTable.getKeyAt = nullptr;
-    EXPECT_EQ(text("name"), "-");
+    EXPECT_EQ(text("Name"), "node7");
+    EXPECT_EQ(text("None"), "-");
+}
+
+TEST_F(Keys, AreNotTakenForAbsentWhereNoWayOfAskingIsLeft) {
+    fake.refusals = {{"getKey", CMPI_RC_ERR_FAILED}};
+    fake.pathTable.getKeyAt = nullptr;
+    EXPECT_THROW(text("Name"), std::runtime_error);
+    EXPECT_THROW(reference("System"), std::runtime_error);
+    fake.pathTable.getKey = nullptr;
+    EXPECT_THROW(text("Name"), std::runtime_error);
 }
 
 TEST_F(Keys, AreNotTakenForAbsentWhereTheBrokerCannotTellThem) {

@@ -1,0 +1,133 @@
+"""The copy of the checkout that is mutated, with a build tree of its own.
+
+It takes the checkout's place in a sandbox, so that a build tree copied with it goes on where it was. All else there is
+read-only, or in memory: whatever a mutant does with the host's files, clock, names or processes, it does to nothing.
+"""
+import fcntl
+import os
+import resource
+import shutil
+import signal
+import subprocess
+import tempfile
+
+from source import read, write
+
+BUILD = "build"
+# Mutants are built with warnings as errors, too; these are what a mistake brings with it.
+UNWARNED = ("unused-variable unused-but-set-variable unused-but-set-parameter unused-parameter unused-function unused-value "
+            "return-type conversion sign-compare type-limits tautological-compare bool-compare bool-operation "
+            "int-in-bool-context parentheses implicit-fallthrough empty-body maybe-uninitialized uninitialized array-bounds "
+            "stringop-overflow stringop-overread stringop-truncation restrict nonnull dangling-else misleading-indentation "
+            "shift-count-overflow overflow switch format-truncation format-overflow unused-local-typedefs infinite-recursion")
+PRAGMAS = " ".join(f'_Pragma("GCC diagnostic ignored \\"-W{warning}\\"")' for warning in UNWARNED.split())
+
+
+class Failure(Exception):
+    """The unchanged copy does not do what it should, or cannot be made."""
+
+
+class Workspace:
+    def __init__(self, root, folder, jobs):
+        self.root = root
+        self.tree = folder / "tree"
+        self.log = folder / "log"
+        self.jobs = jobs
+        self.tree.mkdir(parents=True, exist_ok=True)
+        self.lock = open(folder / "lock", "w", encoding="ascii")
+        try:
+            fcntl.flock(self.lock, fcntl.LOCK_EX | fcntl.LOCK_NB)
+        except OSError as error:
+            self.lock.close()
+            raise Failure(f"another run uses {folder}") from error
+
+    def take_over(self):
+        """Makes the copy's sources equal to the checkout's; what is equal already keeps its time."""
+        listed = subprocess.run(["git", "ls-files", "-z", "--cached", "--others", "--exclude-standard"], cwd=self.root,
+                                check=True, stdout=subprocess.PIPE).stdout.decode().split("\0")
+        wanted = {name for name in listed if name and (self.root / name).is_file()}
+        build = self.tree / BUILD
+        if not build.exists() and (self.root / BUILD / "build.ninja").is_file():
+            subprocess.run(["cp", "-a", "--reflink=auto", self.root / BUILD, build], check=True)
+        for name in wanted:
+            source, target = self.root / name, self.tree / name
+            if not target.is_file():
+                target.parent.mkdir(parents=True, exist_ok=True)
+                shutil.copy2(source, target)  # with its time: the build tree that came with it is up to date
+            elif target.read_bytes() != source.read_bytes():
+                shutil.copyfile(source, target)
+            shutil.copymode(source, target)
+        for top in [path for path in self.tree.iterdir() if path != build]:
+            for target in [top, *top.rglob("*")]:
+                if target.is_file() and str(target.relative_to(self.tree)) not in wanted:
+                    target.unlink()
+
+    def configure(self):
+        query = self.tree / BUILD / ".cmake/api/v1/query/codemodel-v2"
+        query.parent.mkdir(parents=True, exist_ok=True)
+        query.touch()
+        # A program is not linked again because a library's insides have changed.
+        command = ["cmake", "--preset", "release", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON"]
+        if self.logged(command) != 0:
+            raise Failure(f"the copy cannot be configured; see {self.log}")
+
+    def sandboxed(self, command):
+        return ["bwrap", "--ro-bind", "/", "/", "--dev", "/dev", "--proc", "/proc", "--tmpfs", "/tmp",
+                "--bind", self.tree, self.root, "--unshare-pid", "--unshare-ipc", "--unshare-uts", "--unshare-net",
+                "--cap-drop", "CAP_SYS_TIME", "--die-with-parent", "--chdir", self.root, "--", *command]
+
+    def logged(self, command):
+        with open(self.log, "w", encoding="utf-8") as log:
+            return subprocess.run(self.sandboxed(command), stdout=log, stderr=log, stdin=subprocess.DEVNULL, check=False,
+                                  env={**os.environ, "TMPDIR": "/tmp", "CCACHE_DISABLE": "1"}).returncode
+
+    def output(self, command):
+        return subprocess.run(self.sandboxed(command), check=True, stdout=subprocess.PIPE, stdin=subprocess.DEVNULL).stdout
+
+    def build(self, targets):
+        """None when the targets are built; else what went wrong."""
+        if self.logged(["cmake", "--build", BUILD, "-j", str(self.jobs), "--target", *targets]) == 0:
+            return None
+        said = self.log.read_text(errors="replace")
+        # A program that is built is asked for its tests at once.
+        return "cannot start" if "Error running test executable" in said else "does not compile"
+
+    def run(self, command, seconds, environment=None):
+        """The status and output of a command; a status of None when it did not end in time."""
+        with tempfile.TemporaryFile() as output:
+            child = subprocess.Popen(self.sandboxed(command), stdout=output, stderr=subprocess.STDOUT,
+                                     stdin=subprocess.DEVNULL, start_new_session=True, preexec_fn=limit,
+                                     env={**os.environ, "TMPDIR": "/tmp", **(environment or {})})
+            try:
+                status = child.wait(seconds)
+            except subprocess.TimeoutExpired:
+                status = None
+            finally:
+                if child.poll() is None:
+                    os.killpg(child.pid, signal.SIGKILL)
+                    child.wait()
+            output.seek(0)
+            return status, output.read().decode(errors="replace")
+
+    def mutated(self, mutant):
+        return Mutated(self.tree / mutant.file, mutant)
+
+
+def limit():
+    resource.setrlimit(resource.RLIMIT_FSIZE, (1 << 30, 1 << 30))  # a mutant that loops may log without end
+    resource.setrlimit(resource.RLIMIT_CORE, (0, 0))
+
+
+class Mutated:
+    """While it lasts, the mutant stands in the copy."""
+
+    def __init__(self, path, mutant):
+        self.path = path
+        self.mutant = mutant
+
+    def __enter__(self):
+        self.original = read(self.path)
+        write(self.path, f"{PRAGMAS}\n{self.mutant.apply(self.original)}")
+
+    def __exit__(self, *_):
+        write(self.path, self.original)

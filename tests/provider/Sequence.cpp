@@ -1,0 +1,66 @@
+#include "provider/Sequence.h"
+
+#include "nvlog/NVLogger.h"
+#include "provider/LogEvents.h"
+#include "support/NoCommands.h"
+#include "support/Provider.h"
+#include "support/SimulatedHost.h"
+
+#include <algorithm>
+
+namespace test {
+namespace {
+
+constexpr char brokerFile[] = "Broker";
+constexpr char shellFile[] = "Shell";
+constexpr char called[] = "called";
+constexpr char category[] = "Norvane.BaseServerProvider";
+
+/// The platform's libraries write to the log channel alone.
+bool isOfALibrary(const std::string& line) {
+    return line.find(std::string(" ") + category + " ") == std::string::npos;
+}
+
+/// Writes an event of its own into the log, as the provider writes its lines.
+void write(const char* file, const std::string& function, const std::string& text) {
+    NVLog::NVLogger::logLevelMessage(function.c_str(), file, 1, category, 4000, nullptr, 0, 0, text);
+    NVLog::NVLogger::traceLevelMessage(function.c_str(), file, 1, category, 4000, nullptr, 0, 0, text);
+}
+
+} // namespace
+
+std::vector<std::string> sequence(const om::Request& request, om::Answer* answer) {
+    om::Request watched = request;
+    watched.onCall = [](const std::string& slot) { write(brokerFile, slot, called); };
+    om::ObjectManager& manager = provider(); // loaded before the log is looked at
+    takeLog();
+    tellCommands([](const std::string& function, const std::string& asked) { write(shellFile, function, asked); });
+    om::Answer given = manager.run(watched);
+    tellCommands({});
+    if (answer != nullptr) *answer = std::move(given);
+    std::vector<std::string> lines = takeLog();
+    lines.erase(std::remove_if(lines.begin(), lines.end(), isOfALibrary), lines.end());
+    return events(lines);
+}
+
+std::string brokerCall(const std::string& slot) {
+    return event(4000, brokerFile, slot, called);
+}
+
+std::string command(const std::string& function, const std::string& command) {
+    return event(4000, shellFile, function, command);
+}
+
+std::optional<std::size_t> first(const std::vector<std::string>& events, const std::string& event) {
+    const auto found = std::find(events.begin(), events.end(), event);
+    if (found == events.end()) return std::nullopt;
+    return static_cast<std::size_t>(found - events.begin());
+}
+
+std::optional<std::size_t> last(const std::vector<std::string>& events, const std::string& event) {
+    const auto found = std::find(events.rbegin(), events.rend(), event);
+    if (found == events.rend()) return std::nullopt;
+    return static_cast<std::size_t>(events.rend() - found) - 1;
+}
+
+} // namespace test
