@@ -19,7 +19,7 @@ class Register(unittest.TestCase):
         self.root = folder()
 
     def register(self, *words, prefix=PREFIX, status=0, **more):
-        env = {"PATH": "/usr/sbin:/usr/bin:/sbin:/bin", "VK_REGISTER_ROOT": str(self.root), **more}
+        env = {"PATH": "/usr/sbin:/usr/bin:/sbin:/bin", "VK_REGISTER_PAUSE": "0", "VK_REGISTER_ROOT": str(self.root), **more}
         done = run(prefix / "sbin/vk-provider-register", *words, env=env)
         self.assertEqual(done.returncode, status, done.stdout + done.stderr)
         return done
