@@ -97,6 +97,7 @@ class Sfcb(Register):
             with self.subTest(harm):
                 self.root = folder()
                 manager = fakes.sfcb(self.root, up=True, without=[harm])
+                (self.root / "var/lib/sfcb/registration/providerRegister").write_text("[CIM_Default]\n", encoding="ascii")
                 manager.set("schema", "CIM_ManagedElement" if harm == "schema" else manager.get("schema"))
                 self.register("install", status=1)
                 self.assertEqual((manager.staged, manager.register, manager.up), ([], "[CIM_Default]\n", True))
@@ -106,13 +107,14 @@ class Sfcb(Register):
     def test_a_newer_version_that_fails_leaves_the_older_one_in_force(self):
         manager = fakes.sfcb(self.root, up=True)
         self.register("install")
-        before, register = [p.read_bytes() for p in self.root.rglob("stage/**/vk-*")], manager.register
+        (self.root / "var/lib/sfcb/registration/repository/root/cimv2/an_instance").touch()
+        before, register = snapshot_of(self.root / "var/lib/sfcb"), manager.register
         prefix = folder() / "p"
         shutil.copytree(PREFIX, prefix, symlinks=True)
         mof = prefix / "share/vk-baseserver/vk-baseserver.mof"
         mof.write_text(mof.read_text(encoding="utf-8").replace(": CIM_ManagedElement", ": CIM_Gone"), encoding="utf-8")
         self.assertIn("Failed compiling", self.register("install", prefix=prefix, status=1).stderr)
-        self.assertEqual([p.read_bytes() for p in self.root.rglob("stage/**/vk-*")], before)
+        self.assertEqual(snapshot_of(self.root / "var/lib/sfcb"), before)
         self.assertEqual((manager.register, manager.up), (register, True))
         self.register("status")
 

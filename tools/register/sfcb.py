@@ -3,6 +3,7 @@
 import contextlib
 import os
 import re
+import shutil
 from pathlib import Path
 
 from host import Failure, indented, match
@@ -114,8 +115,12 @@ class Sfcb(Manager):
     # Changing what it knows.
 
     def build(self, program, *words, done):
-        """Changes what is staged and builds the repository of it; if either fails, all is as before."""
-        older = {path: read(path) for path in self.staged if path.exists()}
+        """Changes what is staged and builds the repository of it. If either fails, all is as before: a build that fails
+        has put the repository aside, with instances that are nowhere else, and the next would drop them."""
+        older, kept = {path: read(path) for path in self.staged if path.exists()}, Path(f"{self.registration}.vk-older")
+        if not self.host.dry_run:
+            shutil.rmtree(kept, ignore_errors=True)
+            shutil.copytree(self.registration, kept, symlinks=True)
         try:
             self.run(program, "-n", self.product.namespace, *words, done=done)
             self.run("sfcbrepos", "-f", done="built the repository")
@@ -124,8 +129,12 @@ class Sfcb(Manager):
                 path.unlink(missing_ok=True)
                 if path in older:
                     path.write_bytes(older[path])
-            self.run("sfcbrepos", "-f", done="built the older repository again")
+            shutil.rmtree(self.registration)
+            kept.rename(self.registration)
+            self.host.say("put the older repository back")
             raise
+        finally:
+            shutil.rmtree(kept, ignore_errors=True)
 
     def install(self):
         link, flaw = self.link(), self.flaw()
