@@ -21,7 +21,10 @@ class OpenPegasus(CimServer):
                 raise Failure("the server does not answer after its start")
             yield
         finally:
-            self.run("cimserver", "-s", done="stopped the server again")
+            try:
+                self.run("cimserver", "-s", done="stopped the server again")
+            except Failure as failure:  # does not hide why the rest failed
+                self.host.fail(failure)
 
     def disable(self):
         """A provider that is busy is asked again; a module that refuses otherwise can still be removed."""

@@ -118,7 +118,7 @@ class Sfcb(Manager):
         """Changes what is staged and builds the repository of it. If either fails, all is as before: a build that fails
         has put the repository aside, with instances that are nowhere else, and the next would drop them."""
         older, kept = {path: read(path) for path in self.staged if path.exists()}, Path(f"{self.registration}.vk-older")
-        if not self.host.dry_run:
+        if not self.host.dry_run and self.registration.is_dir():
             shutil.rmtree(kept, ignore_errors=True)
             shutil.copytree(self.registration, kept, symlinks=True)
         try:
@@ -129,8 +129,9 @@ class Sfcb(Manager):
                 path.unlink(missing_ok=True)
                 if path in older:
                     path.write_bytes(older[path])
-            shutil.rmtree(self.registration)
-            kept.rename(self.registration)
+            shutil.rmtree(self.registration, ignore_errors=True)
+            if kept.is_dir():
+                kept.rename(self.registration)
             self.host.say("put the older repository back")
             raise
         finally:
