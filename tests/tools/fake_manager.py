@@ -4,8 +4,6 @@ they record what is asked of them, answer as the real ones do, and remember it b
 
 import os
 import re
-import shutil
-import subprocess
 import sys
 from pathlib import Path
 
@@ -78,7 +76,9 @@ def cimprovider():
         end(1, "Disabling provider module...\nFailed to disable provider module: Provider is busy.")
     if words[0] == "-r":
         (state / "module").unlink()
-        shutil.rmtree(state / "instances")
+        for file in state.glob("instances/*"):
+            file.unlink()
+        (state / "instances").rmdir()
         MODULES.write_text("")
     else:
         (state / "module").write_text(f"{module} {'OK' if words[0] == '-e' else 'Stopped'}")
@@ -159,10 +159,10 @@ def sfcbstage():
         return
     regs.mkdir(parents=True, exist_ok=True)
     mofs.mkdir(parents=True, exist_ok=True)
-    shutil.copy(words[3], regs)
-    with open(mofs / Path(words[4]).name, "wb") as staged:
-        if subprocess.call(f"sfcbmofpp '{words[4]}'", shell=True, stdout=staged):
-            end(1, error="Error: could not copy schema files")
+    (regs / Path(words[3]).name).write_bytes(Path(words[3]).read_bytes())
+    staged = mofs / Path(words[4]).name
+    if os.system(f"sfcbmofpp '{words[4]}' >'{staged}'"):
+        end(1, error="Error: could not copy schema files")
 
 
 def sfcbmofpp():
@@ -175,7 +175,7 @@ def sfcbrepos():
         end(0, f"-e \t-s specify staging directory [{home}/var/lib/sfcb/stage]\n-e \t-r specify repository directory "
                f"[{home}/var/lib/sfcb/registration]\n-e \t-c specify directory containing CIM Schema MOFs [{home}/usr/share/sfcb/CIM]")
     registration, stage = SFCB / "var/lib/sfcb/registration", SFCB / "var/lib/sfcb/stage"
-    shutil.rmtree(registration, ignore_errors=True)  # the older one is put aside first, and is of no use then
+    os.system(f"rm -rf '{registration}'")  # the older one is put aside first, and is of no use then
     (registration / "repository/root/cimv2").mkdir(parents=True)
     (registration / "providerRegister").write_text("[CIM_Default]\n" + "".join(f.read_text() for f in sorted(stage.glob("regs/*.reg"))))
     names = set(get("schema").split())
