@@ -256,6 +256,14 @@ class OpenPegasus(Register):
         self.assertEqual((manager.module, manager.classes), ("", []))
         self.assertFalse((self.root / "opt/wbem/lib" / LIBRARY).is_symlink())
 
+    def test_a_note_of_an_older_version_leads_to_the_server(self):
+        manager = self.elsewhere()
+        self.register("install", PEGASUS_HOME="/opt/wbem")
+        (self.root / "var/lib/vk/registration/openpegasus").write_text(
+            f"library-link: {self.root}/opt/wbem/lib/{LIBRARY}\nfiles: 1 2\nlibrary: 1 2 3\n", encoding="utf-8")
+        self.register("remove")
+        self.assertEqual((manager.module, manager.classes), ("", []))
+
     def test_a_named_folder_is_remembered(self):
         manager = fakes.pegasus(self.root, up=True)
         where = folder()

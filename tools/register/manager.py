@@ -12,6 +12,9 @@ class Manager:
     def __init__(self, host):
         self.host, self.product, self.noted = host, host.product, host.notes(self.name)
         self.folders = [folder for folder in self.noted.get("folders", "").split(":") if folder]
+        if not self.folders and "library-link" in self.noted:  # a note of an older version
+            home = os.path.dirname(os.path.dirname(self.noted["library-link"]))
+            self.folders = [f"{home}/sbin", f"{home}/bin"]
         self.command, self.env = {}, None
 
     def ask(self, program, *words):

@@ -81,7 +81,7 @@ class Sfcb(Manager):
         ports = [self.configured("httpPort", "5988")] * (self.configured("enableHttp", "true") == "true")
         ports += [self.configured("httpsPort", "5989")] * (self.configured("enableHttps", "false") == "true")
         sockets = b"".join(read(Path(f"{self.host.root}/proc/net/{kind}")) for kind in ("tcp", "tcp6")).decode()
-        return not ports or any(re.search(rf":{int(port):04X} \S+ 0A ", sockets) for port in ports)
+        return not ports or any(re.search(rf":{int(port):04X} \S+ 0A ", sockets) for port in ports if port.isdigit())
 
     def service(self):
         """The commands that stop and start the server; none where it does not run."""
@@ -102,8 +102,11 @@ class Sfcb(Manager):
         try:
             yield
         finally:
-            if stop_and_start:
-                self.steer(stop_and_start[1], done, lambda: self.processes() and self.listens())
+            try:
+                if stop_and_start:
+                    self.steer(stop_and_start[1], done, lambda: self.processes() and self.listens())
+            except Failure as failure:  # does not hide why the rest failed
+                self.host.fail(failure)
 
     def steer(self, command, done, reached):
         def act():
