@@ -231,18 +231,18 @@ class OpenPegasus(Register):
         self.assertIn("CIM_ERR_FAILED: cannot load library", done.stderr)
         self.assertEqual(manager.module, f"{MODULE} OK")
 
-    def elsewhere(self, up=True):
+    def elsewhere(self, up=True, home="opt/wbem"):
         manager = fakes.pegasus(self.root, up=up)
-        manager.move(manager.commands, "opt/wbem/bin")
-        (self.root / "opt/wbem/lib").mkdir()
+        manager.move(manager.commands, f"{home}/bin")
+        (self.root / home / "lib").mkdir()
         manager.set("providerDir", "lib")
-        manager.set("home", "opt/wbem")
+        manager.set("home", home)
         return manager
 
     def test_a_relative_folder_is_below_the_servers_own_home(self):
-        self.elsewhere()
-        self.register("install", PEGASUS_HOME="/opt/wbem")
-        self.assertTrue((self.root / "opt/wbem/lib" / LIBRARY).is_symlink())
+        self.elsewhere(home="opt/tog-pegasus")
+        self.register("install")
+        self.assertTrue((self.root / "opt/tog-pegasus/lib" / LIBRARY).is_symlink())
 
     def test_the_servers_place_is_remembered(self):
         manager = self.elsewhere(up=False)
