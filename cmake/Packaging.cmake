@@ -54,6 +54,7 @@ set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_PACKAGE_SECTION admin)
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_NAME vk-baseserver-provider)
+set(CPACK_DEBIAN_PROVIDER_PACKAGE_DEPENDS python3)
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_SUGGESTS "tzdata, procps")
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_CONTROL_EXTRA ${scripts}/debian/postinst ${scripts}/debian/prerm ${scripts}/debian/postrm
     ${CMAKE_SOURCE_DIR}/packaging/debian/shlibs ${CMAKE_SOURCE_DIR}/packaging/debian/triggers)

@@ -1,92 +1,110 @@
-"""Installations of object managers below a root that only record what is asked of them, and remember what real ones do."""
+"""Installations of object managers below a root: the commands of fake_manager.py, and a look at what they were asked."""
 
 import os
+import re
+import shutil
 from pathlib import Path
 
-_HEAD = """#!/bin/sh
-root=$(cd "$(dirname "$0")/../.." && pwd)
-echo "$(basename "$0") $*" >>"$root/calls"
-need_up() { [ -e "$root/state/up" ] || { echo "server not running" >&2; exit 1; }; }
-"""
-_PEGASUS = {
-    "cimserver": 'if [ "$1" = -s ]; then rm -f "$root/state/up"; else touch "$root/state/up"; fi',
-    "cimprovider": """need_up
-case $1 in
--l) cat "$root/state/modules" ;;
--r) grep -qx "$3" "$root/state/modules" || exit 1; : >"$root/state/modules" ;;
-esac""",
-    "cimmof": """need_up
-update=
-[ "$1" != -uC ] || { update=yes; shift; }
-[ -r "$3" ] || exit 1
-case $2 in
-root/PG_InterOp)
-    [ ! -s "$root/state/modules" ] || { echo "instance already exists" >&2; exit 1; }
-    sed -n '/PG_ProviderModule$/,/};/s/.*Name = "\\(VK[A-Za-z]*\\)".*/\\1/p' "$3" >"$root/state/modules" ;;
-*)
-    [ ! -s "$root/state/classes" ] || [ -n "$update" ] || { echo "class already exists" >&2; exit 1; }
-    sed -n 's/^class \\([A-Za-z_]*\\) .*/\\1/p' "$3" >"$root/state/classes" ;;
-esac""",
-    "cimcli": """need_up
-grep -qx "$4" "$root/state/classes" || exit 1
-sed -i "/^$4\\$/d" "$root/state/classes" """,
-    "cimconfig": """[ -e "$root/state/up" ] || { echo "... because the CIM server is not running."; exit 1; }
-echo "Current value: /usr/lib64/Pegasus/providers" """,
-}
-_SFCB = {
-    "sfcbd": "",
-    "sfcbstage": '[ ! -e "$root/state/up" ] || exit 1; [ -r "$4" ] && [ -r "$5" ] && touch "$root/state/staged"',
-    "sfcbunstage": '[ ! -e "$root/state/up" ] || exit 1; rm "$root/state/staged"',
-    "sfcbrepos": '[ ! -e "$root/state/up" ] || exit 1',
-    "systemctl": """case "$1 $2 $3" in
-"is-active --quiet sfcb") [ -e "$root/state/up" ] ;;
-"stop sfcb "*) rm "$root/state/up" ;;
-"start sfcb "*) touch "$root/state/up" ;;
-*) exit 3 ;;
-esac""",
-}
-_QUESTIONS = ("cimprovider -l", "cimconfig -g", "systemctl is-active")
+_COMMANDS = Path(__file__).with_name("fake_manager.py")
+_PEGASUS = ("cimserver", "cimprovider", "cimmof", "cimcli", "cimconfig")
+_SFCB = ("sfcbd", "sfcbstage", "sfcbunstage", "sfcbrepos", "sfcbmofpp", "systemctl")
+_QUESTIONS = re.compile("cimprovider -l|cimconfig -g|cimcli (gc|ei|ni)|systemctl is-active|sfcb(stage|repos) -h|sfcbmofpp")
+# What the classes derive from, as a CIM schema of version 2.22 has it.
+_SCHEMA = ("CIM_ManagedElement CIM_ComputerSystem CIM_PhysicalPackage CIM_EnabledLogicalElementCapabilities CIM_TimeService "
+           "CIM_ElementCapabilities CIM_ComputerSystemPackage CIM_ServiceAffectsElement")
 
 
 class Fake:
-    def __init__(self, root: Path, programs, up: bool, without=()):
+    def __init__(self, root: Path, programs, without, folders):
         self.root = root
-        (root / "state").mkdir(parents=True, exist_ok=True)
-        (root / "state/modules").touch()
-        if up:
-            (root / "state/up").touch()
-        (root / "usr/sbin").mkdir(parents=True, exist_ok=True)
-        (root / "usr/local/lib").mkdir(parents=True, exist_ok=True)
-        (root / "var/lib").mkdir(parents=True, exist_ok=True)
-        for name, body in programs.items():
+        for folder in ("state", "usr/sbin", "usr/local/lib", "var/lib", *folders):
+            (root / folder).mkdir(parents=True, exist_ok=True)
+        self.set("schema", _SCHEMA)
+        for name in programs:
             if name not in without:
-                self.program(name, body)
+                self.command(f"usr/sbin/{name}")
 
-    def program(self, name: str, body: str) -> None:
-        path = self.root / "usr/sbin" / name
-        path.write_text(_HEAD + body + "\n", encoding="ascii")
-        os.chmod(path, 0o755)
+    def command(self, place: str) -> None:
+        (self.root / place).parent.mkdir(parents=True, exist_ok=True)
+        shutil.copy(_COMMANDS, self.root / place)
+        os.chmod(self.root / place, 0o755)
+
+    def move(self, programs, place: str) -> None:
+        (self.root / place).mkdir(parents=True, exist_ok=True)
+        for name in programs:
+            (self.root / "usr/sbin" / name).rename(self.root / place / name)
+
+    def set(self, what: str, value) -> None:
+        (self.root / "state" / what).write_text(str(value), encoding="utf-8")
+
+    def get(self, what: str) -> str:
+        file = self.root / "state" / what
+        return file.read_text(encoding="utf-8") if file.exists() else ""
 
     def calls(self):
         """The commands since the last time that were no mere questions."""
         log = self.root / "calls"
         lines = log.read_text(encoding="utf-8").splitlines() if log.exists() else []
         log.write_text("", encoding="ascii")
-        return [line.strip() for line in lines if not line.startswith(_QUESTIONS)]
+        return [line.strip() for line in lines if not _QUESTIONS.match(line)]
+
+
+class Pegasus(Fake):
+    commands = _PEGASUS
 
     @property
     def up(self) -> bool:
         return (self.root / "state/up").exists()
 
+    @property
+    def module(self) -> str:
+        return self.get("module")
 
-def pegasus(root: Path, up: bool, without=()) -> Fake:
-    (root / "usr/lib64/Pegasus/providers").mkdir(parents=True)
-    return Fake(root, _PEGASUS, up, without)
+    @property
+    def classes(self):
+        return sorted(path.name for path in self.root.glob("state/classes/*"))
 
 
-def sfcb(root: Path, up: bool, without=()) -> Fake:
-    (root / "usr/lib64/cmpi").mkdir(parents=True)
-    (root / "etc/sfcb").mkdir(parents=True)
-    (root / "etc/sfcb/sfcb.cfg").write_text("httpPort: 5988\nproviderDirs: /usr/lib64/sfcb /usr/lib64/cmpi\n",
-                                            encoding="ascii")
-    return Fake(root, _SFCB, up, without)
+class Sfcb(Fake):
+    commands = _SFCB
+
+    @property
+    def up(self) -> bool:
+        return "(sfcbd)" in (self.root / "proc/42/stat").read_text(encoding="ascii")
+
+    def run_server(self, up: bool) -> None:
+        for folder in ("proc/42", "proc/net"):
+            (self.root / folder).mkdir(parents=True, exist_ok=True)
+        (self.root / "proc/42/stat").write_text(f"42 ({'sfcbd' if up else 'other'}) S 1 42 42", encoding="ascii")
+        (self.root / "proc/net/tcp").write_text("   0: 0100007F:1764 00000000:0000 0A \n" if up else "", encoding="ascii")
+
+    def without_systemd(self, script=True) -> None:
+        (self.root / "run/systemd/system").rmdir()
+        if script:
+            self.command("etc/init.d/sfcb")
+
+    @property
+    def staged(self):
+        return sorted(path.name for path in self.root.rglob("stage/**/vk-*"))
+
+    @property
+    def register(self) -> str:
+        return next(self.root.rglob("providerRegister")).read_text(encoding="utf-8")
+
+
+def pegasus(root: Path, up: bool, without=()) -> Pegasus:
+    repository = "var/lib/Pegasus/repository/root#PG_InterOp/instances"
+    fake = Pegasus(root, _PEGASUS, without, ["usr/lib64/Pegasus/providers", repository])
+    (root / repository / "PG_ProviderModule.instances").touch()
+    if up:
+        (root / "state/up").touch()
+    return fake
+
+
+def sfcb(root: Path, up: bool, without=()) -> Sfcb:
+    fake = Sfcb(root, _SFCB, without, ["usr/lib64/cmpi", "etc/sfcb", "run/systemd/system", "usr/share/sfcb/CIM/Core",
+                                       "var/lib/sfcb/registration", "var/lib/sfcb/stage/mofs"])
+    (root / "etc/sfcb/sfcb.cfg").write_text("httpPort: 5988\nproviderDirs: /usr/lib64/sfcb /usr/lib64/cmpi\n", encoding="ascii")
+    (root / "usr/share/sfcb/CIM/Core/CIM_TimeService.mof").write_text('[Version ( "2.22.0" )]\nclass CIM_TimeService\n', encoding="ascii")
+    fake.run_server(up)
+    return fake

@@ -1,6 +1,7 @@
 """What the tests of vk-provider-register share: an installation of the provider, and running the command from it."""
 
 import os
+import re
 import unittest
 
 from support import folder, install, run
@@ -9,9 +10,7 @@ PREFIX = folder() / "installed"
 install(PREFIX, component="provider")
 SHARE = PREFIX / "share/vk-baseserver"
 MODULE = "VKBaseServerModule"
-CLASSES = [f"VESKA_{name}" for name in (
-    "ComputerSystem", "PhysicalPackage", "EnabledLogicalElementCapabilities", "TimeService", "CIMServiceConfig",
-    "ComputerCapabilities", "ComputerSystemPackage", "TimeServiceAffectsElement")]
+CLASSES = re.findall(r"^class (\w+)", (SHARE / "vk-baseserver.mof").read_text(encoding="utf-8"), re.M)
 
 
 class Register(unittest.TestCase):
@@ -19,7 +18,7 @@ class Register(unittest.TestCase):
         self.root = folder()
 
     def register(self, *words, prefix=PREFIX, status=0, **more):
-        env = {"PATH": "/usr/sbin:/usr/bin:/sbin:/bin", "VK_REGISTER_ROOT": str(self.root), **more}
+        env = {"PATH": "/usr/sbin:/usr/bin:/sbin:/bin", "VK_REGISTER_PAUSE": "0", "VK_REGISTER_ROOT": str(self.root), **more}
         done = run(prefix / "sbin/vk-provider-register", *words, env=env)
         self.assertEqual(done.returncode, status, done.stdout + done.stderr)
         return done
