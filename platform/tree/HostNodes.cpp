@@ -2,8 +2,11 @@
 
 #include "common/Text.h"
 #include "host/State.h"
-#include "vk/NodeLexicon.h"
+#include "zone/Clock.h"
+#include "zone/ZoneChange.h"
 #include "zone/ZoneInForce.h"
+
+#include <climits>
 
 namespace VK::Tree {
 
@@ -37,11 +40,6 @@ struct ChassisRow {
     Told (*tell)(const ChassisView& view);
 };
 
-struct ChangingRow {
-    Lexicon::Properties property;
-    Told (*tell)(const Root& root);
-};
-
 constexpr ComputerRow COMPUTER[] = {
     {Lexicon::UUIDProperty, [](const Host::HardwareFacts& host) { return text(host.uuid); }},
     {Lexicon::SerialNumberProperty, [](const Host::HardwareFacts& host) { return text(host.serial); }},
@@ -50,18 +48,45 @@ constexpr ComputerRow COMPUTER[] = {
     {Lexicon::PrimaryOwnerNameProperty, [](const Host::HardwareFacts& host) { return text(host.ownerName); }},
 };
 
-constexpr ChangingRow COMPUTER_NOW[] = {
-    {Lexicon::NameProperty,
-     [](const Root& root) {
-         const std::optional<std::string> name = Host::hostName(root);
-         return name ? Told(*name) : std::nullopt;
-     }},
-    {Lexicon::PowerStateProperty, [](const Root& root) { return Told(Host::powerState(root)); }},
-    {Lexicon::GmtOffsetProperty,
-     [](const Root& root) { return Told(static_cast<unsigned int>(Zone::offsetInForce(root))); }},
-    {Lexicon::SystemTimeProperty, [](const Root& root) { return Told(Zone::systemTime(root)); }},
-    {Lexicon::AutomaticDSTAdjustmentProperty,
-     [](const Root& root) { return Told(Zone::hasDaylightSaving(root) ? 1U : 0U); }},
+/// Passes a number on; nothing for a text.
+template <typename Change>
+std::optional<bool> withNumber(const Value& value, unsigned int largest, Change change) {
+    const unsigned int* const number = std::get_if<unsigned int>(&value);
+    if (number == nullptr || *number > largest) return std::nullopt;
+    return change(*number);
+}
+
+constexpr ChangingProperty COMPUTER_NOW[] = {
+    {.number = Lexicon::NameProperty,
+     .read =
+         [](const Root& root) {
+             const std::optional<std::string> name = Host::hostName(root);
+             return name ? Told(*name) : std::nullopt;
+         }},
+    {.number = Lexicon::PowerStateProperty, .read = [](const Root& root) { return Told(Host::powerState(root)); }},
+    {.number = Lexicon::GmtOffsetProperty,
+     .read = [](const Root& root) { return Told(static_cast<unsigned int>(Zone::offsetInForce(root))); },
+     .change =
+         [](const Root& root, const Value& value) {
+             return withNumber(value, UINT_MAX, [&root](unsigned int minutes) {
+                 return Zone::changeOffset(root, static_cast<int>(minutes)); // two's complement
+             });
+         }},
+    {.number = Lexicon::SystemTimeProperty,
+     .read = [](const Root& root) { return Told(Zone::systemTime(root)); },
+     .change =
+         [](const Root& root, const Value& value) {
+             const std::string* const time = std::get_if<std::string>(&value);
+             return time != nullptr ? std::optional<bool>(Zone::changeClock(root, *time)) : std::nullopt;
+         },
+     .onLiveHostsOnly = true},
+    {.number = Lexicon::AutomaticDSTAdjustmentProperty,
+     .read = [](const Root& root) { return Told(Zone::hasDaylightSaving(root) ? 1U : 0U); },
+     .change =
+         [](const Root& root, const Value& value) {
+             return withNumber(value, 1,
+                               [&root](unsigned int on) { return Zone::changeDaylightSaving(root, on == 1); });
+         }},
 };
 
 constexpr ChassisRow CHASSIS[] = {
@@ -124,10 +149,11 @@ std::vector<Node> hostNodes(const Host::HardwareFacts& facts) {
     return nodes;
 }
 
-std::optional<Value> changingProperty(const Root& root, unsigned int property) {
-    for (const ChangingRow& row : COMPUTER_NOW)
-        if (row.property == property) return row.tell(root);
-    return std::nullopt;
+const ChangingProperty* changingProperty(const Node& node, unsigned int number) {
+    if (node.type != Lexicon::ComputerSystemNode) return nullptr;
+    for (const ChangingProperty& row : COMPUTER_NOW)
+        if (row.number == number) return &row;
+    return nullptr;
 }
 
 } // namespace VK::Tree

@@ -2,6 +2,8 @@
 
 #include "host/HardwareFacts.h"
 #include "tree/NodeTree.h"
+#include "vk/NodeLexicon.h"
+#include "vk/Root.h"
 
 #include <optional>
 #include <vector>
@@ -11,7 +13,16 @@ namespace VK::Tree {
 /// The nodes of a host, with the properties that never change: the computer system, then each chassis.
 std::vector<Node> hostNodes(const Host::HardwareFacts& facts);
 
-/// What one of the computer system's properties that may change holds now; nothing also for all others.
-std::optional<Value> changingProperty(const Root& root, unsigned int property);
+/// A property that may change at any time.
+struct ChangingProperty {
+    NodeLexicon::Properties number;
+    std::optional<Value> (*read)(const Root& root);
+    /// Changes it: what the change answers; nothing for a value that it cannot take. Null: read-only.
+    std::optional<bool> (*change)(const Root& root, const Value& value) = nullptr;
+    bool onLiveHostsOnly = false; ///< of a snapshot it is read-only
+};
+
+/// The node's changing property of that number; null where it has none.
+const ChangingProperty* changingProperty(const Node& node, unsigned int number);
 
 } // namespace VK::Tree

@@ -4,8 +4,6 @@
 #include "logger/LogLine.h"
 #include "tree/HostNodes.h"
 #include "vk/NodeLexicon.h"
-#include "zone/Clock.h"
-#include "zone/ZoneChange.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -56,35 +54,22 @@ const std::string& RealHost::problem() {
 std::optional<Value> RealHost::read(const Node& node, unsigned int property) {
     const auto found = node.properties.find(property);
     if (found != node.properties.end()) return found->second;
-    return node.type == NodeLexicon::ComputerSystemNode ? changingProperty(root, property) : std::nullopt;
+    const ChangingProperty* const changing = changingProperty(node, property);
+    return changing != nullptr ? changing->read(root) : std::nullopt;
 }
 
 bool RealHost::write(const Node& node, unsigned int property, const Value& value) {
-    const std::string* text = std::get_if<std::string>(&value);
-    const unsigned int* number = std::get_if<unsigned int>(&value);
-    if (node.type == NodeLexicon::ComputerSystemNode) {
-        if (property == NodeLexicon::SystemTimeProperty && text != nullptr) return Zone::changeClock(root, *text);
-        if (property == NodeLexicon::GmtOffsetProperty && number != nullptr)
-            return Zone::changeOffset(root, static_cast<int>(*number)); // two's complement
-        if (property == NodeLexicon::AutomaticDSTAdjustmentProperty && number != nullptr && *number <= 1)
-            return Zone::changeDaylightSaving(root, *number == 1);
-    }
+    const ChangingProperty* const changing = changingProperty(node, property);
+    if (changing != nullptr && changing->change != nullptr)
+        if (const std::optional<bool> changed = changing->change(root, value)) return *changed;
     logLine(FAILURE, "setProperty", __LINE__,
             "property " + std::to_string(property) + " of " + node.path + " cannot be written so");
     return false;
 }
 
 std::optional<bool> RealHost::isReadOnly(const Node& node, unsigned int property) {
-    if (node.type != NodeLexicon::ComputerSystemNode) return true;
-    switch (property) {
-    case NodeLexicon::SystemTimeProperty:
-        return !root.isLive();
-    case NodeLexicon::GmtOffsetProperty:
-    case NodeLexicon::AutomaticDSTAdjustmentProperty:
-        return false;
-    default:
-        return true;
-    }
+    const ChangingProperty* const changing = changingProperty(node, property);
+    return changing == nullptr || changing->change == nullptr || (changing->onLiveHostsOnly && !root.isLive());
 }
 
 unsigned int RealHost::status(const Node& node) {

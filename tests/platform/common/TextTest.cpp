@@ -8,13 +8,13 @@ namespace {
 
 using namespace std::literals;
 
-TEST(HostText, IsTrimmedAtBothEnds) {
+TEST(Text, IsTrimmedAtBothEnds) {
     EXPECT_EQ(trimmed(" \t a b \r\n\0"sv), "a b");
     EXPECT_EQ(trimmed(" \n "), "");
     EXPECT_EQ(trimmed(""), "");
 }
 
-TEST(HostText, OfTheFirmwareIsPrintableAscii) {
+TEST(Text, OfTheFirmwareIsPrintableAscii) {
     EXPECT_EQ(cleanText(" a\x01"
                         "b\x7F\x80\xFF~ "),
               "a.b...~");
@@ -22,7 +22,7 @@ TEST(HostText, OfTheFirmwareIsPrintableAscii) {
     EXPECT_EQ(cleanText(std::string(255, 'a') + " b"), std::string(255, 'a'));
 }
 
-TEST(HostText, ThatSomebodyWroteKeepsItsLetters) {
+TEST(Text, ThatSomebodyWroteKeepsItsLetters) {
     EXPECT_EQ(cleanWrittenText(" J\xC3\xA9r\xC3\xB4me \xE2\x82\xAC \xF0\x9F\x98\x80 "),
               "J\xC3\xA9r\xC3\xB4me \xE2\x82\xAC \xF0\x9F\x98\x80");
     EXPECT_EQ(cleanWrittenText("a\tb\x7F"
@@ -30,7 +30,7 @@ TEST(HostText, ThatSomebodyWroteKeepsItsLetters) {
               "a.b.c");
 }
 
-TEST(HostText, ThatIsNotUtf8BecomesAscii) {
+TEST(Text, ThatIsNotUtf8BecomesAscii) {
     for (const char* text : {"\xC3", "\xC3(", "\xC0\x80", "\xE0\x80\x80", "\xED\xA0\x80", "\xF0\x80\x80\x80",
                              "\xF4\x90\x80\x80", "\xF5\x80\x80\x80", "\x80", "\xE2\x82"}) {
         const std::string clean = cleanWrittenText("\xC3\xA9"s + text);
@@ -39,13 +39,13 @@ TEST(HostText, ThatIsNotUtf8BecomesAscii) {
     }
 }
 
-TEST(HostText, IsNeverCutInsideALetter) {
+TEST(Text, IsNeverCutInsideALetter) {
     std::string text;
     while (text.size() < 300) text += "\xE2\x82\xAC";
     EXPECT_EQ(cleanWrittenText(text), text.substr(0, 255));
 }
 
-TEST(HostText, EndsWithItsFirstLine) {
+TEST(Text, EndsWithItsFirstLine) {
     EXPECT_EQ(firstLine("a\nb"), "a");
     EXPECT_EQ(firstLine("a\r\nb"), "a");
     EXPECT_EQ(firstLine("a"), "a");
