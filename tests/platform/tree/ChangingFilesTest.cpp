@@ -109,7 +109,8 @@ TEST(ChangingFiles, OfTheZoneAreOneZoneOrUtc) {
     const std::string kolkata = host.read("usr/share/zoneinfo/Asia/Kolkata");
     const Churn churn({[&] { host.write("etc/localtime", kolkata); }, [&] { cut(zone, 50); }, [&] { cut(zone, 0); },
                        [&] { append(zone, kolkata); }, [&] { host.remove("etc/localtime"); },
-                       [&] { host.write("etc/localtime", Zone::makeZoneFile(-210)); }, [&] { host.remove("etc/localtime"); },
+                       [&] { host.write("etc/localtime", Zone::makeZoneFile(-210)); },
+                       [&] { host.remove("etc/localtime"); },
                        [&] { host.link("/usr/share/zoneinfo/Asia/Kolkata", "etc/localtime"); },
                        [&] { host.remove("etc/localtime"); }});
     churn.expectOnly<int>({0, 330, -210}, [&] { return Zone::offsetInForce(Root(host.path())); });
