@@ -13,7 +13,7 @@ namespace VK::Tree {
 struct TreeText {
     std::vector<Node> nodes;
     ProductOverrides product;
-    std::string problem; ///< why the text was refused, with the byte where that showed; empty when it was not
+    std::string problem; ///< why the text was refused and where (`nodes[3].status: ...`); empty when it was not
 };
 
 /// No consumer of a text sees what stands behind a zero byte: such a text does not go into a tree.

@@ -171,7 +171,7 @@ TEST(SimulatedHostLog, NamesABrokenFileOnce) {
     SimulatedHost host(directory.path("tree.json"));
     takeLog();
     for (int i = 0; i < 5; ++i) host.tree();
-    EXPECT_THAT(takeLog(), ElementsAre("6000 " + directory.path("tree.json") + ": node without \"type\" at byte 12"));
+    EXPECT_THAT(takeLog(), ElementsAre("6000 " + directory.path("tree.json") + ": nodes[0]: no \"type\""));
     directory.write("tree.json", "{\"nodes\":[]}");
     host.tree();
     EXPECT_THAT(takeLog(), ElementsAre());

@@ -63,50 +63,52 @@ TEST(TreeText, RefusesWhatIsNoTreeAndSaysWhere) {
         {"{", "not JSON at byte 2"},
         {"garbage", "not JSON at byte 1"},
         {"{\"nodes\":[]} x", "not JSON at byte 14"},
-        {"[]", "array where it does not belong at byte 1"},
-        {"7", "number where it does not belong"},
-        {"{}", "no \"nodes\" at byte 2"},
-        {"{\"nodes\":{}}", "object where it does not belong at byte 10"},
-        {"{\"nodes\":null}", "null where it does not belong at byte 13"},
-        {"{\"nodes\":[],\"nodes\":[]}", "key \"nodes\" is given twice at byte 19"},
-        {"{\"nodes\":[],\"extra\":1}", "unknown key \"extra\" at byte 19"},
-        {"{\"nodes\":[1]}", "number where it does not belong"},
-        {"{\"nodes\":[],\"product\":{\"kvm\":1}}", "number where it does not belong"},
-        {"{\"nodes\":[],\"product\":{\"kvm\":true,\"kvm\":true}}", "key \"kvm\" is given twice"},
-        {"{\"nodes\":[],\"product\":{\"path\":\"/\"}}", "unknown key \"path\""},
+        {"{\"nodes\":[1e999]}", "a number that is too large for JSON"},
+        {"[]", "array instead of an object"},
+        {"7", "number \"7\" instead of an object"},
+        {"{}", "no \"nodes\""},
+        {"{\"nodes\":{}}", "nodes: object instead of an array"},
+        {"{\"nodes\":null}", "nodes: null instead of an array"},
+        {"{\"nodes\":[],\"nodes\":[]}", "key \"nodes\" is given twice"},
+        {"{\"nodes\":[],\"extra\":1}", "unknown key \"extra\""},
+        {"{\"nodes\":[1]}", "nodes[0]: number \"1\" instead of an object"},
+        {"{\"nodes\":[],\"product\":{\"kvm\":1}}", "product.kvm: number \"1\" instead of true or false"},
+        {"{\"nodes\":[],\"product\":{\"kvm\":true,\"kvm\":true}}", "product: key \"kvm\" is given twice"},
+        {"{\"nodes\":[],\"product\":{\"path\":\"/\"}}", "product: unknown key \"path\""},
     };
     for (const Refused& each : refused) EXPECT_THAT(readTreeText(each.text).problem, StartsWith(each.problem));
 }
 
 TEST(TreeText, RefusesWhatIsNoNode) {
     const Refused refused[] = {
-        {",\"path\":\"/c\"", "key \"path\" is given twice"},
-        {",\"typ\":1", "unknown key \"typ\""},
-        {",\"nodes\":[]", "unknown key \"nodes\""},
-        {",\"status\":\"1\"", "text where it does not belong"},
-        {",\"status\":true", "true or false where it does not belong"},
-        {",\"status\":-1", "negative number -1"},
-        {",\"status\":1.0", "number \"1.0\" is not a whole one"},
-        {",\"status\":4294967296", "number 4294967296 is too large"},
-        {",\"status\":18446744073709551616", "number \"18446744073709551616\" is not a whole one or too large"},
-        {",\"parent\":1", "number where it does not belong"},
-        {",\"properties\":[]", "array where it does not belong"},
-        {",\"properties\":{\"1\":{}}", "object where it does not belong"},
-        {",\"properties\":{\"1\":null}", "null where it does not belong"},
-        {",\"properties\":{\"1\":true}", "true or false where it does not belong"},
-        {",\"properties\":{\"1\":1,\"1\":2}", "property \"1\" is given twice"},
-        {",\"properties\":{\"01\":1}", "property \"01\" is not a number in decimal"},
-        {",\"properties\":{\"\":1}", "property \"\" is not a number in decimal"},
-        {",\"properties\":{\"-1\":1}", "property \"-1\" is not a number in decimal"},
-        {",\"properties\":{\"0x10\":1}", "property \"0x10\" is not a number in decimal"},
-        {",\"properties\":{\"4294967296\":1}", "property \"4294967296\" is not a number in decimal"},
-        {",\"readOnly\":{}", "object where it does not belong"},
-        {",\"readOnly\":[[]]", "array where it does not belong"},
-        {",\"readOnly\":[\"108\"]", "text where it does not belong"},
-        {",\"failWrites\":[-108]", "negative number -108"},
-        {",\"description\":\"a\\u0000b\"", "text with a zero byte at byte "},
-        {",\"parent\":\"\\u0000\"", "text with a zero byte at byte "},
-        {",\"properties\":{\"108\":\"node7\\u0000\"}", "text with a zero byte at byte 66"},
+        {",\"path\":\"/c\"", "nodes[0]: key \"path\" is given twice"},
+        {",\"typ\":1", "nodes[0]: unknown key \"typ\""},
+        {",\"nodes\":[]", "nodes[0]: unknown key \"nodes\""},
+        {",\"status\":\"1\"", "nodes[0].status: text instead of a whole number from 0 to 4294967295"},
+        {",\"status\":true", "nodes[0].status: true or false instead of a whole number"},
+        {",\"status\":-1", "nodes[0].status: number \"-1\" instead of a whole number"},
+        {",\"status\":1.0", "nodes[0].status: number \"1.0\" instead of a whole number"},
+        {",\"status\":4294967296", "nodes[0].status: number \"4294967296\" instead of a whole number"},
+        {",\"status\":18446744073709551616", "nodes[0].status: number \"1.8446744073709552e+19\" instead of"},
+        {",\"parent\":1", "nodes[0].parent: number \"1\" instead of a text"},
+        {",\"properties\":[]", "nodes[0].properties: array instead of an object"},
+        {",\"properties\":{\"1\":{}}", "nodes[0].properties.1: object instead of"},
+        {",\"properties\":{\"1\":null}", "nodes[0].properties.1: null instead of"},
+        {",\"properties\":{\"1\":true}", "nodes[0].properties.1: true or false instead of"},
+        {",\"properties\":{\"1\":1,\"1\":2}", "nodes[0].properties: key \"1\" is given twice"},
+        {",\"properties\":{\"01\":1}", "nodes[0].properties: property \"01\" is not a number in decimal"},
+        {",\"properties\":{\"\":1}", "nodes[0].properties: property \"\" is not a number in decimal"},
+        {",\"properties\":{\"-1\":1}", "nodes[0].properties: property \"-1\" is not a number in decimal"},
+        {",\"properties\":{\"+1\":1}", "nodes[0].properties: property \"+1\" is not a number in decimal"},
+        {",\"properties\":{\"0x10\":1}", "nodes[0].properties: property \"0x10\" is not a number in decimal"},
+        {",\"properties\":{\"4294967296\":1}", "nodes[0].properties: property \"4294967296\" is not a number"},
+        {",\"readOnly\":{}", "nodes[0].readOnly: object instead of an array"},
+        {",\"readOnly\":[[]]", "nodes[0].readOnly[0]: array instead of a whole number"},
+        {",\"readOnly\":[1,\"108\"]", "nodes[0].readOnly[1]: text instead of a whole number"},
+        {",\"failWrites\":[-108]", "nodes[0].failWrites[0]: number \"-108\" instead of a whole number"},
+        {",\"description\":\"a\\u0000b\"", "nodes[0].description: text with a zero byte"},
+        {",\"parent\":\"\\u0000\"", "nodes[0].parent: text with a zero byte"},
+        {",\"properties\":{\"108\":\"node7\\u0000\"}", "nodes[0].properties.108: text with a zero byte"},
     };
     for (const Refused& each : refused) {
         EXPECT_THAT(readTreeText(node(each.text)).problem, StartsWith(each.problem)) << each.text;
@@ -115,16 +117,25 @@ TEST(TreeText, RefusesWhatIsNoNode) {
 }
 
 TEST(TreeText, RefusesNodesWithoutTypeOrPathAndPathsGivenTwice) {
-    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1}]})").problem, "node without \"path\" at byte 20");
-    EXPECT_EQ(readTreeText(R"({"nodes":[{"path":"/"}]})").problem, "node without \"type\" at byte 22");
-    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":"/\u0000"}]})").problem, "text with a zero byte at byte 36");
-    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":""}]})").problem, "empty path at byte 29");
+    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1}]})").problem, "nodes[0]: no \"path\"");
+    EXPECT_EQ(readTreeText(R"({"nodes":[{"path":"/"}]})").problem, "nodes[0]: no \"type\"");
+    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":"/\u0000"}]})").problem,
+              "nodes[0].path: text with a zero byte");
+    EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":""}]})").problem, "nodes[0].path: empty path");
     EXPECT_EQ(readTreeText(R"({"nodes":[{"type":1,"path":"/a"},{"type":2,"path":"/a"}]})").problem,
-              "path \"/a\" is given twice at byte 54");
+              "nodes[1].path: path \"/a\" is given twice");
+}
+
+TEST(TreeText, NamesTheObjectThatHasAKeyTwice) {
+    EXPECT_EQ(
+        readTreeText(R"({"nodes":[{"type":1,"path":"/a","readOnly":[1,2]},{"type":2,"path":"/b","type":2}]})").problem,
+        "nodes[1]: key \"type\" is given twice");
 }
 
 TEST(TreeText, DoesNotChokeOnDeepNesting) {
-    EXPECT_THAT(readTreeText(std::string(1 << 20, '[')).problem, StartsWith("array where it does not belong"));
+    EXPECT_THAT(readTreeText(std::string(1 << 20, '[')).problem, StartsWith("not JSON at byte "));
+    const std::string nested = std::string(1 << 18, '[') + std::string(1 << 18, ']');
+    EXPECT_EQ(readTreeText(nested).problem, "array instead of an object");
 }
 
 TEST(TreeText, ChangesOnePropertyAndNothingElse) {
