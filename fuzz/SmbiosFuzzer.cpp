@@ -9,6 +9,7 @@
 namespace {
 
 using namespace VK;
+using namespace VK::Host;
 using fuzz::expect;
 
 /// An entry point of version 3 without a fault, so that the table's parser is reached whatever the table is.
