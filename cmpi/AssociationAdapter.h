@@ -87,9 +87,9 @@ protected:
     }
 
     /// A new path of `className`: keyless for a keyless path, else with the keys into which `resolve` turns those of
-    /// `objectPath`. Null for null, and when the broker refuses the path or one of its keys, which is logged: without
-    /// its keys it would name every element. What `resolve` throws passes; keys that the broker does not tell throw
-    /// InstrumentationException.
+    /// `objectPath`. Null for null, and when the broker refuses the path or one of its keys, which is logged, or drops
+    /// an empty one: without its keys it would name every element. What `resolve` throws passes; keys that the broker
+    /// does not tell throw InstrumentationException.
     template <class Resolve>
     CMPIObjectPath* locate(const char* className, const CMPIObjectPath* objectPath, Resolve resolve) const {
         if (objectPath == nullptr) return nullptr;
@@ -99,7 +99,8 @@ protected:
         const bool read = ProviderUtilities::transformObjectPathToMoniker(objectPath, moniker);
         resolve(moniker);
         if (!read) throw InstrumentationException("Could not make the path of the other end");
-        return ProviderUtilities::transformMonikerToObjectPath(moniker, &path) ? path : nullptr;
+        const bool whole = ProviderUtilities::transformMonikerToObjectPath(moniker, &path) && hasKey(path, moniker);
+        return whole ? path : nullptr;
     }
 
     /// Narrows the walk of an end by a path. False for the null of one that was refused: there is nothing to walk then,
@@ -120,6 +121,16 @@ protected:
     CMPIComputerSystem computer;
 
 private:
+    /// Whether the path has the one key that its moniker has. Object managers that take an empty text for a key that is
+    /// not there drop it without a word.
+    static bool hasKey(const CMPIObjectPath* path, const Moniker& moniker) {
+        std::string name;
+        std::string value;
+        moniker.getName(name);
+        moniker.getValue(value);
+        return !value.empty() || ProviderUtilities::getKeyProperty(path, name.c_str(), value);
+    }
+
     /// The reference names in the order in which they are set.
     struct Roles {
         const char* names[2];

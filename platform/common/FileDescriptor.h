@@ -1,5 +1,6 @@
 #pragma once
 
+#include <pthread.h>
 #include <unistd.h>
 #include <utility>
 
@@ -15,7 +16,7 @@ public:
         return *this;
     }
     ~FileDescriptor() {
-        if (fd >= 0) ::close(fd);
+        if (fd >= 0) closeWithoutEnd(fd);
     }
 
     int get() const noexcept { return fd; }
@@ -23,6 +24,15 @@ public:
     explicit operator bool() const noexcept { return fd >= 0; }
 
 private:
+    /// A cancellation waits for the next chance: close is one, and a destructor that a thread is unwound from ends the
+    /// process.
+    static void closeWithoutEnd(int descriptor) noexcept {
+        int before = PTHREAD_CANCEL_ENABLE;
+        pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &before);
+        ::close(descriptor);
+        pthread_setcancelstate(before, nullptr);
+    }
+
     int fd;
 };
 

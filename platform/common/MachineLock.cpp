@@ -49,7 +49,7 @@ MachineLock::MachineLock(const std::string& name, const std::string& directory)
 }
 
 MachineLock::~MachineLock() {
-    if (file >= 0) ::close(file);
+    const FileDescriptor closed(file); // before other threads go on: members are destroyed later
     if (getpid() != holder) threads.release();
 }
 

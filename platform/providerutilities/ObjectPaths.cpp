@@ -9,6 +9,7 @@ namespace VK {
 namespace {
 
 constexpr char keysOfPath[] = "the keys of a path";
+constexpr CMPIStatus notOffered{CMPI_RC_ERR_NOT_SUPPORTED, nullptr}; ///< by a broker that lacks a way of asking
 
 CMPIData absent() {
     CMPIData data{};
@@ -34,13 +35,14 @@ CMPIData findKey(const CMPIObjectPath* path, const char* name) {
 
 CMPIData getKey(const CMPIObjectPath* path, const char* name) {
     if (path == nullptr || name == nullptr) return absent();
-    CMPIStatus status{CMPI_RC_ERR_NOT_SUPPORTED, nullptr}; // of a broker that offers no way of asking
+    CMPIStatus status = notOffered;
     if (Cmpi::hasSlot(path, &CMPIObjectPathFT::getKey)) {
         status = Cmpi::freshStatus();
         const CMPIData key = path->ft->getKey(path, name, &status);
         if (Cmpi::hasValue(key, status)) return key;
     }
-    if (Cmpi::hasSlot(path, &CMPIObjectPathFT::getKeyAt)) return findKey(path, name);
+    if (Cmpi::hasSlot(path, &CMPIObjectPathFT::getKeyAt) && Cmpi::hasSlot(path, &CMPIObjectPathFT::getKeyCount))
+        return findKey(path, name);
     Cmpi::requireTold(status, keysOfPath);
     return absent();
 }
@@ -74,9 +76,13 @@ CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, co
 }
 
 unsigned int ProviderUtilities::getKeyCount(const CMPIObjectPath* objectPath) {
-    if (!Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getKeyCount)) return 0;
-    CMPIStatus status = Cmpi::freshStatus();
-    const CMPICount count = objectPath->ft->getKeyCount(objectPath, &status);
+    if (objectPath == nullptr) return 0;
+    CMPIStatus status = notOffered;
+    CMPICount count = 0;
+    if (Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getKeyCount)) {
+        status = Cmpi::freshStatus();
+        count = objectPath->ft->getKeyCount(objectPath, &status);
+    }
     Cmpi::requireTold(status, keysOfPath);
     return Cmpi::succeeded(status) ? count : 0;
 }

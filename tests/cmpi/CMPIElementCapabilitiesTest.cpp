@@ -1,7 +1,9 @@
+#include "cmpi/CMPIElementCapabilities.h"
 #include "support/Associations.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
+#include <cmpimacs.h>
 #include <gmock/gmock.h>
 
 namespace {
@@ -129,6 +131,58 @@ TEST(CMPIElementCapabilities, FailWhereAComputerHasNoName) {
     EXPECT_THAT(test::ends(test::paths(answer)), ElementsAre("ManagedElement=a -> Capabilities=/computer/0"));
     EXPECT_EQ(answer.code, CMPI_RC_OK);
     EXPECT_FALSE(answer.done);
+}
+
+/// A broker that takes a key of an empty text, and has no such key then.
+class BrokerWithoutEmptyKeys {
+public:
+    BrokerWithoutEmptyKeys() {
+        table.newObjectPath = [](const CMPIBroker*, const char* nameSpace, const char* name, CMPIStatus* status) {
+            CMPIObjectPath* const made = CMNewObjectPath(usual(), nameSpace, name, status);
+            usualPaths = made->ft;
+            made->ft = &paths;
+            return made;
+        };
+        paths.addKey = [](CMPIObjectPath* path, const char* name, const CMPIValue* value, CMPIType type) {
+            const bool empty = type == CMPI_chars && *reinterpret_cast<const char*>(value) == '\0';
+            return empty ? CMPIStatus{CMPI_RC_OK, nullptr} : usualPaths->addKey(Usual(path).path, name, value, type);
+        };
+        paths.getKey = [](const CMPIObjectPath* path, const char* name, CMPIStatus* status) {
+            return usualPaths->getKey(Usual(path).path, name, status);
+        };
+        paths.getKeyCount = [](const CMPIObjectPath* path, CMPIStatus* status) {
+            return usualPaths->getKeyCount(Usual(path).path, status);
+        };
+        broker.eft = &table;
+    }
+
+    CMPIBroker broker = *usual();
+
+private:
+    /// The usual broker knows its paths by their table.
+    struct Usual {
+        explicit Usual(const CMPIObjectPath* ours) : path(const_cast<CMPIObjectPath*>(ours)) { path->ft = usualPaths; }
+        ~Usual() { path->ft = &paths; }
+        CMPIObjectPath* const path;
+    };
+
+    static const CMPIBroker* usual() { return test::provider().broker(); }
+
+    static inline CMPIObjectPathFT* usualPaths = nullptr;
+    static inline CMPIObjectPathFT paths{};
+    CMPIBrokerEncFT table = *usual()->eft;
+};
+
+TEST(CMPIElementCapabilities, AreNoneForAnUnknownComputerAlsoWhereTheBrokerHasNoEmptyKeys) {
+    test::simulate({test::computer(0, "a"), test::computer(1, "b")});
+    const BrokerWithoutEmptyKeys without;
+    for (const auto& [name, found] : {std::pair("a", true), std::pair("unknown", false)}) {
+        CMPIObjectPath* const source =
+            CMNewObjectPath(test::provider().broker(), "root/cimv2", "VESKA_ComputerSystem", nullptr);
+        CMAddKey(source, "Name", reinterpret_cast<const CMPIValue*>(name), CMPI_chars);
+        const VK::BaseServerProvider::CMPIElementCapabilities adapter(&without.broker, nullptr, source);
+        EXPECT_EQ(static_cast<bool>(adapter), found) << name;
+    }
 }
 
 TEST(CMPIElementCapabilities, TraceTheClassOfTheRequest) {

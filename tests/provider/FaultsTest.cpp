@@ -49,7 +49,8 @@ const Association associations[] = {
     {"CIM_ComputerSystemPackage", {"VESKA_PhysicalPackage"}},
     {"VESKA_TimeServiceAffectsElement", {"VESKA_ComputerSystem", "VESKA_TimeService"}},
     {"CIM_ServiceAffectsElement", {"VESKA_TimeService"}},
-    {"CIM_Dependency", {"VESKA_ComputerSystem"}}, // above two of the three
+    {"CIM_Dependency", {"VESKA_ComputerSystem"}},        // above two of the three
+    {"", {"VESKA_ComputerSystem", "VESKA_TimeService"}}, // all three
 };
 
 std::vector<FaultCase> associationCases() {

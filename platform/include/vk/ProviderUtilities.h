@@ -38,7 +38,8 @@ public:
     /// A new path without keys, or null.
     static CMPIObjectPath* createObjectPath(const CMPIBroker* broker, const char* className, std::string nameSpace);
 
-    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker answers an error.
+    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker answers an error, or
+    /// cannot be asked.
     static unsigned int getKeyCount(const CMPIObjectPath* objectPath);
 
     /// Reads a text or a reference key, its name without regard to case: true and the value, or false (no such key, of

@@ -11,6 +11,7 @@
 #include <cstdlib>
 #include <filesystem>
 #include <optional>
+#include <pthread.h>
 #include <sys/stat.h>
 #include <thread>
 
@@ -145,6 +146,23 @@ TEST(MachineLock, CanBeHadInAChildThatWasForkedWhileAThreadHeldIt) {
         });
         EXPECT_EQ(holdersCopy.wait(), 0);
     }).join();
+}
+
+TEST_F(MachineLockAmongProcesses, IsGivenBackByAThreadThatIsCancelledMeanwhile) {
+    const auto start = [](void* own) -> void* {
+        {
+            const MachineLock lock("x", static_cast<const TemporaryDirectory*>(own)->path());
+            pthread_cancel(pthread_self());
+        }
+        pthread_testcancel();
+        return own;
+    };
+    pthread_t thread{};
+    ASSERT_EQ(pthread_create(&thread, nullptr, start, const_cast<TemporaryDirectory*>(&directory)), 0);
+    void* answer = nullptr;
+    ASSERT_EQ(pthread_join(thread, &answer), 0);
+    EXPECT_EQ(answer, PTHREAD_CANCELED);
+    EXPECT_TRUE(MachineLock("x", directory.path()).keepsProcessesOut());
 }
 
 TEST_F(MachineLockAmongProcesses, KeepsAnotherProcessWaiting) {

@@ -6,6 +6,7 @@
 #include <gmock/gmock.h>
 
 #include <stdexcept>
+#include <utility>
 
 using testing::ElementsAre;
 using testing::IsEmpty;
@@ -106,7 +107,7 @@ TEST_F(Keys, AreCounted) {
     EXPECT_THROW(ProviderUtilities::getKeyCount(path), std::runtime_error)
         << "not a path without keys, which means all";
     fake.pathTable.getKeyCount = nullptr;
-    EXPECT_EQ(ProviderUtilities::getKeyCount(path), 0U);
+    EXPECT_THROW(ProviderUtilities::getKeyCount(path), std::runtime_error) << "nor where it cannot be asked";
 }
 
 TEST_F(Keys, AreReadAsTextOrReference) {
@@ -144,9 +145,18 @@ TEST_F(Keys, AreFoundAmongAllWhereTheBrokerFindsNone) {
 }
 
 TEST_F(Keys, AreAbsentWhereTheOneWayOfAskingFindsNone) {
-    fake.pathTable.getKeyAt = nullptr;
-    EXPECT_EQ(text("Name"), "node7");
-    EXPECT_EQ(text("None"), "-");
+    for (const bool countable : {true, false}) {
+        const auto at = fake.pathTable.getKeyAt;
+        const auto count = fake.pathTable.getKeyCount;
+        if (countable)
+            fake.pathTable.getKeyAt = nullptr;
+        else
+            fake.pathTable.getKeyCount = nullptr;
+        EXPECT_EQ(text("Name"), "node7");
+        EXPECT_EQ(text("None"), "-");
+        fake.pathTable.getKeyAt = at;
+        fake.pathTable.getKeyCount = count;
+    }
 }
 
 TEST_F(Keys, AreNotTakenForAbsentWhereNoWayOfAskingIsLeft) {
@@ -167,6 +177,10 @@ TEST_F(Keys, AreNotTakenForAbsentWhereTheBrokerCannotTellThem) {
     EXPECT_THROW(reference("System"), std::runtime_error);
     fake.refusals = {{"getKey", CMPI_RC_ERR_FAILED}, {"getKeyCount", CMPI_RC_ERR_FAILED}};
     EXPECT_THROW(text("Name"), std::runtime_error);
+    fake.refusals = {{"getKey", CMPI_RC_ERR_FAILED}};
+    const auto counting = std::exchange(fake.pathTable.getKeyCount, nullptr);
+    EXPECT_THROW(text("Name"), std::runtime_error) << "nobody knows among how many to look";
+    fake.pathTable.getKeyCount = counting;
     fake.refusals = {{"getCharPtr", CMPI_RC_ERR_FAILED}};
     EXPECT_THROW(text("Name"), std::runtime_error);
     EXPECT_THROW(text("None"), std::runtime_error) << "its name could be any of those that cannot be read";
