@@ -27,6 +27,10 @@ class Plain(unittest.TestCase):
         for name in ("VESKA_ComputerSystem", "VESKA_PhysicalPackage"):
             self.assertEqual(properties(target, name), properties(root, name))
 
+    def test_a_copy_of_a_copy_keeps_the_other_machines_architecture(self):
+        target, _ = take(make_host(**{"proc/sys/kernel/arch": b"s390x\n"}))
+        self.assertEqual((target / "proc/sys/kernel/arch").read_bytes(), b"s390x\n")
+
     def test_a_folder_that_holds_something_is_refused(self):
         root = make_host()
         self.assertEqual(run(SNAPSHOT, "--root", root, root).returncode, 2)
