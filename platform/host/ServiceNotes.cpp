@@ -1,5 +1,7 @@
 #include "host/ServiceNotes.h"
 
+#include "common/Text.h"
+
 #include <algorithm>
 #include <cctype>
 #include <unistd.h>
@@ -10,12 +12,6 @@ namespace {
 
 bool isProcess(const std::string& name) {
     return !name.empty() && std::all_of(name.begin(), name.end(), [](unsigned char c) { return std::isdigit(c) != 0; });
-}
-
-std::string lowerCase(std::string text) {
-    std::transform(text.begin(), text.end(), text.begin(),
-                   [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
-    return text;
 }
 
 } // namespace
