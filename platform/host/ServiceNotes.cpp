@@ -25,12 +25,6 @@ std::string timeNote(const TimeFacts& facts) {
     return note + "NTP daemon " + (facts.ntpDaemonRuns ? "running" : "not running");
 }
 
-std::string zoneNameOf(const std::string& link) {
-    const std::string folder = "zoneinfo/";
-    const std::size_t found = link.rfind(folder);
-    return found == std::string::npos ? std::string() : link.substr(found + folder.size());
-}
-
 bool isNtpDaemonRunning(const Root& root) {
     const Root::Names processes = root.list("/proc");
     return std::any_of(processes.names.begin(), processes.names.end(), [&](const std::string& name) {
