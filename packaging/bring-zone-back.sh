@@ -47,6 +47,14 @@ bring_zone_back() {
         [ -f "$older" ] || return 0
         take_first_version "$older" || rm -rf "$kept"
     fi
+    # A link to anything but a zone of one offset is none of the provider's: an administrator chose another zone since.
+    case $(readlink "$etc/localtime") in
+    "" | *zoneinfo/Etc/GMT*) ;;
+    *)
+        rm -rf "$kept" "$older"
+        return 0
+        ;;
+    esac
     if [ -e "$kept/no-localtime" ]; then
         rm -f "$etc/localtime"
     elif ! put_zone_file localtime TZif; then

@@ -10,7 +10,7 @@ namespace VK::Host {
 namespace {
 
 /// Why there is no text; `untold` for a host that simply does not have it.
-std::string reason(const Fact& fact, const char* untold) {
+std::string reason(const Fact& fact, const std::string& untold) {
     if (!fact.useless.empty()) return fact.source + " holds a placeholder, " + inQuotes(fact.useless);
     if (!fact.problem.empty()) return fact.source + " " + fact.problem;
     switch (fact.error) {
@@ -33,8 +33,8 @@ void noteMissing(std::vector<std::string>& notes, const char* what, const Fact& 
 std::vector<std::string> notesOn(const HardwareFacts& facts) {
     std::vector<std::string> notes;
     if (facts.noTables.error != 0 && facts.problems.empty()) // damage is among the problems
-        notes.push_back("no SMBIOS tables: " +
-                        reason(facts.noTables, "the firmware provides none (/sys/firmware/dmi/tables is not there)"));
+        notes.push_back("no SMBIOS tables: " + reason(facts.noTables, "the firmware provides none (" +
+                                                                          facts.noTables.source + " is not there)"));
     notes.insert(notes.end(), facts.problems.begin(), facts.problems.end());
     noteMissing(notes, "UUID", facts.uuid);
     noteMissing(notes, "serial number", facts.serial);

@@ -1,5 +1,7 @@
 #include "host/ServiceNotes.h"
 
+#include "common/Text.h"
+
 #include <algorithm>
 #include <cctype>
 #include <unistd.h>
@@ -12,12 +14,6 @@ bool isProcess(const std::string& name) {
     return !name.empty() && std::all_of(name.begin(), name.end(), [](unsigned char c) { return std::isdigit(c) != 0; });
 }
 
-std::string lowerCase(std::string text) {
-    std::transform(text.begin(), text.end(), text.begin(),
-                   [](unsigned char c) { return static_cast<char>(std::tolower(c)); });
-    return text;
-}
-
 } // namespace
 
 std::string timeNote(const TimeFacts& facts) {
@@ -27,12 +23,6 @@ std::string timeNote(const TimeFacts& facts) {
     if (facts.automaticDst)
         note += std::string("automatic daylight saving ") + (*facts.automaticDst != 0 ? "on" : "off") + ", ";
     return note + "NTP daemon " + (facts.ntpDaemonRuns ? "running" : "not running");
-}
-
-std::string zoneNameOf(const std::string& link) {
-    const std::string folder = "zoneinfo/";
-    const std::size_t found = link.rfind(folder);
-    return found == std::string::npos ? std::string() : link.substr(found + folder.size());
 }
 
 bool isNtpDaemonRunning(const Root& root) {

@@ -18,9 +18,6 @@ struct TimeFacts {
 /// The facts in one line for people.
 std::string timeNote(const TimeFacts& facts);
 
-/// The zone that a link like `../usr/share/zoneinfo/Europe/Berlin` names; empty for any other text.
-std::string zoneNameOf(const std::string& link);
-
 /// Whether `ntpd` stands in the command line of any process below `/proc` of that root, in any letter case: the
 /// question that the time service asks of `ps`.
 bool isNtpDaemonRunning(const Root& root);

@@ -69,7 +69,8 @@ Smbios parseSmbios(std::string_view entryPoint, std::string_view table) {
         if (structure->type() == CHASSIS && seen.insert(structure->contents()).second)
             result.chassis.push_back(readChassis(fields));
     }
-    result.breakOff = structures.problem();
+    // An empty file is no table of a machine that lacks everything: some firmware fails to hand it over.
+    result.breakOff = table.empty() ? "table is empty" : structures.problem();
     if (!result.breakOff.empty()) result.problems.push_back(result.breakOff);
     if (badIndexes > 0)
         result.problems.push_back(std::to_string(badIndexes) + " string(s) that the table refers to are not there");

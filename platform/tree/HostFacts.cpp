@@ -8,6 +8,7 @@
 #include "vk/HostSource.h"
 #include "vk/NodeLexicon.h"
 #include "vk/Root.h"
+#include "zone/ZoneInForce.h"
 
 namespace VK {
 
@@ -61,7 +62,7 @@ std::string timeServiceNote() {
         if (const std::string* text = std::get_if<std::string>(&*time)) facts.time = *text;
     if (const auto automatic = computer.read(NodeLexicon::AutomaticDSTAdjustmentProperty))
         if (const unsigned int* number = std::get_if<unsigned int>(&*automatic)) facts.automaticDst = *number;
-    if (Tree::simulatedHost() == nullptr) facts.zone = Host::zoneNameOf(Root::host().readLink("/etc/localtime").text);
+    if (Tree::simulatedHost() == nullptr) facts.zone = Zone::zoneNameOf(Root::host().readLink(Zone::LOCAL_TIME).text);
     facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, whatever is described
     return Host::timeNote(facts);
 }

@@ -18,9 +18,7 @@ namespace VK::Zone {
 
 namespace {
 
-const std::string LOCAL_TIME = "/etc/localtime";
 const std::string ZONE_NAME = "/etc/timezone";
-const std::string ZONES = "/usr/share/zoneinfo/";
 
 /// Opens a folder, made with those above it where they are missing: a descriptor or a negative errno value.
 int openFolder(const Root& root, const std::string& path) {
@@ -45,8 +43,8 @@ std::string describeBytes(const std::string& bytes) {
 std::string describe(const SavedFile& localTime) {
     if (localTime.kind == SavedFile::Absent) return "nothing";
     if (localTime.kind == SavedFile::File) return describeBytes(localTime.content);
-    const std::size_t zones = localTime.content.find("zoneinfo/");
-    return zones == std::string::npos ? localTime.content : localTime.content.substr(zones + 9);
+    const std::string name = zoneNameOf(localTime.content);
+    return name.empty() ? localTime.content : name;
 }
 
 /// The zone folder's name of a zone that is that offset for ever. Its signs are those of POSIX: west is positive.
@@ -54,7 +52,7 @@ std::string nameOfOffset(const Root& root, int minutes) {
     if (minutes % 60 != 0) return {};
     std::string name = "Etc/GMT";
     if (minutes != 0) name += (minutes > 0 ? "-" : "+") + std::to_string(std::abs(minutes) / 60);
-    const std::optional<TimeZone> zone = zoneOfFile(root, ZONES + name);
+    const std::optional<TimeZone> zone = zoneOfFile(root, ZONE_DIRECTORY + name);
     const bool right = zone && zone->at(0).offset == minutes * 60 && !zone->hasDaylightSavingFrom(0);
     return right ? name : std::string();
 }
@@ -84,9 +82,9 @@ SavedZone zoneOfOffset(const Root& root, int minutes) {
     SavedZone zone;
     zone.zoneName.kind = SavedFile::File;
     if (const std::string name = nameOfOffset(root, minutes); !name.empty()) {
-        zone.localTime = {SavedFile::Link, ".." + ZONES + name};
+        zone.localTime = {SavedFile::Link, ".." + ZONE_DIRECTORY + name};
         // Where /etc is itself a link, the directory above it is not the root.
-        if (!makesZone(root, zone.localTime)) zone.localTime.content = ZONES + name;
+        if (!makesZone(root, zone.localTime)) zone.localTime.content = ZONE_DIRECTORY + name;
         zone.zoneName.content = name + "\n";
     } else {
         zone.localTime = {SavedFile::File, makeZoneFile(minutes)};

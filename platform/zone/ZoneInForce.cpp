@@ -8,18 +8,21 @@ namespace VK::Zone {
 
 namespace {
 
-const std::string LOCAL_TIME = "/etc/localtime";
-const std::string ZONE_FOLDER = "/usr/share/zoneinfo";
-
 /// Whether the path that /etc/localtime leads to is that file itself or one of the zone folder.
 bool isTrusted(const Root& root, const std::string& path) {
-    const Root::Contents folder = root.resolve(ZONE_FOLDER);
+    const Root::Contents folder = root.resolve(ZONE_DIRECTORY);
     if (folder && path.rfind(folder.text + "/", 0) == 0) return true;
     const Root::Contents parent = root.resolve("/etc");
     return parent && path == parent.text + "/localtime";
 }
 
 } // namespace
+
+std::string zoneNameOf(const std::string& link) {
+    const std::string directory = "zoneinfo/";
+    const std::size_t found = link.rfind(directory);
+    return found == std::string::npos ? std::string() : link.substr(found + directory.size());
+}
 
 std::optional<TimeZone> zoneOfFile(const Root& root, const std::string& path) {
     const Root::Contents real = root.resolve(path);

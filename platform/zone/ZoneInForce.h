@@ -8,6 +8,12 @@
 
 namespace VK::Zone {
 
+inline const std::string LOCAL_TIME = "/etc/localtime";
+inline const std::string ZONE_DIRECTORY = "/usr/share/zoneinfo/";
+
+/// The zone that a link like `../usr/share/zoneinfo/Europe/Berlin` names; empty for any other text.
+std::string zoneNameOf(const std::string& link);
+
 // The zone may change at any time; each of these looks anew.
 
 /// The zone of a zone file, links followed. Nothing when it is missing, broken, no zone file, or neither

@@ -84,6 +84,22 @@ class BringZoneBack(unittest.TestCase):
         self.run_it()
         self.assertEqual(os.listdir(self.root / "etc"), ["timezone"])
 
+    def test_leaves_a_zone_that_an_administrator_chose_since(self):
+        for chosen in ("/usr/share/zoneinfo/Asia/Tokyo", "../usr/share/zoneinfo/Etc/UTC"):
+            for kept in ("../usr/share/zoneinfo/Europe/Berlin", None):
+                (self.root / "etc/localtime").unlink()
+                os.symlink(chosen, self.root / "etc/localtime")
+                self.keep(kept, b"Europe/Berlin\n")
+                self.assertEqual(self.run_it(), "")
+                self.assertEqual(os.readlink(self.root / "etc/localtime"), chosen)
+                self.assert_nothing_is_left_over()
+
+    def test_brings_back_from_where_nothing_is(self):
+        (self.root / "etc/localtime").unlink()
+        self.keep(BERLIN)
+        self.run_it()
+        self.assertEqual(self.zone(), BERLIN)
+
     def test_does_nothing_without_a_kept_zone(self):
         self.assertEqual(self.run_it(), "")
         self.assertEqual(self.zone(), b"TZif2 other")

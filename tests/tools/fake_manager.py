@@ -1,6 +1,7 @@
 #!/usr/bin/python3 -IS
 """The commands of OpenPegasus and SFCB, as far as a registration uses them: copied under their names into a root, where
-they record what is asked of them, answer as the real ones do, and remember it below state. What state/fail holds fails."""
+they record what is asked of them, answer as the real ones do, and remember it below state. What state/fail holds fails.
+When the classes are declared, the registration gets the signal of state/signal."""
 
 import os
 import re
@@ -92,6 +93,8 @@ def cimmof():
         register(mof)
     else:
         declare(mof, words[2])
+        if get("signal"):
+            os.kill(os.getppid(), int(get("signal")))
 
 
 def cimcli():

@@ -2,6 +2,7 @@
 
 import os
 import shutil
+import signal
 import unittest
 
 import fakes
@@ -151,6 +152,37 @@ class OpenPegasus(Register):
                 self.assertEqual(manager.classes, sorted(CLASSES) if action == "install" else [])
                 self.assertEqual(manager.module, f"{MODULE} OK" if action == "install" else "")
                 self.assertEqual((self.root / self.link).is_symlink(), action == "install")
+
+    def test_an_install_that_is_ended_by_a_signal_takes_back_what_it_declared(self):
+        for number in (signal.SIGHUP, signal.SIGINT, signal.SIGTERM):
+            with self.subTest(number.name):
+                self.root = folder()
+                manager = fakes.pegasus(self.root, up=True)
+                manager.set("signal", int(number))
+                said = self.register("install", status=1).stderr
+                self.assertIn(f"ended by {number.name}; what was begun is taken back", said)
+                self.assertNotIn("Traceback", said)
+                self.assertEqual((manager.classes, manager.module), ([], ""))
+                self.assertFalse((self.root / self.link).is_symlink())
+
+    def test_an_incomplete_installation_is_named_before_anything_is_changed(self):
+        for name in ("share/vk-baseserver/vk-baseserver.mof", "share/vk-baseserver/vk-baseserver.reg", "lib/libnvlog.so.1"):
+            with self.subTest(name):
+                prefix = self.copy_of_the_prefix()
+                (prefix / name).unlink()
+                manager = fakes.pegasus(self.root, up=True)
+                self.assertIn(f"incomplete: {prefix}/{name} missing", self.register("install", prefix=prefix, status=1).stderr)
+                self.assertEqual(manager.calls(), [])
+
+    def test_notes_hold_paths_of_any_bytes(self):
+        odd = os.fsdecode(os.fsencode(folder()) + b"/\xff")
+        os.mkdir(odd)
+        fakes.pegasus(self.root, up=True).set("any-folder", "yes")
+        self.register("--provider-dir", odd, "install")
+        self.assertTrue(os.path.islink(f"{odd}/{LIBRARY}"))
+        self.register("status")
+        self.register("remove")
+        self.assertEqual(os.listdir(odd), [])
 
     def test_a_busy_provider_is_asked_again(self):
         manager = fakes.pegasus(self.root, up=True)
@@ -433,7 +465,7 @@ class Both(Register):
 class Arguments(Register):
     def test_unusable_ones_end_with_2(self):
         for words in ([], ["install", "remove"], ["frobnicate"], ["--root"], ["--manager", "other", "install"],
-                      ["--provider-dir", "/nonexistent", "install"]):
+                      ["--provider-dir", "/nonexistent", "install"], ["--root", "/nonexistent", "status"]):
             with self.subTest(words):
                 self.assertIn("--help", self.register(*words, status=2).stderr)
 

@@ -137,6 +137,18 @@ class Cimconfig(Register):
                 self.assertEqual(os.readlink(place), target)
                 place.unlink()
 
+    def test_made_by_somebody_else_serves_wherever_its_relative_links_lead(self):
+        self.make_kvm_guest()
+        self.move_command_to_opt()
+        (self.root / "etc/alternatives").mkdir(parents=True)
+        (self.root / "etc/alternatives/cimconfig").symlink_to("/opt/tog-pegasus/bin/cimconfig")
+        for target in ("../../opt/tog-pegasus/bin/cimconfig", "../../etc/alternatives/cimconfig"):
+            with self.subTest(target):
+                place = self.root / "usr/sbin/cimconfig"
+                place.symlink_to(target)
+                self.assertIn(f"{place} is there already", self.register("install").stdout)
+                place.unlink()
+
     def test_made_by_somebody_else_and_leading_nowhere_is_told(self):
         place = self.usual_place()
         place.parent.mkdir(parents=True)

@@ -1,8 +1,13 @@
 """vk-host-snapshot: what is copied, and where to."""
 
+import contextlib
+import io
 import os
 import resource
+import signal
+import sys
 import unittest
+from unittest import mock
 
 from hosts import SNAPSHOT, make_host, program, properties, take
 from support import files_below, folder, run, snapshot_of
@@ -26,6 +31,10 @@ class Plain(unittest.TestCase):
         target, _ = take(root)
         for name in ("VESKA_ComputerSystem", "VESKA_PhysicalPackage"):
             self.assertEqual(properties(target, name), properties(root, name))
+
+    def test_a_copy_of_a_copy_keeps_the_other_machines_architecture(self):
+        target, _ = take(make_host(**{"proc/sys/kernel/arch": b"s390x\n"}))
+        self.assertEqual((target / "proc/sys/kernel/arch").read_bytes(), b"s390x\n")
 
     def test_a_folder_that_holds_something_is_refused(self):
         root = make_host()
@@ -119,7 +128,7 @@ class Failure(unittest.TestCase):
         for root in ("/nonexistent", SNAPSHOT):
             done = run(SNAPSHOT, "--root", root, target)
             self.assertEqual(done.returncode, 2)
-            self.assertIn(f"{root} is no folder", done.stderr)
+            self.assertIn(f"{root} is no directory", done.stderr)
             self.assertFalse(target.exists())
 
     def test_a_write_error_names_the_file_and_leaves_nothing(self):
@@ -140,6 +149,18 @@ class Failure(unittest.TestCase):
         done = run(SNAPSHOT, "--root", make_host(), target,
                    preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (0, 0)))
         self.assertEqual((done.returncode, list(target.iterdir())), (1, []))
+
+    def test_one_that_is_interrupted_leaves_nothing(self):
+        self.addCleanup(os.umask, os.umask(0o022))
+        for number in (signal.SIGHUP, signal.SIGINT, signal.SIGTERM):
+            tool, target, said = program(), folder() / "copy", io.StringIO()
+            self.addCleanup(signal.signal, number, signal.getsignal(number))
+            words = ["vk-host-snapshot", "--root", str(make_host()), str(target)]
+            with (mock.patch.object(tool.Target, "link", lambda *_, number=number: os.kill(os.getpid(), number)),
+                  mock.patch.object(sys, "argv", words), contextlib.redirect_stderr(said)):
+                self.assertEqual(tool.main(), 1, number)
+            self.assertEqual(said.getvalue(), "vk-host-snapshot: interrupted; nothing is left of the snapshot\n")
+            self.assertFalse(target.exists())
 
     def test_what_cannot_be_removed_is_called_incomplete(self):
         place = folder() / "copy"

@@ -18,10 +18,12 @@ def is_kvm(root):
 
 def can_run(root, path):
     """A link counts by where it leads below the root."""
-    there = os.readlink(path) if os.path.islink(path) else path
-    if there != path and there.startswith("/"):
-        there = root + there
-    return os.path.isfile(there) and os.access(there, os.X_OK)
+    for _ in range(40):  # as many as the kernel follows
+        if not os.path.islink(path):
+            break
+        there = os.readlink(path)
+        path = root + there if there.startswith("/") else os.path.join(os.path.dirname(path), there)
+    return os.path.isfile(path) and os.access(path, os.X_OK)
 
 
 def put(host, folders):

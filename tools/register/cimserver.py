@@ -89,7 +89,7 @@ class CimServer(Manager):
         return None
 
     def link(self):
-        """Never in a guessed folder: only the server says where it looks."""
+        """Never in a guessed directory: only the server says where it looks."""
         answers = (match(r"^\w+ value: *(.+)", self.ask("cimconfig", "-g", "providerDir", *words)[1]) for words in ((), ("-p",)))
         said = next(filter(None, answers), "").split(":")
         return self.library_link([self.host.root + folder if folder.startswith("/") else f"{self.home}/{folder}"

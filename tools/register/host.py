@@ -34,6 +34,8 @@ class Host:
         print(f"{self.prefix}{text}", flush=True)
 
     def fail(self, text):
+        if isinstance(text, OSError) and text.filename:
+            text = f"{text.filename}: {text.strerror}"
         print(f"vk-provider-register: {self.prefix}{text}", file=sys.stderr, flush=True)
         self.failed = True
 
@@ -88,9 +90,13 @@ class Host:
     # Notes: lines "KEY: VALUE", one file for each object manager: where it is and how it was served, so that a later run
     # needs neither the options nor the variables of this one.
 
+    def read(self, name):
+        # A path may hold any bytes.
+        return (self.state / name).read_text(encoding="utf-8", errors="surrogateescape").splitlines()
+
     def notes(self, owner):
         try:
-            lines = (self.state / owner).read_text(encoding="utf-8").splitlines()
+            lines = self.read(owner)
         except OSError:
             return {}
         return dict(line.split(": ", 1) for line in lines if ": " in line)
@@ -105,7 +111,7 @@ class Host:
         try:
             self.state.mkdir(parents=True, exist_ok=True)
             new = self.state / f"{name}.new"
-            new.write_text("".join(f"{line}\n" for line in lines), encoding="utf-8")
+            new.write_text("".join(f"{line}\n" for line in lines), encoding="utf-8", errors="surrogateescape")
             new.replace(self.state / name)
         except OSError as error:
             raise Failure(f"cannot write {self.state / name}: {error.strerror}") from error
@@ -124,7 +130,7 @@ class Host:
 
     def made_links(self, owner):
         try:
-            return (self.state / f"{owner}.links").read_text(encoding="utf-8").splitlines()
+            return self.read(f"{owner}.links")
         except OSError:
             return []
 

@@ -24,13 +24,13 @@ class Manager:
         self.host.run([self.command[program], *words], done, self.env)
 
     def library_link(self, folders):
-        """Where the server looks for the library: in the named folder, in one that was named before, or in its own."""
+        """Where the server looks for the library: in the named directory, in one that was named before, or in its own."""
         folder = self.host.provider_dir or self.noted.get("provider-dir") or next(filter(os.path.isdir, folders), None)
         return f"{folder}/{self.product.link_name}" if folder else None
 
     def need_link(self, link):
         if not link:
-            raise Failure("its folder of provider libraries is not found; name it with --provider-dir")
+            raise Failure("its directory of provider libraries is not found; name it with --provider-dir")
 
     def undo(self, link, replaced, registered):
         """After a failure: what was registered before still needs its link, what was not needs none."""

@@ -35,7 +35,7 @@ class Sfcb(Manager):
         return True
 
     def place(self, program, option, usual):
-        """A folder as the command's help names it."""
+        """A directory as the command's help names it."""
         told = match(rf"-{option} specify .*\[(/.*)\]", self.ask(program, "-h")[1])
         return Path(self.host.root + told if told else f"{self.home}/{usual}")
 

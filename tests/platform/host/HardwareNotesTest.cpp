@@ -50,6 +50,14 @@ TEST_F(HostNotes, NameTheTableThatIsMissing) {
                       Contains("no UUID: " + TABLE + " is missing"), Contains("no chassis: " + TABLE + " is missing")));
 }
 
+TEST_F(HostNotes, NameTheTableThatIsEmpty) {
+    host.write(ENTRY_POINT.substr(1), image.entryPoint());
+    host.write(TABLE.substr(1), "");
+    EXPECT_THAT(notes(), AllOf(Contains(TABLE + ": table is empty"),
+                               Contains("no UUID: " + TABLE + " is damaged: table is empty"),
+                               Contains("no chassis: " + TABLE + " is damaged: table is empty")));
+}
+
 TEST_F(HostNotes, NameTheEntryPointThatIsMissing) {
     host.write(TABLE.substr(1), image.table());
     EXPECT_THAT(notes(), Contains("no SMBIOS tables: " + ENTRY_POINT + " is missing"));

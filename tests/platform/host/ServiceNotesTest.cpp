@@ -20,13 +20,6 @@ TEST(ServiceNotes, TellTheTimeServiceInOneLine) {
     EXPECT_EQ(timeNote({}), "time service: NTP daemon not running");
 }
 
-TEST(ServiceNotes, TakeTheZoneFromItsLink) {
-    EXPECT_EQ(zoneNameOf("/usr/share/zoneinfo/Europe/Berlin"), "Europe/Berlin");
-    EXPECT_EQ(zoneNameOf("../usr/share/zoneinfo/UTC"), "UTC");
-    EXPECT_EQ(zoneNameOf("/etc/somewhere"), "");
-    EXPECT_EQ(zoneNameOf(""), "");
-}
-
 TEST(ServiceNotes, FindTheDaemonAmongTheProcesses) {
     const support::TemporaryDirectory folder;
     const fs::path proc = fs::path(folder.path()) / "proc";

@@ -207,6 +207,13 @@ TEST_F(ZoneChange, LeavesNothingBesideWhatItMeantToWrite) {
     EXPECT_THAT(root().list("/var/lib/vk/instrumentation").names, ElementsAre("lock"));
 }
 
+TEST(ZoneInForce, HasTheNameThatItsLinkEndsWith) {
+    EXPECT_EQ(zoneNameOf("/usr/share/zoneinfo/Europe/Berlin"), "Europe/Berlin");
+    EXPECT_EQ(zoneNameOf("../usr/share/zoneinfo/UTC"), "UTC");
+    EXPECT_EQ(zoneNameOf("/etc/somewhere"), "");
+    EXPECT_EQ(zoneNameOf(""), "");
+}
+
 TEST(ZoneInForce, IsUtcUnlessTheFileCanBeTrusted) {
     HostCopy host;
     const auto offset = [&host] { return offsetInForce(Root(host.path())); };
