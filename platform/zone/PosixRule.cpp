@@ -1,44 +1,29 @@
 #include "zone/PosixRule.h"
 
 #include <algorithm>
-#include <array>
 #include <cctype>
 
 namespace VK::Zone {
 
 namespace {
 
-constexpr std::int64_t DAY = 86400;
+using std::chrono::sys_days;
+using std::chrono::year;
+
 constexpr std::int64_t LONGEST_TIME = 167; // hours; what RFC 8536 allows beyond POSIX
 
-bool isLeap(std::int64_t year) {
-    return year % 4 == 0 && (year % 100 != 0 || year % 400 == 0);
-}
-
-std::int64_t daysBefore(std::int64_t year) {
-    const std::int64_t y = year - 1;
-    return y * 365 + y / 4 - y / 100 + y / 400 - 719162; // days from 0001-01-01 to 1970-01-01
-}
-
 /// The year that an instant lies in, in UTC; kept within what a rule can be asked of.
-int yearOf(std::int64_t instant) {
+year yearOf(std::int64_t instant) {
     constexpr std::int64_t LAST = 253402300799; // 9999-12-31
-    const std::int64_t days = std::clamp<std::int64_t>(instant, 0, LAST) / DAY;
-    std::int64_t year = 1970 + days / 366;
-    while (daysBefore(year + 1) <= days) ++year;
-    return static_cast<int>(year);
+    const std::chrono::sys_seconds kept{std::chrono::seconds{std::clamp<std::int64_t>(instant, 0, LAST)}};
+    return std::chrono::year_month_day{std::chrono::floor<std::chrono::days>(kept)}.year();
 }
 
-std::int64_t dayOfMonthRule(const RuleDay& rule, int year) {
-    static constexpr std::array<int, 12> LENGTHS{31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-    std::int64_t first = daysBefore(year);
-    for (int month = 1; month < rule.month; ++month)
-        first += LENGTHS[static_cast<std::size_t>(month - 1)] + (month == 2 && isLeap(year) ? 1 : 0);
-    const int length = LENGTHS[static_cast<std::size_t>(rule.month - 1)] + (rule.month == 2 && isLeap(year) ? 1 : 0);
-    const std::int64_t firstWeekday = (((first + 4) % 7) + 7) % 7; // 1970-01-01 was a Thursday
-    std::int64_t offset = (rule.day - firstWeekday + 7) % 7 + (rule.week - 1) * 7;
-    if (offset >= length) offset -= 7; // week 5 is the last one
-    return first + offset;
+sys_days dayOfMonthRule(const RuleDay& rule, year inYear) {
+    const std::chrono::year_month month = inYear / rule.month;
+    const std::chrono::weekday weekday{static_cast<unsigned int>(rule.day)};
+    if (rule.week == 5) return month / weekday[std::chrono::last];
+    return month / weekday[static_cast<unsigned int>(rule.week)];
 }
 
 /// Takes a rule's text apart from its front.
@@ -116,29 +101,30 @@ private:
 
 } // namespace
 
-std::int64_t RuleDay::inYear(int year) const {
-    std::int64_t days = 0;
+std::int64_t RuleDay::inYear(year which) const {
+    const sys_days newYear = which / 1 / 1;
+    sys_days found;
     switch (kind) {
-    case Julian:
-        days = daysBefore(year) + day - 1 + (isLeap(year) && day >= 60 ? 1 : 0);
+    case Julian: // 29 February is never counted
+        found = newYear + std::chrono::days{day - 1 + (which.is_leap() && day >= 60 ? 1 : 0)};
         break;
     case DayOfYear:
-        days = daysBefore(year) + day;
+        found = newYear + std::chrono::days{day};
         break;
     case MonthWeekDay:
-        days = dayOfMonthRule(*this, year);
+        found = dayOfMonthRule(*this, which);
         break;
     }
-    return days * DAY + second;
+    return std::chrono::sys_seconds{found}.time_since_epoch().count() + second;
 }
 
 bool PosixRule::isDaylightAt(std::int64_t instant) const {
     if (!hasDaylightSaving) return false;
     // As the C library has it: the year of UTC is looked at by itself. Daylight saving of a whole year therefore has
     // its gap between New Year in UTC and New Year in local time, which every program on the host sees.
-    const int year = yearOf(instant);
-    const std::int64_t begins = begin.inYear(year) - standardOffset;
-    const std::int64_t ends = end.inYear(year) - daylightOffset;
+    const year inForce = yearOf(instant);
+    const std::int64_t begins = begin.inYear(inForce) - standardOffset;
+    const std::int64_t ends = end.inYear(inForce) - daylightOffset;
     if (begins > ends) return instant < ends || instant >= begins; // over the end of the year
     return begins <= instant && instant < ends;
 }

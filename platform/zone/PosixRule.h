@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <optional>
 #include <string_view>
@@ -15,7 +16,7 @@ struct RuleDay {
     std::int64_t second = 7200; ///< of local time; may lie in other days
 
     /// When it comes in a year, in seconds since 1970 as if local time were UTC.
-    std::int64_t inYear(int year) const;
+    std::int64_t inYear(std::chrono::year which) const;
 };
 
 /// A POSIX time zone rule such as `CET-1CEST,M3.5.0,M10.5.0/3`. Offsets are seconds east of UTC.
