@@ -11,28 +11,9 @@ namespace VK::BaseServerProvider {
 static const std::string loggerCMPICIMServiceConfig("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPICIMServiceConfig, "CMPICIMServiceConfig"};
 
-using Data = CIMServiceConfig;
-
 const TraceSource& CMPICIMServiceConfig::traceSource() {
     return source;
 }
-
-const Key<Data> CMPICIMServiceConfig::keys[] = {
-    {"Name", &Data::getName},
-    {"CreationClassName", &Data::getCreationClassName},
-};
-
-const KeyFilter<Data> CMPICIMServiceConfig::keyFilters[] = {
-    {"Name", "name", Data::FilterType{}},
-    {"CreationClassName", "creationClassName", Data::FilterType{}},
-};
-
-const Property<Data> CMPICIMServiceConfig::properties[] = {
-    {"Name", &Data::getName},
-    {"CreationClassName", &Data::getCreationClassName},
-    {"deliveryRetryIntervalSec", &Data::getIntervalParameter},
-    {"deliveryRetryAttempts", &Data::getAttemptParameter},
-};
 
 unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out,
                                                 const CMPIResult* result) {

@@ -9,6 +9,7 @@ namespace VK::BaseServerProvider {
 class CMPICIMServiceConfig : public InstanceAdapter<CMPICIMServiceConfig, CIMServiceConfig> {
 public:
     using InstanceAdapter::InstanceAdapter;
+    using Data = CIMServiceConfig;
 
     /// Runs `SetCIMconfig` (any other name, in any case: 17) and answers a CMPI return code: 0, 1 for a failed command,
     /// 4 without an argument that can be used. `out` and `result` are not used.
@@ -21,9 +22,23 @@ public:
     static constexpr char adapterName[] = "CMPICIMServiceConfig";
     static constexpr char destructorName[] = "~CMPICIMServiceConfig";
     static const TraceSource& traceSource();
-    static const Key<CIMServiceConfig> keys[2];
-    static const KeyFilter<CIMServiceConfig> keyFilters[2];
-    static const Property<CIMServiceConfig> properties[4];
+
+    static constexpr Key<Data> keys[] = {
+        {"Name", &Data::getName},
+        {"CreationClassName", &Data::getCreationClassName},
+    };
+
+    static constexpr KeyFilter<Data> keyFilters[] = {
+        {"Name", "name", Data::FilterType{}},
+        {"CreationClassName", "creationClassName", Data::FilterType{}},
+    };
+
+    static constexpr Property<Data> properties[] = {
+        {"Name", &Data::getName},
+        {"CreationClassName", &Data::getCreationClassName},
+        {"deliveryRetryIntervalSec", &Data::getIntervalParameter},
+        {"deliveryRetryAttempts", &Data::getAttemptParameter},
+    };
 };
 
 } // namespace VK::BaseServerProvider

@@ -10,6 +10,7 @@ class CMPIEnabledLogicalElementCapabilities
     : public InstanceAdapter<CMPIEnabledLogicalElementCapabilities, EnabledLogicalElementCapabilities> {
 public:
     using InstanceAdapter::InstanceAdapter;
+    using Data = EnabledLogicalElementCapabilities;
 
     /// Drops all filters and starts again at the first element.
     void initialize();
@@ -18,9 +19,24 @@ public:
     static constexpr char adapterName[] = "CMPIEnabledLogicalElementCapabilities";
     static constexpr char destructorName[] = "~CMPIEnabledLogicalElementCapabilities";
     static const TraceSource& traceSource();
-    static const Key<EnabledLogicalElementCapabilities> keys[1];
-    static const KeyFilter<EnabledLogicalElementCapabilities> keyFilters[1];
-    static const Property<EnabledLogicalElementCapabilities> properties[7];
+
+    static constexpr Key<Data> keys[] = {
+        {"InstanceID", &Data::getInstanceID},
+    };
+
+    static constexpr KeyFilter<Data> keyFilters[] = {
+        {"InstanceID", "instanceId", Data::FilterType::InstanceID},
+    };
+
+    static constexpr Property<Data> properties[] = {
+        {"InstanceID", &Data::getInstanceID},
+        {"ElementName", &Data::getElementName},
+        {"ElementNameEditSupported", &Data::getElementNameEditSupported},
+        {"MaxElementNameLen", &Data::getMaxElementNameLen},
+        {"RequestedStatesSupported", &Data::getRequestedStatesSupported},
+        {"ElementNameMask", &Data::getElementNameMask},
+        {"StateAwareness", &Data::getStateAwareness},
+    };
 };
 
 } // namespace VK::BaseServerProvider

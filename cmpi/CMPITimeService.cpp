@@ -13,32 +13,9 @@ namespace VK::BaseServerProvider {
 static const std::string loggerCMPITimeService("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPITimeService, "CMPITimeService"};
 
-using Data = TimeService;
-
 const TraceSource& CMPITimeService::traceSource() {
     return source;
 }
-
-const Key<Data> CMPITimeService::keys[] = {
-    {"Name", &Data::getName},
-    {"CreationClassName", &Data::getCreationClassName},
-    {"SystemName", &Data::getSystemName},
-    {"SystemCreationClassName", &Data::getSystemCreationClassName},
-};
-
-const KeyFilter<Data> CMPITimeService::keyFilters[] = {
-    {"Name", "name", Data::FilterType{}},
-    {"SystemName", "systemName", Data::FilterType{}},
-};
-
-const Property<Data> CMPITimeService::properties[] = {
-    {"SystemCreationClassName", &Data::getSystemCreationClassName},
-    {"SystemName", &Data::getSystemName},
-    {"CreationClassName", &Data::getCreationClassName},
-    {"Name", &Data::getName},
-    {"AutomaticDSTAdjustment", &Data::getAutomaticDSTAdjustment},
-    {"Region", &Data::getRegion},
-};
 
 void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** propertyList) {
     const ParameterTraceScope scope(source, " referenceInstance=", instance, " properties=", propertyList);

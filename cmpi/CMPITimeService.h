@@ -9,6 +9,7 @@ namespace VK::BaseServerProvider {
 class CMPITimeService : public InstanceAdapter<CMPITimeService, TimeService> {
 public:
     using InstanceAdapter::InstanceAdapter;
+    using Data = TimeService;
 
     /// Changes the one property that can be changed, "AutomaticDSTAdjustment". "Region" is accepted and has no effect,
     /// which is meant. Never reports an error.
@@ -22,9 +23,27 @@ public:
     static constexpr char adapterName[] = "CMPITimeService";
     static constexpr char destructorName[] = "~CMPITimeService";
     static const TraceSource& traceSource();
-    static const Key<TimeService> keys[4];
-    static const KeyFilter<TimeService> keyFilters[2];
-    static const Property<TimeService> properties[6];
+
+    static constexpr Key<Data> keys[] = {
+        {"Name", &Data::getName},
+        {"CreationClassName", &Data::getCreationClassName},
+        {"SystemName", &Data::getSystemName},
+        {"SystemCreationClassName", &Data::getSystemCreationClassName},
+    };
+
+    static constexpr KeyFilter<Data> keyFilters[] = {
+        {"Name", "name", Data::FilterType{}},
+        {"SystemName", "systemName", Data::FilterType{}},
+    };
+
+    static constexpr Property<Data> properties[] = {
+        {"SystemCreationClassName", &Data::getSystemCreationClassName},
+        {"SystemName", &Data::getSystemName},
+        {"CreationClassName", &Data::getCreationClassName},
+        {"Name", &Data::getName},
+        {"AutomaticDSTAdjustment", &Data::getAutomaticDSTAdjustment},
+        {"Region", &Data::getRegion},
+    };
 
 private:
     unsigned int setTime(const CMPIArgs* in, CMPIArgs* out);
