@@ -3,15 +3,13 @@
 #include "cmpi/CMPIComputerSystem.h"
 #include "include/Exceptions.h"
 #include "include/Trace.h"
+#include "vk/ClassId.h"
 #include "vk/Moniker.h"
 #include "vk/ProviderUtilities.h"
 
 #include <string>
 
 namespace VK::BaseServerProvider {
-
-/// The class identifiers that association adapters tell ends by.
-enum : unsigned short { ComputerSystemClassId = 1 };
 
 /// The pattern of every association adapter: one end is a computer system, the other a `Partner`. Built for one
 /// request's path, which names either end or the association itself, it walks the elements at the other end, or the
@@ -31,7 +29,7 @@ public:
     /// and when the broker could not tell the class of the request's path, whose keys then have chosen nothing.
     CMPIObjectPath* getObjectPath() const {
         const TraceScope scope(Self::traceSource());
-        if (requestedClassId == ProviderUtilities::CLASS_ID_UNKNOWN) return nullptr;
+        if (requestedClassId == ClassId::Unknown) return nullptr;
         if (!static_cast<const Self&>(*this).hasPair()) return nullptr;
         CMPIObjectPath* path = keylessPath(Self::className);
         if (path == nullptr) return nullptr; // what was refused is logged
@@ -63,22 +61,23 @@ public:
     /// neither end.
     CMPIObjectPath* getAssociatorNames() const {
         const TraceScope scope(Self::traceSource());
-        if (requestedClassId == ComputerSystemClassId) return partner.getObjectPath();
+        if (requestedClassId == ClassId::ComputerSystem) return partner.getObjectPath();
         if (requestedClassId == Self::partnerClassId) return computer.getObjectPath();
         return nullptr;
     }
     CMPIInstance* getAssociator(const char** properties) const {
         const ParameterTraceScope scope(Self::traceSource(), " properties=", properties);
-        if (requestedClassId == ComputerSystemClassId) return partner.getCMPIInstance(properties);
+        if (requestedClassId == ClassId::ComputerSystem) return partner.getCMPIInstance(properties);
         if (requestedClassId == Self::partnerClassId) return computer.getCMPIInstance(properties);
         return nullptr;
     }
 
 protected:
     AssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath)
-        : broker(theBroker), nameSpace(ProviderUtilities::getNamespace(objectPath)),
-          requestedClassId(ProviderUtilities::getClassId(objectPath)), partner(theBroker, context, nameSpace),
-          computer(theBroker, context, nameSpace) {}
+        : broker(theBroker),
+          nameSpace(ProviderUtilities::getNamespace(objectPath)), requestedClassId{ProviderUtilities::getClassId(
+                                                                      objectPath)},
+          partner(theBroker, context, nameSpace), computer(theBroker, context, nameSpace) {}
     ~AssociationAdapter() = default;
 
     /// A new path of `className` without keys; null when the broker makes none.
@@ -111,11 +110,16 @@ protected:
         return path != nullptr;
     }
 
+    /// Traces what the request's path names.
+    void traceRequestedClassId(const TracePoint& at) const {
+        traceVariable(at, "requestedClassId", static_cast<unsigned int>(requestedClassId));
+    }
+
     void addProperties(CMPIInstance*) const {}
 
     const CMPIBroker* const broker;
     const std::string nameSpace;
-    const unsigned short requestedClassId;
+    const ClassId requestedClassId;
     Ends ends;
     Partner partner;
     CMPIComputerSystem computer;

@@ -28,7 +28,7 @@ bool CMPIComputerSystemPackage::isNotTargetClass(const char* resultClass) const 
     const auto isNeither = [resultClass](const char* ours, const char* base) {
         return strcasecmp(resultClass, ours) != 0 && strcasecmp(resultClass, base) != 0;
     };
-    if (requestedClassId == ComputerSystemClassId)
+    if (requestedClassId == ClassId::ComputerSystem)
         return isNeither(CMPIPhysicalPackage::className, "CIM_PhysicalPackage");
     if (requestedClassId == partnerClassId) return isNeither(CMPIComputerSystem::className, "CIM_ComputerSystem");
     return true;

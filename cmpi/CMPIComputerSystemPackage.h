@@ -28,8 +28,8 @@ public:
     static constexpr char className[] = "VESKA_ComputerSystemPackage";
     static constexpr char adapterName[] = "CMPIComputerSystemPackage";
     static constexpr char destructorName[] = "~CMPIComputerSystemPackage";
-    static constexpr unsigned short associationClassId = 24;
-    static constexpr unsigned short partnerClassId = 22;
+    static constexpr ClassId associationClassId = ClassId::ComputerSystemPackage;
+    static constexpr ClassId partnerClassId = ClassId::PhysicalPackage;
     static constexpr char computerRole[] = "Dependent";
     static constexpr char partnerRole[] = "Antecedent";
     static constexpr bool computerFirst = false;

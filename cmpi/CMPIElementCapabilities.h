@@ -21,8 +21,8 @@ public:
     static constexpr char className[] = "VESKA_ComputerCapabilities";
     static constexpr char adapterName[] = "CMPIElementCapabilities";
     static constexpr char destructorName[] = "~CMPIElementCapabilities";
-    static constexpr unsigned short associationClassId = 33;
-    static constexpr unsigned short partnerClassId = 23;
+    static constexpr ClassId associationClassId = ClassId::ComputerCapabilities;
+    static constexpr ClassId partnerClassId = ClassId::EnabledLogicalElementCapabilities;
     static constexpr char computerRole[] = "ManagedElement";
     static constexpr char partnerRole[] = "Capabilities";
     static constexpr bool computerFirst = true;

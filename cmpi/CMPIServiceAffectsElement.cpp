@@ -19,12 +19,12 @@ CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* t
                                                              const CMPIObjectPath* objectPath,
                                                              const ParameterTraceScope&)
     : AssociationAdapter(theBroker, context, objectPath) {
-    traceVariable(source, "requestedClassId", requestedClassId);
+    traceRequestedClassId(source);
     if (requestedClassId == partnerClassId)
         narrowed = narrow(computer, locateComputer(objectPath));
     else if (requestedClassId == associationClassId) // meant: all computers, whatever the path's keys
         narrowed = narrow(computer, keylessPath(CMPIComputerSystem::className));
-    else if (requestedClassId == ComputerSystemClassId)
+    else if (requestedClassId == ClassId::ComputerSystem)
         narrowed = narrow(partner, locateTimeService(objectPath));
 }
 
@@ -38,7 +38,7 @@ CMPITimeServiceAffectsElement::operator bool() const {
     switch (requestedClassId) {
     case partnerClassId:
         return static_cast<bool>(computer);
-    case ComputerSystemClassId:
+    case ClassId::ComputerSystem:
         return static_cast<bool>(partner);
     case associationClassId:
         return computer && partner;
@@ -49,7 +49,7 @@ CMPITimeServiceAffectsElement::operator bool() const {
 
 CMPITimeServiceAffectsElement& CMPITimeServiceAffectsElement::operator++() {
     const TraceScope scope(source);
-    if (requestedClassId == ComputerSystemClassId || requestedClassId == associationClassId) ++partner;
+    if (requestedClassId == ClassId::ComputerSystem || requestedClassId == associationClassId) ++partner;
     if (requestedClassId == partnerClassId || requestedClassId == associationClassId) ++computer;
     return *this;
 }

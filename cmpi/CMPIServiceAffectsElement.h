@@ -28,8 +28,8 @@ public:
     CMPIObjectPath* locateComputer(const CMPIObjectPath* objectPath);
 
     static constexpr char className[] = "VESKA_TimeServiceAffectsElement";
-    static constexpr unsigned short associationClassId = 162;
-    static constexpr unsigned short partnerClassId = 161;
+    static constexpr ClassId associationClassId = ClassId::TimeServiceAffectsElement;
+    static constexpr ClassId partnerClassId = ClassId::TimeService;
     static constexpr char computerRole[] = "AffectedElement";
     static constexpr char partnerRole[] = "AffectingElement";
     static constexpr bool computerFirst = true;

@@ -27,7 +27,7 @@ public:
 
     NodeAssociationAdapter& operator++() {
         const TraceScope scope(Self::traceSource());
-        if (requestedClassId == ComputerSystemClassId) {
+        if (requestedClassId == ClassId::ComputerSystem) {
             ++partner;
             valid = static_cast<bool>(partner);
         } else if (requestedClassId == Self::partnerClassId) {
@@ -68,8 +68,8 @@ private:
     NodeAssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath,
                            const ParameterTraceScope&)
         : Base(theBroker, context, objectPath) {
-        traceVariable(TracePoint(Self::traceSource(), Self::adapterName), "requestedClassId", requestedClassId);
-        if (requestedClassId == ComputerSystemClassId) {
+        Base::traceRequestedClassId(TracePoint(Self::traceSource(), Self::adapterName));
+        if (requestedClassId == ClassId::ComputerSystem) {
             valid = narrow(partner, self().locatePartner(objectPath)) && partner;
         } else if (requestedClassId == Self::partnerClassId) {
             valid = narrow(computer, self().locateComputer(objectPath)) && computer;

@@ -2,6 +2,7 @@
 #include "cmpi/CMPIElementCapabilities.h"
 #include "cmpi/CMPIServiceAffectsElement.h"
 #include "provider/OperationFrame.h"
+#include "vk/ClassId.h"
 #include "vk/ProviderUtilities.h"
 
 namespace VK::BaseServerProvider {
@@ -45,7 +46,7 @@ void walkInstances(const Request& request) {
 }
 
 struct AssociationRow {
-    unsigned short classId;
+    ClassId classId;
     const char* baseClass; ///< whose relatives count as this association
     void (*associatorNames)(const Request&);
     void (*associators)(const Request&);
@@ -65,7 +66,7 @@ constexpr AssociationRow associationRows[] = {
 
 const AssociationRow* findRow(unsigned short classId) {
     for (const AssociationRow& associationRow : associationRows)
-        if (associationRow.classId == classId) return &associationRow;
+        if (associationRow.classId == ClassId{classId}) return &associationRow;
     return nullptr;
 }
 
@@ -102,7 +103,8 @@ CMPIStatus serve(const OperationFrame& frame, void (*AssociationRow::*column)(co
 
 bool getClassId(const char* className, const char* nameSpace, std::vector<unsigned short>& ids) {
     if (className == nullptr || *className == '\0') { // no class in particular
-        for (const AssociationRow& associationRow : associationRows) ids.push_back(associationRow.classId);
+        for (const AssociationRow& associationRow : associationRows)
+            ids.push_back(static_cast<unsigned short>(associationRow.classId));
         return true;
     }
     const unsigned short classId = ProviderUtilities::getClassId(className);
@@ -113,7 +115,7 @@ bool getClassId(const char* className, const char* nameSpace, std::vector<unsign
     bool related = false;
     for (const AssociationRow& associationRow : associationRows) {
         if (!ProviderUtilities::areClassesRelated(broker, nameSpace, className, associationRow.baseClass)) continue;
-        ids.push_back(associationRow.classId);
+        ids.push_back(static_cast<unsigned short>(associationRow.classId));
         related = true;
     }
     return related;

@@ -7,6 +7,7 @@
 #include "cmpi/CMPIServiceAffectsElement.h"
 #include "cmpi/CMPITimeService.h"
 #include "provider/OperationFrame.h"
+#include "vk/ClassId.h"
 #include "vk/ProviderUtilities.h"
 
 namespace VK::BaseServerProvider {
@@ -54,7 +55,7 @@ void walkInstances(const Request& request) {
 }
 
 struct ClassRow {
-    unsigned short classId;
+    ClassId classId;
     void (*names)(const Request&);
     void (*instances)(const Request&);
     Service enumInstanceNames;
@@ -63,7 +64,7 @@ struct ClassRow {
 };
 
 template <class Adapter>
-constexpr ClassRow row(unsigned short classId, Service enumInstanceNames, Service enumInstances, Service getInstance) {
+constexpr ClassRow row(ClassId classId, Service enumInstanceNames, Service enumInstances, Service getInstance) {
     return {classId, walkNames<Adapter>, walkInstances<Adapter>, enumInstanceNames, enumInstances, getInstance};
 }
 
@@ -71,21 +72,21 @@ constexpr ClassRow row(unsigned short classId, Service enumInstanceNames, Servic
 // irregularities: they are meant.
 // clang-format off
 constexpr ClassRow classRows[] = {
-    //                                              id   EnumInstanceNames EnumInstances GetInstance
-    row<CMPIComputerSystem>                       (  1,  DoneTracingEach,  Done,         Done),
-    row<CMPIPhysicalPackage>                      ( 22,  Done,             Done,         Done),
-    row<CMPIEnabledLogicalElementCapabilities>    ( 23,  Done,             Open,         Done),
-    row<CMPIComputerSystemPackage>                ( 24,  Open,             Open,         Open),
-    row<CMPIElementCapabilities>                  ( 33,  Done,             Open,         Open),
-    row<CMPITimeService>                          (161,  Open,             Open,         Done),
-    row<CMPITimeServiceAffectsElement>            (162,  Open,             Open,         NotServed),
-    row<CMPICIMServiceConfig>                     (185,  Open,             Open,         Open),
+    //                                            class                                       EnumInstanceNames EnumInstances GetInstance
+    row<CMPIComputerSystem>                       (ClassId::ComputerSystem,                    DoneTracingEach,  Done,         Done),
+    row<CMPIPhysicalPackage>                      (ClassId::PhysicalPackage,                   Done,             Done,         Done),
+    row<CMPIEnabledLogicalElementCapabilities>    (ClassId::EnabledLogicalElementCapabilities, Done,             Open,         Done),
+    row<CMPIComputerSystemPackage>                (ClassId::ComputerSystemPackage,             Open,             Open,         Open),
+    row<CMPIElementCapabilities>                  (ClassId::ComputerCapabilities,              Done,             Open,         Open),
+    row<CMPITimeService>                          (ClassId::TimeService,                       Open,             Open,         Done),
+    row<CMPITimeServiceAffectsElement>            (ClassId::TimeServiceAffectsElement,         Open,             Open,         NotServed),
+    row<CMPICIMServiceConfig>                     (ClassId::CIMServiceConfig,                  Open,             Open,         Open),
 };
 // clang-format on
 
 const ClassRow* findRow(unsigned short classId) {
     for (const ClassRow& classRow : classRows)
-        if (classRow.classId == classId) return &classRow;
+        if (classRow.classId == ClassId{classId}) return &classRow;
     return nullptr;
 }
 
@@ -140,7 +141,7 @@ CMPIStatus BaseServer_ModifyInstance(CMPIInstanceMI*, const CMPIContext* context
     return frame.runMarked([&](CMPIStatus& status) {
         const unsigned short classId = ProviderUtilities::getClassId(ref);
         frame.traceClassId(classId);
-        if (classId == 161)
+        if (ClassId{classId} == ClassId::TimeService)
             CMPITimeService(broker, context, ref).modifyInstance(instance, properties);
         else
             status.rc = CMPI_RC_ERR_NOT_SUPPORTED;

@@ -1,6 +1,7 @@
 #include "cmpi/CMPICIMServiceConfig.h"
 #include "cmpi/CMPITimeService.h"
 #include "provider/OperationFrame.h"
+#include "vk/ClassId.h"
 #include "vk/CmpiSlots.h"
 #include "vk/ProviderUtilities.h"
 
@@ -26,19 +27,20 @@ unsigned int invoke(const Request& request, const char* methodName) {
 }
 
 struct MethodRow {
-    unsigned short classId;
+    ClassId classId;
     unsigned int (*invoke)(const Request&, const char* methodName);
     const char* fixedName; ///< run whatever name was asked for
 };
 
 constexpr MethodRow methodRows[] = {
-    {161, invoke<CMPITimeService>, "ManageTime"}, // the name is meant: every call on a time service runs this method
-    {185, invoke<CMPICIMServiceConfig>, nullptr},
+    {ClassId::TimeService, invoke<CMPITimeService>,
+     "ManageTime"}, // the name is meant: every call on a time service runs this method
+    {ClassId::CIMServiceConfig, invoke<CMPICIMServiceConfig>, nullptr},
 };
 
 const MethodRow* findRow(unsigned short classId) {
     for (const MethodRow& methodRow : methodRows)
-        if (methodRow.classId == classId) return &methodRow;
+        if (methodRow.classId == ClassId{classId}) return &methodRow;
     return nullptr;
 }
 

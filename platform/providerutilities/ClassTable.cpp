@@ -1,6 +1,6 @@
 #include "providerutilities/ClassTable.h"
 
-#include "vk/ProviderUtilities.h"
+#include "vk/ClassId.h"
 
 #include <strings.h>
 
@@ -9,29 +9,29 @@ namespace VK {
 namespace {
 
 struct Row {
-    unsigned short id;
+    ClassId id;
     const char* name;
 };
 
 constexpr Row CLASSES[] = {
-    {1, "VESKA_ComputerSystem"},
-    {22, "VESKA_PhysicalPackage"},
-    {23, "VESKA_EnabledLogicalElementCapabilities"},
-    {24, "VESKA_ComputerSystemPackage"},
-    {33, "VESKA_ComputerCapabilities"},
-    {161, "VESKA_TimeService"},
-    {162, "VESKA_TimeServiceAffectsElement"},
-    {185, "VESKA_CIMServiceConfig"},
+    {ClassId::ComputerSystem, "VESKA_ComputerSystem"},
+    {ClassId::PhysicalPackage, "VESKA_PhysicalPackage"},
+    {ClassId::EnabledLogicalElementCapabilities, "VESKA_EnabledLogicalElementCapabilities"},
+    {ClassId::ComputerSystemPackage, "VESKA_ComputerSystemPackage"},
+    {ClassId::ComputerCapabilities, "VESKA_ComputerCapabilities"},
+    {ClassId::TimeService, "VESKA_TimeService"},
+    {ClassId::TimeServiceAffectsElement, "VESKA_TimeServiceAffectsElement"},
+    {ClassId::CIMServiceConfig, "VESKA_CIMServiceConfig"},
 };
 
 } // namespace
 
 unsigned short findClassId(const char* className) {
-    if (className == nullptr) return ProviderUtilities::CLASS_ID_UNKNOWN;
+    if (className == nullptr) return static_cast<unsigned short>(ClassId::Unknown);
     for (const Row& row : CLASSES) {
-        if (strcasecmp(row.name, className) == 0) return row.id;
+        if (strcasecmp(row.name, className) == 0) return static_cast<unsigned short>(row.id);
     }
-    return ProviderUtilities::CLASS_ID_UNKNOWN;
+    return static_cast<unsigned short>(ClassId::Unknown);
 }
 
 } // namespace VK

@@ -123,8 +123,9 @@ TEST_F(ForkedSyslog, NeverMakesAChildHangWhileOtherThreadsLog) {
     test::isolated([] {
         const Daemon daemon(SOCK_DGRAM);
         std::atomic<bool> stop{false};
+        std::atomic<bool> allSent{false};
         std::thread reader([&] {
-            while (!stop) daemon.next(10);
+            while (!allSent) daemon.next(10);
         });
         std::array<std::thread, 4> loggers;
         for (std::thread& logger : loggers)
@@ -134,7 +135,8 @@ TEST_F(ForkedSyslog, NeverMakesAChildHangWhileOtherThreadsLog) {
         int hung = 0;
         for (int i = 0; i < 200 && hung == 0; ++i) hung += statusOf(logInChild()) == 0 ? 0 : 1;
         stop = true;
-        for (std::thread& logger : loggers) logger.join();
+        for (std::thread& logger : loggers) logger.join(); // one may wait until its line is read
+        allSent = true;
         reader.join();
         EXPECT_EQ(hung, 0);
     });
