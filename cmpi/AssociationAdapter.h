@@ -74,10 +74,9 @@ public:
 
 protected:
     AssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath)
-        : broker(theBroker),
-          nameSpace(ProviderUtilities::getNamespace(objectPath)), requestedClassId{ProviderUtilities::getClassId(
-                                                                      objectPath)},
-          partner(theBroker, context, nameSpace), computer(theBroker, context, nameSpace) {}
+        : broker(theBroker), nameSpace(ProviderUtilities::getNamespace(objectPath)),
+          requestedClassId(ClassId(ProviderUtilities::getClassId(objectPath))), partner(theBroker, context, nameSpace),
+          computer(theBroker, context, nameSpace) {}
     ~AssociationAdapter() = default;
 
     /// A new path of `className` without keys; null when the broker makes none.

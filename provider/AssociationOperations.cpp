@@ -64,12 +64,6 @@ constexpr AssociationRow associationRows[] = {
     row<CMPITimeServiceAffectsElement>("CIM_ServiceAffectsElement"),
 };
 
-const AssociationRow* findRow(unsigned short classId) {
-    for (const AssociationRow& associationRow : associationRows)
-        if (associationRow.classId == ClassId{classId}) return &associationRow;
-    return nullptr;
-}
-
 /// The steps that both operations share; they differ in the column.
 CMPIStatus serve(const OperationFrame& frame, void (*AssociationRow::*column)(const Request&), const Request& request) {
     return frame.runMarked([&](CMPIStatus& status) {
@@ -83,7 +77,7 @@ CMPIStatus serve(const OperationFrame& frame, void (*AssociationRow::*column)(co
             return;
         }
         for (const unsigned short id : ids) {
-            const AssociationRow* const associationRow = findRow(id);
+            const AssociationRow* const associationRow = findRow(associationRows, id);
             if (associationRow != nullptr)
                 (associationRow->*column)(request);
             else

@@ -84,12 +84,6 @@ constexpr ClassRow classRows[] = {
 };
 // clang-format on
 
-const ClassRow* findRow(unsigned short classId) {
-    for (const ClassRow& classRow : classRows)
-        if (classRow.classId == ClassId{classId}) return &classRow;
-    return nullptr;
-}
-
 struct Column {
     Service ClassRow::*service;
     void (*ClassRow::*walk)(const Request&);
@@ -106,7 +100,7 @@ CMPIStatus serve(const OperationFrame& frame, const Column& column, const CMPICo
     return frame.runMarked([&](CMPIStatus& status) {
         const unsigned short classId = ProviderUtilities::getClassId(ref);
         frame.traceClassId(classId);
-        const ClassRow* const classRow = findRow(classId);
+        const ClassRow* const classRow = findRow(classRows, classId);
         const Service service = classRow == nullptr ? NotServed : classRow->*column.service;
         if (service == NotServed) {
             if (column.traceUnserved) frame.traceClassId(classId);

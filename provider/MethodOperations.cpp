@@ -33,16 +33,10 @@ struct MethodRow {
 };
 
 constexpr MethodRow methodRows[] = {
-    {ClassId::TimeService, invoke<CMPITimeService>,
-     "ManageTime"}, // the name is meant: every call on a time service runs this method
+    // The name on purpose: every call on a time service runs this method.
+    {ClassId::TimeService, invoke<CMPITimeService>, "ManageTime"},
     {ClassId::CIMServiceConfig, invoke<CMPICIMServiceConfig>, nullptr},
 };
-
-const MethodRow* findRow(unsigned short classId) {
-    for (const MethodRow& methodRow : methodRows)
-        if (methodRow.classId == ClassId{classId}) return &methodRow;
-    return nullptr;
-}
 
 } // namespace
 
@@ -54,7 +48,7 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, co
     unsigned int returnCode = 0;
 
     const auto work = [&] {
-        const MethodRow* const methodRow = findRow(ProviderUtilities::getClassId(ref));
+        const MethodRow* const methodRow = findRow(methodRows, ProviderUtilities::getClassId(ref));
         if (methodRow == nullptr) {
             returnCode = CMPI_RC_ERR_INVALID_CLASS;
             status.rc = CMPI_RC_ERR_INVALID_CLASS;

@@ -2,7 +2,12 @@
 
 #include "provider/BaseServerProvider.h"
 
+#include "vk/ClassId.h"
+
+#include <algorithm>
+#include <cstddef>
 #include <exception>
+#include <iterator>
 
 namespace VK::BaseServerProvider {
 
@@ -13,6 +18,14 @@ void contained(Step step) {
         step();
     } catch (const std::exception&) { // NOLINT(bugprone-empty-catch): there is nobody left to tell
     }
+}
+
+/// The row of a dispatch table that a class has; null where it has none.
+template <class Row, std::size_t N>
+const Row* findRow(const Row (&rows)[N], unsigned short classId) {
+    const Row* const row =
+        std::find_if(std::begin(rows), std::end(rows), [&](const Row& one) { return one.classId == ClassId{classId}; });
+    return row != std::end(rows) ? row : nullptr;
 }
 
 /// One operation of the object manager: the markers around it, its lines, and the boundary that no exception crosses

@@ -91,6 +91,13 @@ std::string_view firstLine(std::string_view text) {
     return text.substr(0, text.find_first_of("\r\n"));
 }
 
+std::string_view takeLine(std::string_view& text) {
+    const std::size_t end = text.find('\n');
+    const std::string_view line = text.substr(0, end);
+    text.remove_prefix(end == std::string_view::npos ? text.size() : end + 1);
+    return line;
+}
+
 std::string inQuotes(const std::string& text) {
     constexpr std::size_t LONGEST = 64;
     const bool cut = text.size() > LONGEST;

@@ -27,6 +27,9 @@ std::string lowerCase(std::string_view text);
 /// The text up to the first line end.
 std::string_view firstLine(std::string_view text);
 
+/// Takes the next line off the text's front: what stands before its line feed.
+std::string_view takeLine(std::string_view& text);
+
 /// A text from outside as part of a log line: printable, in quotes, cut after 64 bytes.
 std::string inQuotes(const std::string& text);
 

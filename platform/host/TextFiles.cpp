@@ -9,14 +9,6 @@ namespace VK::Host {
 
 namespace {
 
-/// Takes the next line off the text's front.
-std::string_view takeLine(std::string_view& text) {
-    const std::size_t end = text.find('\n');
-    const std::string_view line = text.substr(0, end);
-    text.remove_prefix(end == std::string_view::npos ? text.size() : end + 1);
-    return line;
-}
-
 /// The value of an assignment, without the quotes. What follows a closing quote counts too, as in the shell.
 std::string unquoted(std::string_view value) {
     std::string result;

@@ -2,23 +2,9 @@
 
 #include "tree/Cursor.h"
 
-#include <utility>
-
 namespace VK {
 
 class Instrumentation::Cursor : public Tree::Cursor {};
-
-namespace {
-
-/// Hands out a property that is of the kind asked for.
-template <typename T>
-bool take(std::optional<Tree::Value>&& found, T& value) {
-    T* const content = found ? std::get_if<T>(&*found) : nullptr;
-    if (content != nullptr) value = std::move(*content);
-    return content != nullptr;
-}
-
-} // namespace
 
 Instrumentation::Instrumentation() : cursor(std::make_unique<Cursor>()) {}
 
@@ -49,11 +35,11 @@ void Instrumentation::setFilter(NodeLexicon::PathType type, const std::string& r
 }
 
 bool Instrumentation::getProperty(NodeLexicon::Properties property, std::string& value) const {
-    return take(cursor->read(property), value);
+    return cursor->read(property, value);
 }
 
 bool Instrumentation::getProperty(NodeLexicon::Properties property, unsigned int& value) const {
-    return take(cursor->read(property), value);
+    return cursor->read(property, value);
 }
 
 bool Instrumentation::setProperty(NodeLexicon::Properties property, std::string& value) {

@@ -1,6 +1,6 @@
 #include "providerutilities/ClassTable.h"
 
-#include "vk/ClassId.h"
+#include "vk/ProviderUtilities.h"
 
 #include <strings.h>
 
@@ -27,11 +27,11 @@ constexpr Row CLASSES[] = {
 } // namespace
 
 unsigned short findClassId(const char* className) {
-    if (className == nullptr) return static_cast<unsigned short>(ClassId::Unknown);
+    if (className == nullptr) return ProviderUtilities::CLASS_ID_UNKNOWN;
     for (const Row& row : CLASSES) {
         if (strcasecmp(row.name, className) == 0) return static_cast<unsigned short>(row.id);
     }
-    return static_cast<unsigned short>(ClassId::Unknown);
+    return ProviderUtilities::CLASS_ID_UNKNOWN;
 }
 
 } // namespace VK

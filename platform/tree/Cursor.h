@@ -5,6 +5,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <utility>
 
 namespace VK::Tree {
 
@@ -26,6 +27,14 @@ public:
     void finish() { standOn(nullptr); }
 
     std::optional<Value> read(unsigned int property) const;
+    /// Hands out a property that is of the kind asked for.
+    template <typename T>
+    bool read(unsigned int property, T& value) const {
+        std::optional<Value> found = read(property);
+        T* const content = found ? std::get_if<T>(&*found) : nullptr;
+        if (content != nullptr) value = std::move(*content);
+        return content != nullptr;
+    }
     bool write(unsigned int property, const Value& value);
     std::optional<bool> isReadOnly(unsigned int property) const;
     /// Read once while the cursor stands where it does: what one answer tells of the health is of one moment, and a

@@ -58,10 +58,9 @@ std::string timeServiceNote() {
     Host::TimeFacts facts;
     Tree::Cursor computer;
     computer.selectType(NodeLexicon::ComputerSystemNode);
-    if (const auto time = computer.read(NodeLexicon::SystemTimeProperty))
-        if (const std::string* text = std::get_if<std::string>(&*time)) facts.time = *text;
-    if (const auto automatic = computer.read(NodeLexicon::AutomaticDSTAdjustmentProperty))
-        if (const unsigned int* number = std::get_if<unsigned int>(&*automatic)) facts.automaticDst = *number;
+    computer.read(NodeLexicon::SystemTimeProperty, facts.time);
+    if (unsigned int automatic = 0; computer.read(NodeLexicon::AutomaticDSTAdjustmentProperty, automatic))
+        facts.automaticDst = automatic;
     if (Tree::simulatedHost() == nullptr) facts.zone = Zone::zoneNameOf(Root::host().readLink(Zone::LOCAL_TIME).text);
     facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, whatever is described
     return Host::timeNote(facts);

@@ -60,12 +60,9 @@ std::string checkClockText(const std::string& text, Instant& instant) {
 }
 
 bool adjtimeSaysLocal(std::string_view text) {
-    for (int skipped = 0; skipped < 2; ++skipped) {
-        const std::size_t end = text.find('\n');
-        if (end == std::string_view::npos) return false;
-        text.remove_prefix(end + 1);
-    }
-    return trimmed(firstLine(text)) == "LOCAL";
+    takeLine(text);
+    takeLine(text);
+    return trimmed(takeLine(text)) == "LOCAL";
 }
 
 tm hardwareClockTime(Instant instant, int offsetSeconds) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "vk/ClassId.h"
 #include "vk/Moniker.h"
 
 #include <cmpidt.h>
@@ -20,7 +21,7 @@ namespace VK {
 class ProviderUtilities {
 public:
     /// The class identifier of names that the class table does not hold.
-    static constexpr unsigned short CLASS_ID_UNKNOWN = 255;
+    static constexpr unsigned short CLASS_ID_UNKNOWN = static_cast<unsigned short>(ClassId::Unknown);
 
     /// The identifier of a path's class, or 255. Class names compare without regard to case.
     static unsigned short getClassId(const CMPIObjectPath* objectPath);

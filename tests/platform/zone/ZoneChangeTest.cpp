@@ -1,7 +1,6 @@
 #include "zone/ZoneChange.h"
 
-#include "support/HostCopy.h"
-#include "support/LogCapture.h"
+#include "platform/zone/HostWithZones.h"
 #include "zone/ZoneInForce.h"
 
 #include <gmock/gmock.h>
@@ -21,15 +20,7 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-class ZoneChange : public testing::Test {
-protected:
-    ZoneChange() { takeLog(); }
-
-    Root root() const { return Root(host.path()); }
-    void use(const std::string& zone) { host.useZone(zone); }
-
-    HostCopy host;
-};
+class ZoneChange : public HostWithZones {};
 
 struct Offset {
     int minutes;

@@ -1,6 +1,5 @@
 #include "common/FileLock.h"
-#include "support/HostCopy.h"
-#include "support/LogCapture.h"
+#include "platform/zone/HostWithZones.h"
 #include "zone/ZoneChange.h"
 #include "zone/ZoneInForce.h"
 
@@ -28,15 +27,7 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-class ZoneFilesOfHost : public testing::Test {
-protected:
-    ZoneFilesOfHost() { takeLog(); }
-
-    Root root() const { return Root(host.path()); }
-    void use(const std::string& zone) { host.useZone(zone); }
-
-    HostCopy host;
-};
+class ZoneFilesOfHost : public HostWithZones {};
 
 TEST_F(ZoneFilesOfHost, ThatCannotBeWrittenLeaveTheZoneRememberedBefore) {
     use("Europe/Berlin");
