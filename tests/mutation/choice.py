@@ -24,15 +24,12 @@ class Choice:
         return sorted(name for name in set(listed) if name.endswith((".cpp", ".h")) and (self.root / name).is_file())
 
     def arguments_of(self, file):
-        """How a file is compiled; a header as the nearest source is."""
-        commands = {pathlib.Path(each["file"]): each["command"] for each in
+        """How a file is compiled; a header as the nearest source is, with the include directories of all."""
+        commands = {pathlib.Path(each["file"]): list(taken(each["command"])) for each in
                     json.loads((self.build / "compile_commands.json").read_text())}
         nearest = max(commands, key=lambda path: (path == self.root / file, shared_parts(path, self.root / file), str(path)))
-        words = shlex.split(commands[nearest])
-        for word, value in zip(words, words[1:]):
-            found = TAKEN.fullmatch(word)
-            if found:
-                yield from (word,) if found[2] else (word, value)
+        yield from commands[nearest]
+        yield from sorted({word for words in commands.values() for word in words if word.startswith(("-I", "-isystem"))})
 
     def mutants_of(self, file):
         if file not in self.made:
@@ -77,6 +74,15 @@ class Choice:
                 yield left[file].pop()
             else:
                 del weights[file]
+
+
+def taken(command):
+    """Those of a command's words that say how a source is read."""
+    words = shlex.split(command)
+    for word, value in zip(words, words[1:]):
+        found = TAKEN.fullmatch(word)
+        if found:
+            yield word if found[2] else word + value
 
 
 def shared_parts(one, other):

@@ -69,7 +69,7 @@ class Workspace:
         # A program is not linked again because a library's insides have changed.
         command = ["cmake", "--preset", "release", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON"]
         if self.logged(command) != 0:
-            raise Failure(f"the copy cannot be configured; see {self.log}")
+            raise Failure(f"the copy cannot be configured:\n{self.log.read_text(errors='replace')[-2000:]}")
 
     def sandboxed(self, command):
         return ["bwrap", "--ro-bind", "/", "/", "--dev", "/dev", "--proc", "/proc", "--tmpfs", "/tmp",
