@@ -1,6 +1,6 @@
 #include "common/AtomicFile.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 
 #include <cerrno>
 #include <csignal>

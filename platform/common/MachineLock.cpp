@@ -1,6 +1,6 @@
 #include "vk/MachineLock.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 
 #include <cerrno>
 #include <fcntl.h>

@@ -1,5 +1,7 @@
 #include "common/Text.h"
 
+#include <utf8.h>
+
 #include <algorithm>
 
 namespace VK {
@@ -12,38 +14,15 @@ bool isControl(unsigned char byte) {
     return byte < 0x20 || byte == 0x7F;
 }
 
-std::size_t sequenceLength(unsigned char lead) {
-    if (lead < 0x80) return 1;
-    if (lead >= 0xC2 && lead <= 0xDF) return 2;
-    if (lead >= 0xE0 && lead <= 0xEF) return 3;
-    if (lead >= 0xF0 && lead <= 0xF4) return 4;
-    return 0;
-}
-
-/// The second byte tells overlong forms, surrogates and numbers beyond Unicode.
-bool secondByteFits(unsigned char lead, unsigned char second) {
-    switch (lead) {
-    case 0xE0:
-        return second >= 0xA0;
-    case 0xED:
-        return second <= 0x9F;
-    case 0xF0:
-        return second >= 0x90;
-    case 0xF4:
-        return second <= 0x8F;
-    default:
-        return true;
-    }
-}
-
 /// The length of the UTF-8 sequence that the text starts with; 0 when it is none.
 std::size_t utf8Length(std::string_view text) {
-    const auto lead = static_cast<unsigned char>(text.front());
-    const std::size_t length = sequenceLength(lead);
-    if (length == 0 || length > text.size()) return 0;
-    for (std::size_t i = 1; i < length; ++i)
-        if ((static_cast<unsigned char>(text[i]) & 0xC0) != 0x80) return 0;
-    return length == 1 || secondByteFits(lead, static_cast<unsigned char>(text[1])) ? length : 0;
+    const char* position = text.data();
+    try {
+        utf8::next(position, text.data() + text.size());
+    } catch (const utf8::exception&) {
+        return 0;
+    }
+    return static_cast<std::size_t>(position - text.data());
 }
 
 } // namespace

@@ -1,6 +1,6 @@
 #include "logger/FileSink.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "logger/Write.h"
 
 #include <atomic>

@@ -1,6 +1,6 @@
 #include "logger/SyslogSink.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "logger/Line.h"
 
 #include <atomic>

@@ -1,7 +1,7 @@
 #include "tree/TreeFile.h"
 
 #include "common/AtomicFile.h"
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "common/FileLock.h"
 #include "logger/LogLine.h"
 

@@ -1,6 +1,6 @@
 #include "zone/Clock.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "common/Text.h"
 #include "logger/LogLine.h"
 #include "zone/ZoneInForce.h"

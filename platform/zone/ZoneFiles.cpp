@@ -1,6 +1,6 @@
 #include "zone/ZoneFiles.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "common/FileLock.h"
 #include "logger/LogLine.h"
 #include "zone/ZoneInForce.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "zone/SavedFile.h"
 
 #include <optional>

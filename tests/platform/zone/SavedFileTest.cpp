@@ -1,6 +1,6 @@
 #include "zone/SavedFile.h"
 
-#include "common/FileDescriptor.h"
+#include "logger/FileDescriptor.h"
 #include "support/Synchronised.h"
 #include "support/TemporaryDirectory.h"
 
