@@ -11,6 +11,8 @@
 #include <memory>
 #include <optional>
 #include <stdexcept>
+#include <thread>
+#include <vector>
 
 #include <dlfcn.h>
 
@@ -22,10 +24,11 @@ constexpr char usage[] =
 broker calls alone that make the same answer. Times are those of the provider's function, without the object manager's
 own work around it.
 
-usage: provider-bench [--live] [BENCHMARK OPTIONS]
-       provider-bench [--live] --run NAME TIMES
+usage: provider-bench [--live] [--cold] [BENCHMARK OPTIONS]
+       provider-bench [--live] [--cold] --run NAME TIMES
 
   --live            ask about this machine instead of simulated hosts
+  --cold            as in a server that does other things: walk over 8 MiB before each request, and use a new thread for it
   --run NAME TIMES  run one benchmark so many times, measuring nothing: for a program that counts
   --help            this text; --benchmark_list_tests lists the names, --benchmark_filter=REGEX chooses
 
@@ -33,8 +36,8 @@ usage: provider-bench [--live] [BENCHMARK OPTIONS]
 
 /// The provider and its floor, each in an object manager of its own.
 struct Bench {
-    explicit Bench(bool live)
-        : host(live), provider(PROVIDER_LIBRARY, "BaseServerProvider", "root/cimv2"),
+    Bench(bool live, bool coldRequests)
+        : host(live), cold(coldRequests), provider(PROVIDER_LIBRARY, "BaseServerProvider", "root/cimv2"),
           floor(FLOOR_LIBRARY, "Floor", "root/cimv2") {
         void* const library = dlopen(FLOOR_LIBRARY, RTLD_NOW | RTLD_NOLOAD);
         if (library == nullptr) throw std::runtime_error("the floor's library is not loaded");
@@ -44,6 +47,7 @@ struct Bench {
     }
 
     Host host;
+    const bool cold;
     om::ObjectManager provider;
     om::ObjectManager floor;
     decltype(&Floor_Prepare) prepareFloor;
@@ -56,6 +60,14 @@ struct Case {
     int computers;
     bool ofFloor;
 };
+
+/// Fills the processor's caches with something else.
+void walkOverMemory() {
+    constexpr std::size_t size = std::size_t{8} << 20, cacheLine = 64;
+    static std::vector<unsigned char> bytes(size);
+    for (std::size_t i = 0; i < size; i += cacheLine) ++bytes[i];
+    benchmark::DoNotOptimize(bytes.data());
+}
 
 /// What a case runs, with the host made ready for it.
 class Prepared {
@@ -71,6 +83,15 @@ public:
 
     /// Runs it once: the time in the provider's function, or nothing when the answer was another one than before.
     std::optional<std::chrono::nanoseconds> run() {
+        if (!bench.cold) return runHere();
+        walkOverMemory();
+        std::optional<std::chrono::nanoseconds> elapsed;
+        std::thread([&] { elapsed = runHere(); }).join();
+        return elapsed;
+    }
+
+private:
+    std::optional<std::chrono::nanoseconds> runHere() {
         std::chrono::nanoseconds elapsed{0};
         const om::Answer now = (ofFloor ? bench.floor : bench.provider).run(request, &elapsed);
         const bool same =
@@ -78,7 +99,6 @@ public:
         return same ? std::optional(elapsed) : std::nullopt;
     }
 
-private:
     Bench& bench;
     const bool ofFloor;
     om::Request request;
@@ -184,7 +204,8 @@ int run(int argc, char** argv) {
         std::fputs(usage, stdout);
         return 0;
     }
-    Bench bench(take(argc, argv, "--live"));
+    const bool live = take(argc, argv, "--live"), cold = take(argc, argv, "--cold");
+    Bench bench(live, cold);
     if (!take(argc, argv, "--run")) return runBenchmarks(bench, argc, argv);
     if (argc != 3) {
         std::fputs(usage, stderr);
