@@ -56,7 +56,7 @@ struct Bench {
 /// One benchmark: a row at one number of computers, of the provider or of its floor.
 struct Case {
     std::string name;
-    const Row* row;
+    Row row;
     int computers;
     bool ofFloor;
 };
@@ -74,7 +74,7 @@ class Prepared {
 public:
     Prepared(Bench& theBench, const Case& theCase) : bench(theBench), ofFloor(theCase.ofFloor) {
         bench.host.use(theCase.computers);
-        request = requestOf(*theCase.row, bench.provider);
+        request = requestOf(theCase.row, bench.provider);
         answer = bench.provider.run(request);
         if (answer.code != CMPI_RC_OK || answer.results.empty())
             throw std::runtime_error(theCase.name + ": the provider has no answer");
@@ -108,11 +108,11 @@ private:
 /// Each floor before what stands on it, so that the ratio is known when that is measured.
 std::vector<Case> cases(bool live) {
     std::vector<Case> all;
-    for (const Row& row : rows) {
+    for (const Row& row : rows()) {
         for (const int computers : live ? one : row.computers) {
             const std::string name = nameOf(row, live, computers);
-            all.push_back({name + "/floor", &row, computers, true});
-            all.push_back({name, &row, computers, false});
+            all.push_back({name + "/floor", row, computers, true});
+            all.push_back({name, row, computers, false});
         }
     }
     return all;

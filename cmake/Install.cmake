@@ -66,8 +66,8 @@ vk_configured(docs/man/vk-provider-register.8.in ${CMAKE_INSTALL_MANDIR}/man8 pr
 vk_configured(docs/man/vk-provider-check.8.in ${CMAKE_INSTALL_MANDIR}/man8 tools FILES)
 vk_configured(docs/man/vk-host-snapshot.8.in ${CMAKE_INSTALL_MANDIR}/man8 tools FILES)
 vk_configured(docs/man/vkcim.1.in ${CMAKE_INSTALL_MANDIR}/man1 tools FILES)
-install(FILES tools/vkcim.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
+install(FILES ${VK_SCHEMA_DIR}/vkcim.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
     RENAME vkcim COMPONENT tools)
-install(FILES docs/json/vkcim.schema.json docs/json/vk-provider-check.schema.json
+install(FILES ${VK_SCHEMA_DIR}/vkcim.schema.json docs/json/vk-provider-check.schema.json
     DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/vk-baseserver-tools COMPONENT tools)
 install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/examples COMPONENT tools)

@@ -16,8 +16,8 @@ namespace VK::BaseServerProvider {
 /// associations. `Ends` is the data class that knows one end from the other.
 ///
 /// `Self` says its class (`className`), the identifiers of the association and of the partner's class
-/// (`associationClassId`, `partnerClassId`), the reference names in order (`computerRole`, `partnerRole`,
-/// `computerFirst`), whether there is a pair to make a path of (`hasPair()`) and whose trace lines it writes
+/// (`associationClassId`, `partnerClassId`), the reference names (`computerRole`, `partnerRole`, and in the order in
+/// which they are set `roles`), whether there is a pair to make a path of (`hasPair()`) and whose trace lines it writes
 /// (`traceSource()`).
 template <class Self, class Partner, class Ends>
 class AssociationAdapter {
@@ -33,7 +33,7 @@ public:
         if (!static_cast<const Self&>(*this).hasPair()) return nullptr;
         CMPIObjectPath* path = keylessPath(Self::className);
         if (path == nullptr) return nullptr; // what was refused is logged
-        for (const char* role : roles()) {
+        for (const char* role : Self::roles) {
             CMPIObjectPath* const end = role == Self::computerRole ? computer.getObjectPath() : partner.getObjectPath();
             if (end == nullptr || !ProviderUtilities::setKeyProperty(path, role, end)) return nullptr;
         }
@@ -48,7 +48,7 @@ public:
         if (path == nullptr) return nullptr;
         CMPIInstance* instance = ProviderUtilities::createInstance(broker, path);
         if (instance == nullptr) return nullptr;
-        for (const char* role : roles()) {
+        for (const char* role : Self::roles) {
             CMPIObjectPath* reference = nullptr;
             if (ProviderUtilities::getKeyProperty(path, role, &reference))
                 ProviderUtilities::setProperty(instance, role, reference);
@@ -132,17 +132,6 @@ private:
         moniker.getName(name);
         moniker.getValue(value);
         return !value.empty() || ProviderUtilities::getKeyProperty(path, name.c_str(), value);
-    }
-
-    /// The reference names in the order in which they are set.
-    struct Roles {
-        const char* names[2];
-        const char* const* begin() const { return names; }
-        const char* const* end() const { return names + 2; }
-    };
-    static Roles roles() {
-        if (Self::computerFirst) return {{Self::computerRole, Self::partnerRole}};
-        return {{Self::partnerRole, Self::computerRole}};
     }
 };
 

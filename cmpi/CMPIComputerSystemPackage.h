@@ -32,7 +32,7 @@ public:
     static constexpr ClassId partnerClassId = ClassId::PhysicalPackage;
     static constexpr char computerRole[] = "Dependent";
     static constexpr char partnerRole[] = "Antecedent";
-    static constexpr bool computerFirst = false;
+    static constexpr const char* roles[] = {partnerRole, computerRole};
     static const TraceSource& traceSource();
 };
 

@@ -25,7 +25,7 @@ public:
     static constexpr ClassId partnerClassId = ClassId::EnabledLogicalElementCapabilities;
     static constexpr char computerRole[] = "ManagedElement";
     static constexpr char partnerRole[] = "Capabilities";
-    static constexpr bool computerFirst = true;
+    static constexpr const char* roles[] = {computerRole, partnerRole};
     static const TraceSource& traceSource();
 };
 

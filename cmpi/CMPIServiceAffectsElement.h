@@ -32,7 +32,7 @@ public:
     static constexpr ClassId partnerClassId = ClassId::TimeService;
     static constexpr char computerRole[] = "AffectedElement";
     static constexpr char partnerRole[] = "AffectingElement";
-    static constexpr bool computerFirst = true;
+    static constexpr const char* roles[] = {computerRole, partnerRole};
     static const TraceSource& traceSource();
 
 private:

@@ -22,10 +22,10 @@ public:
     }
 
     /// One of these, or a text of up to 15 bytes of any kind.
-    template <std::size_t Size>
-    std::string text(const std::array<const char*, Size>& known) {
-        const std::size_t choice = below(Size + 1);
-        if (choice < Size) return known[choice];
+    template <class Known>
+    std::string text(const Known& known) {
+        const std::size_t choice = below(known.size() + 1);
+        if (choice < known.size()) return known[choice];
         std::string made(below(16), '\0');
         for (char& character : made) character = static_cast<char>(byte());
         return made;

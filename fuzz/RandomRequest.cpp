@@ -5,20 +5,17 @@
 namespace fuzz {
 namespace {
 
-constexpr std::array<const char*, 14> classes = {"VESKA_ComputerSystem",
-                                                 "VESKA_PhysicalPackage",
-                                                 "VESKA_EnabledLogicalElementCapabilities",
-                                                 "VESKA_ComputerSystemPackage",
-                                                 "VESKA_ComputerCapabilities",
-                                                 "VESKA_TimeService",
-                                                 "VESKA_TimeServiceAffectsElement",
-                                                 "VESKA_CIMServiceConfig",
-                                                 "CIM_ElementCapabilities",
-                                                 "CIM_ComputerSystemPackage",
-                                                 "CIM_ServiceAffectsElement",
-                                                 "CIM_Dependency",
-                                                 "CIM_ComputerSystem",
-                                                 "veska_computersystem"};
+/// Those that are served, superclasses and another spelling.
+const std::vector<std::string>& classes() {
+    static const std::vector<std::string> names = [] {
+        std::vector<std::string> all = om::Schema::builtin().served();
+        for (const char* more : {"CIM_ElementCapabilities", "CIM_ComputerSystemPackage", "CIM_ServiceAffectsElement",
+                                 "CIM_Dependency", "CIM_ComputerSystem", "veska_computersystem"})
+            all.emplace_back(more);
+        return all;
+    }();
+    return names;
+}
 
 constexpr std::array<const char*, 12> keyNames = {
     "Name",      "name",           "Tag",          "InstanceID",      "SystemName",       "Antecedent",
@@ -92,7 +89,7 @@ om::Value randomKey(Choices& choices, const std::string& hostName, int depth) {
 om::ObjectPath randomPath(Choices& choices, const std::string& hostName, int depth) {
     om::ObjectPath path;
     path.nameSpace = choices.oneIn(8) ? "" : "root/cimv2";
-    path.className = choices.text(classes);
+    path.className = choices.text(classes());
     for (std::size_t i = choices.below(4); i > 0; --i) {
         const std::string name = choices.text(keyNames);
         path.keys.emplace_back(name, randomKey(choices, hostName, depth));
@@ -100,8 +97,8 @@ om::ObjectPath randomPath(Choices& choices, const std::string& hostName, int dep
     return path;
 }
 
-template <std::size_t Size>
-std::optional<std::string> perhaps(Choices& choices, const std::array<const char*, Size>& known) {
+template <class Known>
+std::optional<std::string> perhaps(Choices& choices, const Known& known) {
     if (choices.oneIn(2)) return std::nullopt;
     return choices.text(known);
 }
@@ -122,8 +119,8 @@ om::Request randomRequest(Choices& choices, const std::string& hostName) {
     om::Request request;
     request.operation = static_cast<om::Operation>(choices.below(operations));
     request.path = randomPath(choices, hostName, 2);
-    request.assocClass = perhaps(choices, classes);
-    request.resultClass = perhaps(choices, classes);
+    request.assocClass = perhaps(choices, classes());
+    request.resultClass = perhaps(choices, classes());
     request.role = perhaps(choices, keyNames);
     request.resultRole = perhaps(choices, keyNames);
     request.method = choices.text(methods);

@@ -47,6 +47,30 @@ const ClassDeclaration* Schema::find(std::string_view className) const {
     return resolved == nullptr ? nullptr : resolved->declaration;
 }
 
+std::vector<std::string> Schema::served(bool associations) const {
+    static constexpr std::string_view standard = "CIM_";
+    std::vector<std::string> names;
+    for (const ClassDeclaration& declared : classes_) {
+        const bool own = !sameName(std::string_view(declared.name).substr(0, standard.size()), standard);
+        if (own && declared.association == associations) names.push_back(declared.name);
+    }
+    return names;
+}
+
+std::vector<std::string> Schema::servedClasses() const {
+    return served(false);
+}
+
+std::vector<std::string> Schema::servedAssociations() const {
+    return served(true);
+}
+
+std::vector<std::string> Schema::served() const {
+    std::vector<std::string> names = servedClasses();
+    for (std::string& association : servedAssociations()) names.push_back(std::move(association));
+    return names;
+}
+
 const PropertyDeclaration* Schema::findProperty(std::string_view className, std::string_view property) const {
     const ResolvedClass* resolved = resolve(className);
     return resolved == nullptr ? nullptr : resolved->findProperty(property);

@@ -64,6 +64,11 @@ public:
     static const Schema& builtin();
 
     const std::vector<ClassDeclaration>& classes() const { return classes_; }
+    /// Names of the classes, or of the associations, that are not the standard's (CIM_): the ones that a provider
+    /// serves, in the order of their declaration. `served` is the classes and then the associations.
+    std::vector<std::string> servedClasses() const;
+    std::vector<std::string> servedAssociations() const;
+    std::vector<std::string> served() const;
     /// The class, property or method of that name, or null.
     const ClassDeclaration* find(std::string_view className) const;
     const ResolvedClass* resolve(std::string_view className) const;
@@ -74,6 +79,7 @@ public:
 
 private:
     void inherit(ResolvedClass& resolved) const;
+    std::vector<std::string> served(bool associations) const;
 
     std::vector<ClassDeclaration> classes_; ///< never changed again: the tables point into it
     std::unordered_map<std::string_view, ResolvedClass, NameHash, NameEqual> index_;

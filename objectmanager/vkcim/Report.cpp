@@ -3,21 +3,21 @@
 #include "objectmanager/model/Names.h"
 #include "objectmanager/vkcim/PathText.h"
 
+#include <algorithm>
+
 #include <sys/utsname.h>
 
 namespace vkcim {
 namespace {
 
-/// Which reference of an association is drawn above the other.
+/// Which reference of an association is drawn above the other, by the names that the standard's associations give them.
 struct Direction {
-    const char* association;
     const char* above;
     const char* below;
 };
 
-constexpr Direction directions[] = {{"VESKA_ComputerSystemPackage", "Antecedent", "Dependent"},
-                                    {"VESKA_ComputerCapabilities", "ManagedElement", "Capabilities"},
-                                    {"VESKA_TimeServiceAffectsElement", "AffectingElement", "AffectedElement"}};
+constexpr Direction directions[] = {
+    {"Antecedent", "Dependent"}, {"ManagedElement", "Capabilities"}, {"AffectingElement", "AffectedElement"}};
 
 std::string kernelsHostName() {
     utsname names{};
@@ -26,9 +26,12 @@ std::string kernelsHostName() {
 
 /// The described host's, which a snapshot's or a simulated one's is not the kernel's; that stands for a provider that
 /// does not serve computer systems, and so describes no other host.
-std::string hostName(const om::Answer& computers) {
-    if (computers.code != CMPI_RC_OK) return kernelsHostName();
-    for (const auto& result : computers.results) {
+std::string hostName(const Report::Answers& classes) {
+    const auto computers = std::find_if(classes.begin(), classes.end(), [](const auto& answered) {
+        return om::sameName(answered.first, "VESKA_ComputerSystem");
+    });
+    if (computers == classes.end() || computers->second.code != CMPI_RC_OK) return kernelsHostName();
+    for (const auto& result : computers->second.results) {
         const auto* computer = std::get_if<om::Instance>(&result);
         if (!computer) continue;
         for (const auto& [name, value] : computer->path.keys) {
@@ -51,13 +54,8 @@ std::string referenceText(const om::Instance& instance, const char* name, const 
 
 } // namespace
 
-const std::vector<std::string> reportClasses = {"VESKA_ComputerSystem", "VESKA_PhysicalPackage",
-                                                "VESKA_EnabledLogicalElementCapabilities", "VESKA_TimeService",
-                                                "VESKA_CIMServiceConfig"};
-const std::vector<std::string> reportAssociations = {"VESKA_ComputerSystemPackage", "VESKA_ComputerCapabilities",
-                                                     "VESKA_TimeServiceAffectsElement"};
-
-Report makeReport(const std::string& nameSpace, const std::optional<std::vector<std::string>>& properties,
+Report makeReport(const om::Schema& schema, const std::string& nameSpace,
+                  const std::optional<std::vector<std::string>>& properties,
                   const std::function<om::Answer(const om::Request&)>& run,
                   const std::function<std::vector<std::string>()>& notes) {
     const auto ask = [&](const std::vector<std::string>& classNames) {
@@ -73,9 +71,9 @@ Report makeReport(const std::string& nameSpace, const std::optional<std::vector<
         return answers;
     };
     Report report;
-    report.classes = ask(reportClasses);
-    report.host = hostName(report.classes.front().second);
-    report.associations = ask(reportAssociations);
+    report.classes = ask(schema.servedClasses());
+    report.host = hostName(report.classes);
+    report.associations = ask(schema.servedAssociations());
     report.notes = notes();
     return report;
 }
@@ -83,13 +81,13 @@ Report makeReport(const std::string& nameSpace, const std::optional<std::vector<
 std::vector<Link> links(const Report::Answers& associations, const std::string& nameSpace, const om::Schema& schema) {
     std::vector<Link> found;
     for (const auto& [name, answer] : associations) {
-        for (const Direction& direction : directions) {
-            if (!om::sameName(direction.association, name)) continue;
-            for (const auto& result : answer.results) {
-                const auto* instance = std::get_if<om::Instance>(&result);
-                if (!instance) continue;
-                found.push_back({referenceText(*instance, direction.above, nameSpace, schema),
-                                 referenceText(*instance, direction.below, nameSpace, schema), name});
+        for (const auto& result : answer.results) {
+            const auto* instance = std::get_if<om::Instance>(&result);
+            if (!instance) continue;
+            for (const Direction& direction : directions) {
+                const Link link = {referenceText(*instance, direction.above, nameSpace, schema),
+                                   referenceText(*instance, direction.below, nameSpace, schema), name};
+                if (!link.above.empty() || !link.below.empty()) found.push_back(link);
             }
         }
     }

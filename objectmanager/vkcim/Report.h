@@ -10,10 +10,6 @@
 
 namespace vkcim {
 
-/// What `report` asks: the instance classes and the associations, in the order of their class identifiers.
-extern const std::vector<std::string> reportClasses;
-extern const std::vector<std::string> reportAssociations;
-
 struct Report {
     using Answers = std::vector<std::pair<std::string, om::Answer>>;
 
@@ -23,8 +19,10 @@ struct Report {
     std::vector<std::string> notes;
 };
 
-/// Asks every class and association for its instances. `run` runs one request; `notes` is asked last.
-Report makeReport(const std::string& nameSpace, const std::optional<std::vector<std::string>>& properties,
+/// Asks every class and then every association that the schema says is served for its instances. `run` runs one
+/// request; `notes` is asked last.
+Report makeReport(const om::Schema& schema, const std::string& nameSpace,
+                  const std::optional<std::vector<std::string>>& properties,
                   const std::function<om::Answer(const om::Request&)>& run,
                   const std::function<std::vector<std::string>()>& notes);
 

@@ -71,7 +71,7 @@ private:
     Report askEverything(Timing& timing) const {
         om::ObjectManager manager(library(), arguments.provider, arguments.nameSpace, schema);
         return makeReport(
-            arguments.nameSpace, arguments.properties,
+            schema, arguments.nameSpace, arguments.properties,
             [&](const om::Request& request) { return manager.run(request, &timing.runs.emplace_back()); },
             [&] { return hostNotes(arguments.provider); });
     }

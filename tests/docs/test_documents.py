@@ -30,6 +30,13 @@ class Names(unittest.TestCase):
             self.assertIn(test, sources, f"{document}: {program}")
 
 
+class Classes(unittest.TestCase):
+    def test_each_has_a_row_in_the_readme(self):
+        text = (SOURCE / "README.md").read_text(encoding="utf-8")
+        for file in (SOURCE / "schema").glob("*.mof"):
+            self.assertIn(f"\n| {file.stem} | ", text)
+
+
 class Rooms(unittest.TestCase):
     def test_include_what_the_architecture_says(self):
         text = (SOURCE / "docs/architecture.md").read_text(encoding="utf-8")

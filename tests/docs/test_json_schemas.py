@@ -16,19 +16,20 @@ except ImportError:
 
 SOURCE = Path(__file__).resolve().parents[2]
 VKCIM = os.environ["VKCIM"]
-CHECK = Path(os.environ["VK_BUILD_DIR"]) / "installed/vk-provider-check"
+BUILD = Path(os.environ["VK_BUILD_DIR"])
+CHECK = BUILD / "installed/vk-provider-check"
 HOST = {"VK_INSTRUMENTATION_TREE": str(SOURCE / "docs/examples/rack-server.json"), "NVLOG_SINK": "none"}
 COMPUTER = 'VESKA_ComputerSystem.CreationClassName="VESKA_ComputerSystem",Name="node7"'
 CLASSES = [file.stem for file in (SOURCE / "schema").glob("VESKA_*.mof")]
 
 
-def schema(name):
-    document = json.loads((SOURCE / f"docs/json/{name}.schema.json").read_text(encoding="utf-8"))
+def schema(file):
+    document = json.loads(file.read_text(encoding="utf-8"))
     jsonschema.Draft202012Validator.check_schema(document)
     return document
 
 
-SCHEMA = schema("vkcim")
+SCHEMA = schema(BUILD / "schema/vkcim.schema.json")
 VALIDATOR = jsonschema.Draft202012Validator(SCHEMA)
 TIMING = jsonschema.Draft202012Validator({"$defs": SCHEMA["$defs"], "$ref": "#/$defs/timing"})
 
@@ -173,7 +174,7 @@ class Strictness(unittest.TestCase):
 
 
 class Check(unittest.TestCase):
-    VALIDATOR = jsonschema.Draft202012Validator(schema("vk-provider-check"))
+    VALIDATOR = jsonschema.Draft202012Validator(schema(SOURCE / "docs/json/vk-provider-check.schema.json"))
 
     def test_what_it_prints(self):
         for folder in ("/", str(SOURCE)):

@@ -17,11 +17,6 @@ namespace {
 namespace fs = std::filesystem;
 using om::Operation;
 
-constexpr const char* instanceClasses[] = {"VESKA_ComputerSystem", "VESKA_PhysicalPackage",
-                                           "VESKA_EnabledLogicalElementCapabilities", "VESKA_TimeService",
-                                           "VESKA_CIMServiceConfig"};
-constexpr const char* associationClasses[] = {"VESKA_ComputerSystemPackage", "VESKA_ComputerCapabilities",
-                                              "VESKA_TimeServiceAffectsElement"};
 constexpr const char* associationBases[] = {"CIM_SystemPackaging", "CIM_ElementCapabilities", "CIM_Dependency"};
 
 std::string hostName() {
@@ -147,15 +142,16 @@ std::string ask(om::ObjectManager& manager, const om::Request& request) {
 std::vector<Kind> allKinds(om::ObjectManager& manager) {
     Collection collection(manager);
     std::vector<om::ObjectPath> ends;
-    for (const char* className : instanceClasses) {
+    const std::vector<std::string> associations = om::Schema::builtin().servedAssociations();
+    for (const std::string& className : om::Schema::builtin().servedClasses()) {
         collection.addReading(className);
         for (const om::ObjectPath& path : collection.namesOf(className)) ends.push_back(path);
         ends.push_back(test::path(className));
     }
-    for (const char* className : associationClasses) collection.addReading(className);
+    for (const std::string& className : associations) collection.addReading(className);
     ends.push_back(test::path("VESKA_ComputerSystem", {{"Name", "nobody"}}));
     for (const om::ObjectPath& end : ends) {
-        for (const char* className : associationClasses) collection.addWalks(end, className);
+        for (const std::string& className : associations) collection.addWalks(end, className);
         for (const char* className : associationBases) collection.addWalks(end, className);
         collection.addOthers(end);
     }

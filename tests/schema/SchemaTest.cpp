@@ -1,12 +1,5 @@
 #include "objectmanager/model/Schema.h"
-#include "cmpi/CMPICIMServiceConfig.h"
-#include "cmpi/CMPIComputerSystem.h"
-#include "cmpi/CMPIComputerSystemPackage.h"
-#include "cmpi/CMPIElementCapabilities.h"
-#include "cmpi/CMPIEnabledLogicalElementCapabilities.h"
-#include "cmpi/CMPIPhysicalPackage.h"
-#include "cmpi/CMPIServiceAffectsElement.h"
-#include "cmpi/CMPITimeService.h"
+#include "schema/Adapters.h" // made from the headers in cmpi
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
@@ -44,7 +37,12 @@ struct Produced {
 };
 
 template <class Adapter>
-Produced instanceClass() {
+concept Association = requires {
+    Adapter::roles;
+};
+
+template <class Adapter>
+Produced produced() {
     Produced produced{Adapter::className, {}, {}};
     for (const auto& property : Adapter::properties) {
         produced.properties[property.name] = std::visit(
@@ -58,24 +56,27 @@ Produced instanceClass() {
     return produced;
 }
 
-template <class Adapter>
-Produced association(Types added = {}) {
-    Produced produced{Adapter::className, std::move(added), {Adapter::computerRole, Adapter::partnerRole}};
-    for (const std::string& role : produced.keys) produced.properties[role] = CMPI_ref;
+template <Association Adapter>
+Produced produced() {
+    Produced produced{Adapter::className, {}, {}};
+    for (const char* role : Adapter::roles) {
+        produced.keys.insert(role);
+        produced.properties[role] = CMPI_ref;
+    }
+    if constexpr (std::is_same_v<Adapter, CMPIComputerSystemPackage>) produced.properties["PlatformGUID"] = CMPI_string;
     return produced;
 }
 
+template <class... Adapters>
+struct List {};
+
+template <class... Adapters>
+std::vector<Produced> allOf(List<Adapters...>) {
+    return {produced<Adapters>()...};
+}
+
 const std::vector<Produced>& producedClasses() {
-    static const std::vector<Produced> classes = {
-        instanceClass<CMPIComputerSystem>(),
-        instanceClass<CMPIPhysicalPackage>(),
-        instanceClass<CMPIEnabledLogicalElementCapabilities>(),
-        instanceClass<CMPITimeService>(),
-        instanceClass<CMPICIMServiceConfig>(),
-        association<CMPIElementCapabilities>(),
-        association<CMPIComputerSystemPackage>({{"PlatformGUID", CMPI_string}}),
-        association<CMPITimeServiceAffectsElement>(),
-    };
+    static const std::vector<Produced> classes = allOf(List<ALL_ADAPTERS>());
     return classes;
 }
 
@@ -102,17 +103,13 @@ Names declaredKeys(const std::string& className) {
 }
 
 Names ours() {
-    Names names;
-    for (const auto& declared : schema().classes())
-        if (declared.name.rfind("VESKA_", 0) == 0) names.insert(declared.name);
-    return names;
+    const std::vector<std::string> served = schema().served();
+    return {served.begin(), served.end()};
 }
 
 void simulateRichHost() {
-    test::Node computer = test::computer(0, "node7");
-    computer.properties[115] = "owner@example.com";
-    computer.properties[116] = "Owner";
-    test::simulate({computer, test::chassis(0, 0, "C0")});
+    std::ifstream example(VK_EXAMPLE_HOST);
+    test::simulateText({std::istreambuf_iterator<char>(example), {}});
 }
 
 TEST(Schema, DeclaresExactlyTheClassesThatAreServed) {

@@ -70,7 +70,7 @@ class Completion(unittest.TestCase):
 
     def complete(self, typed):
         rc = folder() / "rc"
-        rc.write_text(f". '{SOURCE}/tools/vkcim.bash-completion'\nPS1='$ '\nbind 'set enable-bracketed-paste off'\n"
+        rc.write_text(f". '{BUILD}/schema/vkcim.bash-completion'\nPS1='$ '\nbind 'set enable-bracketed-paste off'\n"
                       "bind 'set bell-style none'\n"
                       "vkcim() { printf '<%s>' \"$@\"; echo; }\n", encoding="utf-8")
         text = on_a_terminal(["bash", "--noprofile", "--rcfile", rc, "-i"], f"vkcim {typed}\t\nexit\n".encode())
