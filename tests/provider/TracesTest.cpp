@@ -142,6 +142,15 @@ om::ObjectPath firstOf(const std::string& className) {
     return test::paths(test::names(className)).at(0);
 }
 
+/// The classes at the ends of an association, the computer first; of another class none.
+std::vector<std::string> endsOf(const std::string& className) {
+    std::vector<std::string> ends;
+    for (const om::PropertyDeclaration* key : om::Schema::builtin().resolve(className)->keys)
+        if (key->type == CMPI_ref)
+            ends.insert(key->referenceClass == "VESKA_ComputerSystem" ? ends.begin() : ends.end(), key->referenceClass);
+    return ends;
+}
+
 /// The requests of one class, in order, each with its title.
 std::vector<std::pair<std::string, om::Request>> requestsOf(const std::string& className) {
     const om::ObjectPath all = test::path(className);
@@ -151,24 +160,16 @@ std::vector<std::pair<std::string, om::Request>> requestsOf(const std::string& c
     };
     if (!test::names(className).results.empty())
         requests.emplace_back("GetInstance", asking(Operation::GetInstance, firstOf(className)));
-    const std::pair<const char*, const char*> ends[] = {
-        {"VESKA_ComputerSystemPackage", "VESKA_PhysicalPackage"},
-        {"VESKA_ComputerCapabilities", "VESKA_EnabledLogicalElementCapabilities"},
-        {"VESKA_TimeServiceAffectsElement", "VESKA_TimeService"},
-    };
-    for (const auto& [association, partner] : ends) {
-        if (className != association) continue;
-        for (const char* source : {"VESKA_ComputerSystem", partner}) {
-            om::Request request = asking(Operation::Associators, firstOf(source));
-            request.assocClass = association;
-            request.resultClass = "CIM_ManagedElement";
-            request.operation = Operation::AssociatorNames;
-            requests.emplace_back(std::string("AssociatorNames of ") + source + ", with a class above", request);
-            request.resultClass.reset();
-            requests.emplace_back(std::string("AssociatorNames of ") + source, request);
-            request.operation = Operation::Associators;
-            requests.emplace_back(std::string("Associators of ") + source, request);
-        }
+    for (const std::string& source : endsOf(className)) {
+        om::Request request = asking(Operation::Associators, firstOf(source));
+        request.assocClass = className;
+        request.resultClass = "CIM_ManagedElement";
+        request.operation = Operation::AssociatorNames;
+        requests.emplace_back("AssociatorNames of " + source + ", with a class above", request);
+        request.resultClass.reset();
+        requests.emplace_back("AssociatorNames of " + source, request);
+        request.operation = Operation::Associators;
+        requests.emplace_back("Associators of " + source, request);
     }
     if (className == "VESKA_ComputerSystem")
         requests.emplace_back("AssociatorNames without an association class",

@@ -10,8 +10,8 @@ _PEGASUS = ("cimserver", "cimprovider", "cimmof", "cimcli", "cimconfig")
 _SFCB = ("sfcbd", "sfcbstage", "sfcbunstage", "sfcbrepos", "sfcbmofpp", "systemctl")
 _QUESTIONS = re.compile("cimprovider -l|cimconfig -g|cimcli (gc|ei|ni)|systemctl is-active|sfcb(stage|repos) -h|sfcbmofpp")
 # What the classes derive from, as a CIM schema of version 2.22 has it.
-_SCHEMA = ("CIM_ManagedElement CIM_ComputerSystem CIM_PhysicalPackage CIM_EnabledLogicalElementCapabilities CIM_TimeService "
-           "CIM_ElementCapabilities CIM_ComputerSystemPackage CIM_ServiceAffectsElement")
+_FACTS = Path(__file__).resolve().parents[2] / "schema/superclasses.facts"
+_SCHEMA = " ".join(re.findall(r"^CIM_\w+", _FACTS.read_text(encoding="utf-8"), re.M))
 
 
 class Fake:
