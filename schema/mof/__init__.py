@@ -1,1 +1,1 @@
-"""A reader of MOF class declarations: enough of the language for classes, and every check a MOF compiler makes of them."""
+"""A reader of MOF class declarations, with every check that a MOF compiler makes of them."""

@@ -1,12 +1,44 @@
 """What a MOF compiler checks of class declarations, and what we ask of our own beyond that."""
 
-from typing import Iterable, List
+from typing import Iterable, List, Optional, Tuple
 
-from .model import INTEGERS, Class, Method, MofError, Place, Property, Qualified, Schema, Type
-from .qualifiers import STANDARD, fits
+from .model import INTEGERS, Class, Feature, MofError, Place, Schema, Type
 
-_SCOPE_NAMES = {"c": "a class", "a": "an association", "p": "a property", "r": "a reference", "m": "a method",
-                "i": "a parameter"}
+# The standard qualifiers as DSP0004 spells them, by what they may stand on and the type of their value. c class,
+# a association, p property, r reference, m method, i parameter.
+_STANDARD = """
+a boolean Aggregation Association
+c boolean Exception
+ca boolean Abstract Terminal
+ca string UMLPackagePath Version
+ca string[] ClassConstraint
+caprmi boolean Experimental
+caprmi string Description DisplayName
+caprmi string[] Deprecated MappingStrings ModelCorrespondence
+i boolean In Out
+m string[] MethodConstraint
+p string NullValue Propagated
+p string[] Correlatable
+pi string ArrayType
+pm boolean Static
+pmi boolean Counter DN EmbeddedObject Gauge IsPUnit OctetString
+pmi integer MaxLen MaxValue MinLen MinValue
+pmi string EmbeddedInstance PUnit Units
+pmi string[] BitMap BitValues ValueMap Values
+pr boolean Key Read Write
+pr string[] PropertyConstraint
+prm string Override
+prmi boolean Required
+r boolean Aggregate Weak
+r integer Max Min
+"""
+_QUALIFIERS = {name.lower(): (scopes, kind) for scopes, kind, *names in map(str.split, _STANDARD.strip().splitlines())
+               for name in names}
+_SCOPES = {"c": "a class", "a": "an association", "p": "a property", "r": "a reference", "m": "a method",
+           "i": "a parameter"}
+
+# What may be wrong: whether it is, and the words for it.
+Complaint = Tuple[object, str]
 
 
 class Checker:
@@ -19,182 +51,139 @@ class Checker:
     def add(self, classes: Iterable[Class], ours: bool = True) -> None:
         """`ours` asks for a description and a version everywhere, and refuses what only the standard's files may do."""
         for declared in classes:
-            if self._may_be_declared(declared):
+            name, superclass = declared.name, declared.superclass
+            before, above = self.schema.find(name), self.schema.find(superclass)
+            if before is not None:
+                self._note(declared.place, [(True, f"class {name} is declared already at {before.place}")])
+            elif superclass is not None and above is None:
+                self._note(declared.place, [(True, f"superclass {superclass} of {name} is not declared")])
+            else:
                 self.schema.add(declared)
-                self._check(declared, ours)
+                self._check(declared, above, ours)
 
-    def _wrong(self, place: Place, text: str) -> None:
-        self.errors.append(MofError(place, text))
+    def _note(self, place: Place, complaints: Iterable[Complaint]) -> None:
+        self.errors += [MofError(place, text) for wrong, text in complaints if wrong]
 
-    def _may_be_declared(self, declared: Class) -> bool:
-        before = self.schema.find(declared.name)
-        if before is not None:
-            self._wrong(declared.place, f"class {declared.name} is declared already at {before.place}")
-            return False
-        if declared.superclass is not None and self.schema.find(declared.superclass) is None:
-            self._wrong(declared.place, f"superclass {declared.superclass} of {declared.name} is not declared")
-            return False
-        return True
-
-    def _check(self, declared: Class, ours: bool) -> None:
-        prefix, mark, rest = declared.name.partition("_")
-        if not (prefix and mark and rest):
-            self._wrong(declared.place, f"class name {declared.name} lacks a schema's prefix")
-        if ours and prefix.upper() == "CIM":
-            self._wrong(declared.place, f"class {declared.name} is one of the standard's")
-        self._check_qualifiers(declared, "a" if declared.association else "c", declared.place, declared.name)
-        self._check_association(declared)
-        self._check_names(declared)
-        for prop in declared.properties:
-            self._check_property(declared, prop, ours)
-        for method in declared.methods:
-            self._check_method(declared, method)
-        if not self.schema.keys(declared) and not declared.is_marked("Abstract") and ours:
-            self._wrong(declared.place, f"class {declared.name} has no key")
+    def _check(self, declared: Class, above: Optional[Class], ours: bool) -> None:
+        self._note(declared.place, self._of_class(declared, above))
         if ours:
-            self._check_ours(declared)
-
-    def _check_association(self, declared: Class) -> None:
-        marks = [q.name.lower() for q in declared.qualifiers]
-        if declared.association and marks[0] != "association":
-            self._wrong(declared.place, f"Association is not the first qualifier of {declared.name}")
-        above = self.schema.find(declared.superclass)
-        if above is not None and above.association != declared.association:
-            self._wrong(declared.place, f"{declared.name} and its superclass {above.name} are not both associations")
-        line = [declared, *self.schema.ancestors(declared)]
-        references = {p.name.lower() for c in line for p in c.properties if p.type.reference}
-        if declared.association and len(references) < 2:
-            self._wrong(declared.place, f"association {declared.name} has fewer than two references")
-        if not declared.association and references:
-            self._wrong(declared.place, f"class {declared.name} has references and is no association")
-
-    def _check_names(self, declared: Class) -> None:
+            self._note(declared.place, self._of_our_class(declared))
         seen = {}
-        for feature in [*declared.properties, *declared.methods]:
-            name = feature.name.lower()
-            if name in seen:
-                self._wrong(feature.place, f"{declared.name}.{feature.name} is declared already at {seen[name]}")
-            seen.setdefault(name, feature.place)
+        for feature, name, scope in _features(declared):
+            self._check_qualifiers(feature, name, scope)
+            self._note(feature.place, self._of_any(feature, name))
+            self._note(feature.place, [(ours and not feature.qualifier("Description"), f"{name} has no description")])
+            first = seen.setdefault(name.lower(), feature)
+            if scope == "i":
+                undirected = feature.qualifier("In") is None and feature.qualifier("Out") is None
+                self._note(feature.place, [(first is not feature, f"parameter {name} stands there twice"),
+                                           (undirected, f"{name} is neither In nor Out")])
+            else:
+                self._note(feature.place, [(first is not feature, f"{name} is declared already at {first.place}")])
+            if scope == "m":
+                self._note(feature.place, self._of_method(declared, feature, name))
+            elif scope in "pr":
+                self._note(feature.place, self._of_property(declared, feature, name))
+                if feature.is_marked("Key"):
+                    self._note(feature.place, self._of_key(above, feature, name, ours))
 
-    def _check_qualifiers(self, feature: Qualified, scope: str, place: Place, name: str) -> None:
-        for qualifier in feature.qualifiers:
-            known = STANDARD.get(qualifier.name.lower())
-            if known is None:
-                self._wrong(qualifier.place, f"unknown qualifier {qualifier.name} on {name}")
+    def _of_class(self, declared: Class, above: Optional[Class]) -> Iterable[Complaint]:
+        name, association = declared.name, declared.association
+        prefix, mark, rest = name.partition("_")
+        references = {p.name.lower() for c in self.schema.line(declared) for p in c.properties if p.type.reference}
+        yield not (prefix and mark and rest), f"class name {name} lacks a schema's prefix"
+        late = association and next(iter(declared.qualifiers)) != "association"
+        yield late, f"Association is not the first qualifier of {name}"
+        if above is not None:
+            yield above.association != association, f"{name} and its superclass {above.name} are not both associations"
+        yield association and len(references) < 2, f"association {name} has fewer than two references"
+        yield not association and references, f"class {name} has references and is no association"
+
+    def _of_our_class(self, declared: Class) -> Iterable[Complaint]:
+        name, version = declared.name, declared.qualifier("Version")
+        numbers = [part for part in version.split(".") if part.isdigit()] if isinstance(version, str) else []
+        yield name.partition("_")[0].upper() == "CIM", f"class {name} is one of the standard's"
+        yield not self.schema.keys(declared) and not declared.is_marked("Abstract"), f"class {name} has no key"
+        yield len(numbers) != 3, f"class {name} has no version of three numbers"
+
+    def _check_qualifiers(self, feature: Feature, name: str, scope: str) -> None:
+        for qualifier in feature.qualifiers.values():
+            scopes, kind = _QUALIFIERS.get(qualifier.name.lower(), (None, None))
+            if scopes is None:
+                self._note(qualifier.place, [(True, f"unknown qualifier {qualifier.name} on {name}")])
                 continue
-            kind, scopes = known
-            if scope not in scopes:
-                self._wrong(qualifier.place, f"{qualifier.name} may not stand on {_SCOPE_NAMES[scope]}, as {name} is")
-            if not fits(kind, qualifier.value):
-                self._wrong(qualifier.place, f"{qualifier.name} of {name} takes a {kind}")
+            on = f"{qualifier.name} may not stand on {_SCOPES[scope]}, as {name} is"
+            fits = _is_value(qualifier.value, Type(kind.removesuffix("[]"), kind.endswith("[]")))
+            takes = f"{qualifier.name} of {name} takes a {kind}"
+            self._note(qualifier.place, [(scope not in scopes, on), (not fits, takes)])
 
-    def _check_value_map(self, feature, name: str) -> None:
+    def _of_any(self, feature: Feature, name: str) -> Iterable[Complaint]:
+        if feature.type is not None and feature.type.reference:
+            unknown = self.schema.find(feature.type.name) is None
+            yield unknown, f"{name} refers to {feature.type.name}, which is not declared"
         numbers, texts = feature.qualifier("ValueMap"), feature.qualifier("Values")
         if numbers is None and texts is None:
             return
         if not isinstance(numbers, list) or not isinstance(texts, list) or len(numbers) != len(texts):
-            self._wrong(feature.place, f"ValueMap and Values of {name} do not pair")
+            yield True, f"ValueMap and Values of {name} do not pair"
             return
-        if feature.type.name in INTEGERS:
-            for number in numbers:
-                if not _is_range(number, feature.type):
-                    self._wrong(feature.place, f"'{number}' in the ValueMap of {name} is no {feature.type.name}")
-        if len(set(numbers)) != len(numbers):
-            self._wrong(feature.place, f"a value stands twice in the ValueMap of {name}")
+        for number in numbers if feature.type.name in INTEGERS else ():
+            yield not _is_range(number, feature.type), f"'{number}' in the ValueMap of {name} is no {feature.type.name}"
+        yield len(set(numbers)) != len(numbers), f"a value stands twice in the ValueMap of {name}"
 
-    def _check_reference(self, kind: Type, place: Place, name: str) -> None:
-        if not kind.reference:
-            return
-        if self.schema.find(kind.name) is None:
-            self._wrong(place, f"{name} refers to {kind.name}, which is not declared")
-
-    def _check_property(self, declared: Class, prop: Property, ours: bool) -> None:
-        name = f"{declared.name}.{prop.name}"
-        self._check_qualifiers(prop, "r" if prop.type.reference else "p", prop.place, name)
-        self._check_value_map(prop, name)
-        self._check_reference(prop.type, prop.place, name)
-        if prop.type.reference and prop.type.array:
-            self._wrong(prop.place, f"reference {name} is an array")
-        if prop.default is not None and not _is_default(prop.default, prop.type):
-            self._wrong(prop.place, f"the default of {name} is no {prop.type}")
+    def _of_property(self, declared: Class, prop: Feature, name: str) -> Iterable[Complaint]:
+        yield prop.type.reference and prop.type.array, f"reference {name} is an array"
+        wrong = prop.default is not None and not _is_value(prop.default, prop.type)
+        yield wrong, f"the default of {name} is no {prop.type}"
         inherited = self.schema.inherited(declared, "properties", prop.name)
-        self._check_override(prop, inherited, name)
-        if inherited is not None and not self._narrows(prop.type, inherited.type):
-            self._wrong(prop.place, f"{name} is {prop.type}, but {inherited.type} in a superclass")
-        self._check_key(declared, prop, inherited, ours)
+        yield from _of_override(prop, inherited, name)
+        if inherited:
+            above = inherited[0].type
+            yield not self._narrows(prop.type, above), f"{name} is {prop.type}, but {above} in a superclass"
 
-    def _check_override(self, feature, inherited, name: str) -> None:
-        override = feature.qualifier("Override")
-        if inherited is None and override is not None:
-            self._wrong(feature.place, f"{name} overrides what no superclass declares")
-        if inherited is not None and override is None:
-            self._wrong(feature.place, f"{name} is inherited and declared again without Override")
-        if isinstance(override, str) and override.lower() != feature.name.lower():
-            self._wrong(feature.place, f"{name} overrides {override}, which is named otherwise")
-
-    def _narrows(self, kind: Type, inherited: Type) -> bool:
-        if kind.reference and inherited.reference:
-            return kind.array == inherited.array and self.schema.is_a(kind.name, inherited.name)
-        return kind == inherited
-
-    def _check_key(self, declared: Class, prop: Property, inherited, ours: bool) -> None:
-        if not prop.is_marked("Key"):
-            return
-        name = f"{declared.name}.{prop.name}"
-        if prop.type.array:
-            self._wrong(prop.place, f"key {name} is an array")
-        above = self.schema.find(declared.superclass)
-        keys = self.schema.keys(above) if above is not None else []
-        if ours and prop.name.lower() in [k.lower() for k in keys]:
-            self._wrong(prop.place, f"{name} redefines an inherited key")
-        elif ours and keys:
-            self._wrong(prop.place, f"{name} adds a key to those of {declared.superclass}")
-
-    def _check_method(self, declared: Class, method: Method) -> None:
-        name = f"{declared.name}.{method.name}"
-        self._check_qualifiers(method, "m", method.place, name)
-        self._check_value_map(method, name)
-        if method.type.reference or method.type.array:
-            self._wrong(method.place, f"{name} returns {method.type}")
-        seen = set()
-        for parameter in method.parameters:
-            full = f"{name}({parameter.name})"
-            self._check_qualifiers(parameter, "i", parameter.place, full)
-            self._check_value_map(parameter, full)
-            self._check_reference(parameter.type, parameter.place, full)
-            if parameter.name.lower() in seen:
-                self._wrong(parameter.place, f"parameter {full} stands there twice")
-            seen.add(parameter.name.lower())
-            if parameter.qualifier("In") is None and parameter.qualifier("Out") is None:
-                self._wrong(parameter.place, f"{full} is neither In nor Out")
+    def _of_method(self, declared: Class, method: Feature, name: str) -> Iterable[Complaint]:
         inherited = self.schema.inherited(declared, "methods", method.name)
-        self._check_override(method, inherited, name)
-        if inherited is not None and _signature(method) != _signature(inherited):
-            self._wrong(method.place, f"{name} differs from the method that it overrides, at {inherited.place}")
+        yield from _of_override(method, inherited, name)
+        if inherited:
+            differs = _signature(method) != _signature(inherited[0])
+            yield differs, f"{name} differs from the method that it overrides, at {inherited[0].place}"
 
-    def _check_ours(self, declared: Class) -> None:
-        version = declared.qualifier("Version")
-        if not isinstance(version, str) or len([p for p in version.split(".") if p.isdigit()]) != 3:
-            self._wrong(declared.place, f"class {declared.name} has no version of three numbers")
-        for what, name in _described(declared):
-            if not what.qualifier("Description"):
-                self._wrong(what.place, f"{name} has no description")
+    def _narrows(self, kind: Type, above: Type) -> bool:
+        if kind.reference and above.reference:
+            line = self.schema.line(self.schema.find(kind.name))
+            return kind.array == above.array and any(c.is_named(above.name) for c in line)
+        return kind == above
+
+    def _of_key(self, above: Optional[Class], prop: Feature, name: str, ours: bool) -> Iterable[Complaint]:
+        keys = [key.lower() for key in self.schema.keys(above)] if ours else []
+        again = prop.name.lower() in keys
+        yield prop.type.array, f"key {name} is an array"
+        yield again, f"{name} redefines an inherited key"
+        yield keys and not again, f"{name} adds a key to those of {above.name if above else ''}"
 
 
-def _described(declared: Class):
-    yield declared, declared.name
+def _features(declared: Class):
+    """Everything in a class that may carry qualifiers, with its full name and scope."""
+    yield declared, declared.name, "a" if declared.association else "c"
     for prop in declared.properties:
-        yield prop, f"{declared.name}.{prop.name}"
+        yield prop, f"{declared.name}.{prop.name}", "r" if prop.type.reference else "p"
     for method in declared.methods:
-        yield method, f"{declared.name}.{method.name}"
+        yield method, f"{declared.name}.{method.name}", "m"
         for parameter in method.parameters:
-            yield parameter, f"{declared.name}.{method.name}({parameter.name})"
+            yield parameter, f"{declared.name}.{method.name}({parameter.name})", "i"
 
 
-def _signature(method: Method):
-    def is_in(parameter) -> bool:
-        return parameter.qualifier("In") is not False
-    return (method.type, [(p.name.lower(), p.type, is_in(p), p.is_marked("Out")) for p in method.parameters])
+def _of_override(feature: Feature, inherited: List[Feature], name: str) -> Iterable[Complaint]:
+    override = feature.qualifier("Override")
+    yield not inherited and override is not None, f"{name} overrides what no superclass declares"
+    yield inherited and override is None, f"{name} is inherited and declared again without Override"
+    other = isinstance(override, str) and not feature.is_named(override)
+    yield other, f"{name} overrides {override}, which is named otherwise"
+
+
+def _signature(method: Feature):
+    return (method.type, [(p.name.lower(), p.type, p.qualifier("In") is not False, p.is_marked("Out"))
+                          for p in method.parameters])
 
 
 def _is_range(text: str, kind: Type) -> bool:
@@ -204,14 +193,14 @@ def _is_range(text: str, kind: Type) -> bool:
     return text.count("..") <= 1 and all(e.lstrip("-").isdigit() and low <= int(e) <= high for e in ends)
 
 
-def _is_default(value, kind: Type) -> bool:
+def _is_value(value, kind: Type) -> bool:
     if kind.array:
-        return isinstance(value, list) and all(_is_default(v, Type(kind.name)) for v in value)
+        return isinstance(value, list) and all(_is_value(each, Type(kind.name)) for each in value)
+    if isinstance(value, bool) or kind.name == "boolean":
+        return isinstance(value, bool) and kind.name == "boolean"
     if kind.name in INTEGERS:
         low, high = INTEGERS[kind.name]
-        return isinstance(value, int) and not isinstance(value, bool) and low <= value <= high
-    if kind.name == "boolean":
-        return isinstance(value, bool)
+        return isinstance(value, int) and low <= value <= high
     if kind.name.startswith("real"):
-        return isinstance(value, (int, float)) and not isinstance(value, bool)
-    return isinstance(value, str)
+        return isinstance(value, (int, float))
+    return isinstance(value, int if kind.name == "integer" else str)

@@ -5,100 +5,66 @@ from typing import Dict, List, Tuple
 
 from .model import MofError, Place
 
-_CLASS = re.compile(r"^(?P<name>\w+)(?:\s*<\s*(?P<above>\w+))?(?P<association>\s+association)?$")
-_METHOD = re.compile(r"^(?P<type>\w+)\s+(?P<name>\w+)\((?P<parameters>.*)\)$")
-_PROPERTY = re.compile(r"^(?P<key>key\s+)?(?P<type>\w+)(?P<ref>\s+ref)?\s+(?P<name>\w+)(?P<array>\[\])?"
-                       r"(?:\s*=\s*(?P<default>\d+))?$")
-_PARAMETER = re.compile(
-    r"^(?P<in>in\s+)?(?P<out>out\s+)?(?P<type>\w+)(?P<ref>\s+ref)?\s+(?P<name>\w+)(?P<array>\[\])?$")
+_FEATURE = r"(?P<type>\w+)(?P<ref>\s+ref)?\s+(?P<name>\w+)(?P<array>\[\])?"
+_FACTS = {what: re.compile(f"^{pattern}$") for what, pattern in {
+    "a class": r"(?P<name>\w+)(?:\s*<\s*(?P<above>\w+))?(?P<association>\s+association)?",
+    "a method": r"(?P<type>\w+)\s+(?P<name>\w+)\((?P<parameters>.*)\)",
+    "a property": rf"(?P<key>key\s+)?{_FEATURE}(?:\s*=\s*(?P<default>\d+))?",
+    "a parameter": rf"(?P<in>in\s+)?(?P<out>out\s+)?{_FEATURE}"}.items()}
 
 
-class _Stub:
-    def __init__(self, file: str):
-        self._file = file
-        self._lines: List[str] = []
-        self._open = False
-        self._name = ""
-        self._above: Dict[str, str] = {}
-        self._declared: Dict[str, List[str]] = {}
-
-    def line(self, number: int, text: str, indented: bool) -> None:
-        place = Place(self._file, number)
-        if not indented:
-            self._class(_match(_CLASS, text, place, "a class"))
-        elif not self._open:
-            raise MofError(place, "a property before the first class")
-        elif "(" in text:
-            self._method(_match(_METHOD, text, place, "a method"), place)
-        else:
-            self._property(_match(_PROPERTY, text, place, "a property"))
-
-    def text(self) -> str:
-        self._close()
-        return "\n".join(self._lines) + "\n"
-
-    def _close(self) -> None:
-        if self._open:
-            self._lines += ["};", ""]
-
-    def _class(self, match) -> None:
-        self._close()
-        self._open = True
-        self._name = match["name"]
-        self._declared[self._name] = []
-        if match["above"]:
-            self._above[self._name] = match["above"]
-        if match["association"]:
-            self._lines.append("[Association]")
-        self._lines.append(f"class {self._name}" + (f" : {match['above']}" if match["above"] else "") + " {")
-
-    def _is_inherited(self, name: str) -> bool:
-        above = self._above.get(self._name)
-        while above is not None:
-            if name in self._declared.get(above, []):
-                return True
-            above = self._above.get(above)
-        return False
-
-    def _property(self, match) -> None:
-        marks = []
-        if self._is_inherited(match["name"]):
-            marks.append(f'Override("{match["name"]}")')
-        if match["key"]:
-            marks.append("Key")
-        self._declared[self._name].append(match["name"])
-        qualifiers = f"[{', '.join(marks)}] " if marks else ""
-        self._lines.append(f"    {qualifiers}{match['type']}{' REF' if match['ref'] else ''} "
-                           f"{match['name']}{match['array'] or ''}"
-                           + (f" = {match['default']};" if match["default"] else ";"))
-
-    def _method(self, match, place: Place) -> None:
-        parameters = []
-        for text in filter(None, (p.strip() for p in match["parameters"].split(","))):
-            p = _match(_PARAMETER, text, place, "a parameter")
-            marks = "In" if p["in"] else "In(false)"
-            marks += ", Out" if p["out"] else ""
-            parameters.append(f"[{marks}] {p['type']}{' REF' if p['ref'] else ''} {p['name']}{p['array'] or ''}")
-        self._lines.append(f"    {match['type']} {match['name']}({', '.join(parameters)});")
-
-
-def _match(pattern, text: str, place: Place, what: str):
-    found = pattern.match(text)
+def _read(what: str, text: str, place: Place):
+    found = _FACTS[what].match(text)
     if found is None:
         raise MofError(place, f"'{text}' is not {what}")
     return found
 
 
+def _feature(found) -> str:
+    return f"{found['type']}{' REF' if found['ref'] else ''} {found['name']}{found['array'] or ''}"
+
+
+def _method(text: str, place: Place) -> str:
+    method, parameters = _read("a method", text, place), []
+    for each in filter(None, map(str.strip, method["parameters"].split(","))):
+        parameter = _read("a parameter", each, place)
+        marks = ("In" if parameter["in"] else "In(false)") + (", Out" if parameter["out"] else "")
+        parameters.append(f"[{marks}] {_feature(parameter)}")
+    return f"{method['type']} {method['name']}({', '.join(parameters)});"
+
+
+def _property(found, inherited: bool) -> str:
+    marks = [f'Override("{found["name"]}")'] * inherited + ["Key"] * bool(found["key"])
+    default = f" = {found['default']}" if found["default"] else ""
+    return f"{'[' + ', '.join(marks) + '] ' if marks else ''}{_feature(found)}{default};"
+
+
 def stub(text: str, file: str) -> str:
-    """The stub in MOF of a facts file: a class a paragraph, `NAME`, `NAME < SUPERCLASS`, ` association` behind it; below
-    it, indented, `[key] TYPE [ref] NAME[[]] [= NUMBER]` for a property and `TYPE NAME([in] [out] TYPE [ref] NAME, ...)` for a
-    method; `#` starts a comment. Raises MofError."""
-    made = _Stub(file)
+    """The stub in MOF of a facts file: a class a paragraph, `NAME`, `NAME < SUPERCLASS`, ` association` behind it;
+    below it, indented, `[key] TYPE [ref] NAME[[]] [= NUMBER]` for a property and `TYPE NAME([in] [out] TYPE [ref] NAME,
+    ...)` for a method; `#` starts a comment. Raises MofError."""
+    lines: List[str] = []
+    names: Dict[str, List[str]] = {}  # of a class's properties, with those that it inherits
+    inherited: List[str] = []
+    current: List[str] = []
     for number, line in enumerate(text.splitlines(), 1):
-        content = line.split("#")[0].rstrip()
-        if content:
-            made.line(number, content.strip(), content[0].isspace())
-    return made.text()
+        place, content = Place(file, number), line.split("#")[0].strip()
+        if content and not line[0].isspace():
+            found = _read("a class", content, place)
+            lines += ["};", ""] if names else []
+            lines += ["[Association]"] if found["association"] else []
+            lines.append(f"class {found['name']}{' : ' + found['above'] if found['above'] else ''} {{")
+            inherited = names.get(found["above"], [])
+            current = names[found["name"]] = list(inherited)
+        elif content and not names:
+            raise MofError(place, "a property before the first class")
+        elif "(" in content:
+            lines.append(f"    {_method(content, place)}")
+        elif content:
+            found = _read("a property", content, place)
+            lines.append(f"    {_property(found, found['name'] in inherited)}")
+            current.append(found["name"])
+    return "\n".join([*lines, *(["};", ""] if names else [])]) + "\n"
 
 
 def split(text: str) -> Tuple[str, ...]:

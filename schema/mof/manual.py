@@ -2,7 +2,7 @@
 
 from typing import List
 
-from .model import Class, Method, Property, Schema
+from .model import Class, Feature, Schema
 
 
 def _escaped(text: str) -> str:
@@ -17,14 +17,14 @@ def _values(feature) -> str:
     return " Values: " + ", ".join(f"{n} {t}" for n, t in zip(numbers, texts)) + "."
 
 
-def _property(schema: Schema, declared: Class, prop: Property) -> List[str]:
+def _property(schema: Schema, declared: Class, prop: Feature) -> List[str]:
     marks = ["key"] if schema.is_key(declared, prop) else []
     marks += ["writable"] if prop.is_marked("Write") else []
     marks = f" ({', '.join(marks)})" if marks else ""
     return [".TP", f"\\fB{prop.name}\\fR, {prop.type}{marks}", _escaped(prop.qualifier("Description") + _values(prop))]
 
 
-def _method(method: Method) -> List[str]:
+def _method(method: Feature) -> List[str]:
     lines = [".TP", f"\\fB{method.name}\\fR(), {method.type}", _escaped(method.qualifier("Description")), ".RS"]
     for parameter in method.parameters:
         way = "in, out" if parameter.is_marked("Out") and parameter.is_marked("In") else "in"
@@ -37,7 +37,8 @@ def classes(schema: Schema, ours: List[Class]) -> str:
     """Each class with its properties, where their values come from, and its methods."""
     lines: List[str] = []
     for declared in ours:
-        lines += [f".SS {declared.name}", f"Derived from {declared.superclass}.", _escaped(declared.qualifier("Description"))]
+        lines += [f".SS {declared.name}", f"Derived from {declared.superclass}.",
+                  _escaped(declared.qualifier("Description"))]
         for prop in declared.properties:
             lines += _property(schema, declared, prop)
         for method in declared.methods:

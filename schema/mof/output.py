@@ -1,47 +1,42 @@
 """What is made of a schema: the object manager's table in C++, a description in JSON, one MOF file."""
 
 import json
-from typing import Any, Dict, List
+from typing import Any, Dict, List, Union
 
-from .model import Class, Method, Parameter, Property, Schema, Type
+from .model import Class, Feature, Schema, Type
 
 _CODES = {"datetime": "dateTime"}
 
 
 def _code(kind: Type) -> str:
-    if kind.reference:
-        return "CMPI_refA" if kind.array else "CMPI_ref"
-    return f"CMPI_{_CODES.get(kind.name, kind.name)}" + ("A" if kind.array else "")
+    return f"CMPI_{'ref' if kind.reference else _CODES.get(kind.name, kind.name)}{'A' if kind.array else ''}"
 
 
-def _text(value: str) -> str:
+def _printed(value: Union[str, bool]) -> str:
     return json.dumps(value)  # our names need no more than C++ and JSON have in common
 
 
-def _bool(value: bool) -> str:
-    return "true" if value else "false"
-
-
 def _declaration(name: str, kind: Type, key: bool) -> str:
-    return f"{{{_text(name)}, {_code(kind)}, {_bool(key)}, {_text(kind.name if kind.reference else '')}}}"
+    return f"{{{_printed(name)}, {_code(kind)}, {_printed(key)}, {_printed(kind.name if kind.reference else '')}}}"
 
 
-def _parameter(parameter: Parameter) -> str:
+def _parameter(parameter: Feature) -> str:
     is_in = parameter.qualifier("In") is not False
-    return (f"{{{_declaration(parameter.name, parameter.type, False)}, {_bool(is_in)}, "
-            f"{_bool(parameter.is_marked('Out'))}}}")
+    return (f"{{{_declaration(parameter.name, parameter.type, False)}, {_printed(is_in)}, "
+            f"{_printed(parameter.is_marked('Out'))}}}")
 
 
-def _method(method: Method) -> str:
+def _method(method: Feature) -> str:
     parameters = ", ".join(_parameter(p) for p in method.parameters)
-    return f"{{{_text(method.name)}, {_code(method.type)}, {{{parameters}}}}}"
+    return f"{{{_printed(method.name)}, {_code(method.type)}, {{{parameters}}}}}"
 
 
 def _class(schema: Schema, declared: Class) -> List[str]:
     def listed(items: List[str]) -> str:
         return "{" + "".join(f"\n         {item}," for item in items) + "}"
     properties = [_declaration(p.name, p.type, schema.is_key(declared, p)) for p in declared.properties]
-    return [f"    {{{_text(declared.name)}, {_text(declared.superclass or '')}, {_bool(declared.association)},",
+    head = ", ".join(map(_printed, (declared.name, declared.superclass or "", declared.association)))
+    return [f"    {{{head},",
             f"     {listed(properties)},",
             f"     {listed([_method(m) for m in declared.methods])}}},"]
 
@@ -57,15 +52,13 @@ def cpp(schema: Schema) -> str:
     return "\n".join(lines)
 
 
-def _facts(feature) -> Dict[str, Any]:
-    facts: Dict[str, Any] = {"name": feature.name, "type": str(feature.type)}
-    for name in ("ValueMap", "Description"):
-        if feature.qualifier(name) is not None:
-            facts[name] = feature.qualifier(name)
-    return facts
+def _facts(feature: Feature) -> Dict[str, Any]:
+    qualifiers = {name: feature.qualifier(name) for name in ("ValueMap", "Description")}
+    said = {name: value for name, value in qualifiers.items() if value is not None}
+    return {"name": feature.name, "type": str(feature.type), **said}
 
 
-def _property_facts(schema: Schema, declared: Class, prop: Property) -> Dict[str, Any]:
+def _property_facts(schema: Schema, declared: Class, prop: Feature) -> Dict[str, Any]:
     return {**_facts(prop), "key": schema.is_key(declared, prop), "write": prop.is_marked("Write")}
 
 

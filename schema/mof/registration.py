@@ -23,12 +23,7 @@ class Provider:
 
 def kinds(declared: Class) -> List[int]:
     """What the provider does for a class. It runs the methods that the class itself declares, and no inherited one."""
-    found = [INSTANCE]
-    if declared.association:
-        found.append(ASSOCIATION)
-    if declared.methods:
-        found.append(METHOD)
-    return found
+    return [INSTANCE] + [ASSOCIATION] * declared.association + [METHOD] * bool(declared.methods)
 
 
 def _instance(name: str, properties) -> str:
@@ -47,21 +42,16 @@ def module_instances(provider: Provider, classes: List[Class]) -> str:
         ("Vendor", provider.vendor), ("Version", provider.version), ("InterfaceType", "CMPI"),
         ("InterfaceVersion", "2.0.0")])]
     made.append(_instance("PG_Provider", [("ProviderModuleName", provider.module), ("Name", provider.name)]))
-    for declared in classes:
-        made.append(_instance("PG_ProviderCapabilities", [
-            ("ProviderModuleName", provider.module), ("ProviderName", provider.name),
-            ("CapabilityID", f"{provider.module}.{declared.name}"), ("ClassName", declared.name),
-            ("Namespaces", [provider.namespace]), ("ProviderType", kinds(declared)),
-            ("SupportedProperties", None), ("SupportedMethods", None)]))
+    made += [_instance("PG_ProviderCapabilities", [
+        ("ProviderModuleName", provider.module), ("ProviderName", provider.name),
+        ("CapabilityID", f"{provider.module}.{declared.name}"), ("ClassName", declared.name),
+        ("Namespaces", [provider.namespace]), ("ProviderType", kinds(declared)),
+        ("SupportedProperties", None), ("SupportedMethods", None)]) for declared in classes]
     return "\n".join(made).replace("= null;", "= NULL;")
 
 
 def stanzas(provider: Provider, classes: List[Class]) -> str:
     """A stanza a class, each class once."""
-    made = []
-    for declared in classes:
-        made.append("\n".join([f"[{declared.name}]", f"   provider: {provider.name}",
-                               f"   location: {provider.location}",
-                               f"   type: {' '.join(_WORDS[k] for k in kinds(declared))}",
-                               f"   namespace: {provider.namespace}", "#", ""]))
-    return "".join(made)
+    return "".join(f"[{declared.name}]\n   provider: {provider.name}\n   location: {provider.location}\n"
+                   f"   type: {' '.join(_WORDS[kind] for kind in kinds(declared))}\n"
+                   f"   namespace: {provider.namespace}\n#\n" for declared in classes)

@@ -3,47 +3,50 @@
 import contextlib
 import os
 import re
+from pathlib import Path
+
+from owner import Owner
+
+# The provider asks the processor and the firmware; the kernel's clock for KVM guests stands for the processor here.
+KVM = {"devices/system/clocksource/clocksource0/available_clocksource": r"\bkvm-clock\b",
+       "class/dmi/id/product_name": "^KVM", "class/dmi/id/sys_vendor": "^QEMU"}
 
 
-def is_kvm(root):
-    """The provider asks the processor and the firmware; the kernel's clock for KVM guests stands for the processor here."""
-    signs = {"devices/system/clocksource/clocksource0/available_clocksource": r"\bkvm-clock\b",
-             "class/dmi/id/product_name": "^KVM", "class/dmi/id/sys_vendor": "^QEMU"}
-    for file, sign in signs.items():
-        with contextlib.suppress(OSError), open(f"{root}/sys/{file}", encoding="utf-8", errors="replace") as text:
-            if re.search(sign, text.read(), re.M):
-                return True
-    return False
+class Cimconfig(Owner):
+    name = title = "cimconfig"
 
+    def is_kvm(self):
+        for file, sign in KVM.items():
+            with contextlib.suppress(OSError):
+                if re.search(sign, Path(f"{self.root}/sys/{file}").read_text(encoding="utf-8", errors="replace"), re.M):
+                    return True
+        return False
 
-def can_run(root, path):
-    """A link counts by where it leads below the root."""
-    for _ in range(40):  # as many as the kernel follows
-        if not os.path.islink(path):
-            break
-        there = os.readlink(path)
-        path = root + there if there.startswith("/") else os.path.join(os.path.dirname(path), there)
-    return os.path.isfile(path) and os.access(path, os.X_OK)
+    def can_run(self, path):
+        """A link counts by where it leads below the root."""
+        for _ in range(40):  # as many as the kernel follows
+            if os.path.islink(path):
+                there = os.readlink(path)
+                path = self.root + there if there.startswith("/") else os.path.join(os.path.dirname(path), there)
+        return os.path.isfile(path) and os.access(path, os.X_OK)
 
+    def install(self, folders):
+        folder = f"{self.root}{'/usr/sbin' if self.is_kvm() else self.product.command_folder}"
+        place, found = f"{folder}/cimconfig", self.locate("cimconfig", folders, but_not=os.path.realpath(folder))
+        if not self.is_ours(place) and self.can_run(place):
+            self.say(f"{place} is there already")
+        elif found:
+            self.put_link(place, found[len(self.root):])
+        elif self.can_run(place):
+            self.say(f"{place} links to {os.readlink(place)} already")
+        else:
+            self.say("not found; VESKA_CIMServiceConfig will show 0 for its settings")
 
-def put(host, folders):
-    place = f"{host.root}{'/usr/sbin' if is_kvm(host.root) else host.product.command_folder}/cimconfig"
-    ours, found = host.is_ours("cimconfig", place), host.find("cimconfig", folders, but_not=os.path.realpath(os.path.dirname(place)))
-    if not ours and can_run(host.root, place):
-        host.say(f"{place} is there already")
-    elif found:
-        host.put_link("cimconfig", place, found[len(host.root):])
-    elif can_run(host.root, place):
-        host.say(f"{place} links to {os.readlink(place)} already")
-    else:
-        host.say("not found; VESKA_CIMServiceConfig will show 0 for its settings")
-
-
-def take(host):
-    usual = f"{host.root}{host.product.command_folder}/cimconfig"
-    made = any(line.startswith(f"{usual} -> ") for line in host.made_links("cimconfig"))
-    host.take_links("cimconfig", usual)
-    if made and not host.dry_run:
-        with contextlib.suppress(OSError):
-            for folder in (".", "..", "../.."):
-                os.rmdir(os.path.normpath(f"{host.root}{host.product.command_folder}/{folder}"))
+    def remove(self):
+        folder = f"{self.root}{self.product.command_folder}"
+        made = any(line.startswith(f"{folder}/cimconfig -> ") for line in self.read(".links"))
+        self.forget(f"{folder}/cimconfig")
+        if made and not self.options.dry_run:
+            with contextlib.suppress(OSError):
+                for way in (".", "..", "../.."):
+                    os.rmdir(os.path.normpath(f"{folder}/{way}"))

@@ -1,53 +1,119 @@
-"""What the object managers have in common."""
+"""What the object managers have in common: how the provider is put into one, taken from it and looked for."""
 
+import hashlib
 import os
+import re
+from pathlib import Path
 
-from host import Failure
+from owner import Failure, Owner, match
+
+OLDEST_SCHEMA = "2.22"
+NEWEST_CLASS = "CIM_TimeService"  # came with that CIM schema; the others are older
 
 
-class Manager:
-    """One object manager. NAME, TITLE and PROGRAMS are its own, the first NEEDED programs make it one."""
-    needed = 3
+def digest(*texts):
+    return hashlib.sha256("".join(texts).encode()).hexdigest()
 
-    def __init__(self, host):
-        self.host, self.product, self.noted = host, host.product, host.notes(self.name)
-        self.folders = [folder for folder in self.noted.get("folders", "").split(":") if folder]
-        if not self.folders and "library-link" in self.noted:  # a note of an older version
-            home = os.path.dirname(os.path.dirname(self.noted["library-link"]))
-            self.folders = [f"{home}/sbin", f"{home}/bin"]
-        self.command, self.env = {}, None
+
+class Manager(Owner):
+    """One object manager. NAME, TITLE, PROGRAMS (the first three make it one) and WHAT is registered are its own."""
+
+    found = served = False
+
+    def __init__(self, options):
+        super().__init__(options)
+        self.command = {}
+        mof, self.registration = (Path(file).read_text(encoding="utf-8") for file in self.product.files[:2])
+        self.checksum, self.noted = digest(mof, self.registration), self.notes()
+        self.ours = {name: text for text, name in re.findall(r"^(\[.*?^class (\w+).*?^\};)", mof, re.M | re.S)}
+        home = os.path.dirname(os.path.dirname(self.noted.get("library-link", "")))  # an older version noted no more
+        self.folders = self.noted.get("folders", f"{home}/sbin:{home}/bin" if home else "").split(":")
+
+    def find(self):
+        """Whether it is there, with every command that makes it one."""
+        self.command = {name: self.locate(name, filter(None, self.folders)) for name in self.programs}
+        return all(self.command[name] for name in self.programs[:3])
 
     def ask(self, program, *words):
-        return self.host.call([self.command[program], *words], self.env) if self.command[program] else (127, "")
+        return self.call(self.command[program], *words) if self.command[program] else (127, "")
 
-    def run(self, program, *words, done=""):
-        self.host.run([self.command[program], *words], done, self.env)
+    def run(self, program, *words, **more):
+        super().run(self.command.get(program) or program, *words, **more)
 
-    def library_link(self, folders):
-        """Where the server looks for the library: in the named directory, in one that was named before, or in its own."""
-        folder = self.host.provider_dir or self.noted.get("provider-dir") or next(filter(os.path.isdir, folders), None)
+    def run_at_last(self, *command, **more):
+        """That it fails does not hide why the rest failed."""
+        try:
+            self.run(*command, **more)
+        except Failure as failure:
+            self.fail(failure)
+
+    def link(self):
+        """Where the server looks for the library: in the named directory, one that was named before, or its own."""
+        named = self.options.provider_dir or self.noted.get("provider-dir")
+        folder = named or next(filter(os.path.isdir, self.looks_in()), None)
         return f"{folder}/{self.product.link_name}" if folder else None
 
-    def need_link(self, link):
+    def require(self, link, newest, said=""):
+        """What has to be there before anything is changed. NEWEST: the newest class as the server's schema has it."""
         if not link:
             raise Failure("its directory of provider libraries is not found; name it with --provider-dir")
+        version = OLDEST_SCHEMA if newest is None else match(r'Version *\( *"([0-9.]+)"', newest) or "0"
+        if [int(part) for part in version.split(".")] < [int(part) for part in OLDEST_SCHEMA.split(".")]:
+            needed = f"{OLDEST_SCHEMA} or later is needed, which has {NEWEST_CLASS}"
+            raise Failure(f"the server's CIM schema is too old: {needed}", said)
 
-    def undo(self, link, replaced, registered):
-        """After a failure: what was registered before still needs its link, what was not needs none."""
-        if not registered:
-            self.host.take_back(self.name)
-        elif replaced:
-            self.host.put_link(self.name, link, replaced)
+    def lacks(self, missing, same):
+        if missing:
+            return f"without the classes {', '.join(missing)} in {self.product.namespace}"
+        return "" if same else "with other classes than those installed"
 
-    def note(self, link):
-        self.host.note(self.name, home=self.home, folders=":".join(dict.fromkeys(map(os.path.dirname, filter(None, self.command.values())))),
-                       provider_dir=self.host.provider_dir, library_link=link)
+    def library(self):
+        """Differs between one installation of the libraries and the next; any of them can be the one that is new."""
+        stats = map(os.stat, self.product.libraries)
+        return " ".join(f"{file.st_ino}/{file.st_size}/{file.st_mtime_ns}" for file in stats)
 
-    def say_status(self, found, known, flaw, link):
-        """KNOWN: how it is registered, if at all; FLAW: what keeps the registration from serving."""
-        if known and os.path.realpath(link or "/") != os.path.realpath(self.product.library):
+    def is_registered(self):
+        return self.flaw() is not None
+
+    def install(self):
+        with self.reached():
+            link, replaced = self.link(), None
+            self.prepare(link)
+            before = self.is_registered()
+            folders = ":".join(dict.fromkeys(os.path.dirname(file) for file in self.command.values() if file))
+            self.note(home=self.home, folders=folders, provider_dir=self.options.provider_dir, library_link=link)
+            try:
+                if link:
+                    replaced = self.put_link(link, self.product.library)
+                shown = self.register()
+            except BaseException:
+                # What was registered before still needs its link, what was not needs none.
+                if not before and not self.is_registered():
+                    self.forget()
+                elif replaced:
+                    self.put_link(link, replaced)
+                raise
+            self.note(shown=shown, library=self.library())
+
+    def remove(self):
+        link = self.link() or self.noted.get("library-link")
+        if not self.is_there():
+            self.say(f"{self.what} is not registered")
+        else:
+            try:
+                self.unregister()
+            except Failure as failure:
+                raise Failure(f"{failure}\nThe provider stays registered. {self.by_hand()}; rm -f {link}") from failure
+        self.forget(link)
+
+    def status(self, running="", known="registered"):
+        """RUNNING: whether the server does; KNOWN: how surely the provider is registered, if it is."""
+        link, flaw = self.link() or self.noted.get("library-link"), self.flaw()
+        known = "not registered" if flaw is None else known
+        if flaw is not None and os.path.realpath(link or "/") != os.path.realpath(self.product.library):
             flaw = f"{link or 'no link'} does not lead to the library"
-        if known and flaw and ":" not in flaw:
+        if flaw and ":" not in flaw:
             flaw += ": run vk-provider-register install"
-        self.host.say(f"{found} is {known or 'not registered'}{f', but {flaw}' if known and flaw else ''}")
-        return bool(known and not flaw)
+        found = f"found ({self.command[self.programs[0]]}){running}; {self.what}"
+        self.say(f"{found} is {known}{f', but {flaw}' if flaw else ''}")
+        return flaw == ""
