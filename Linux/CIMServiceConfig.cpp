@@ -9,7 +9,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCIMServiceConfig("Norvane.BaseServerProvider");
+static const std::string& loggerCIMServiceConfig = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCIMServiceConfig, "CIMServiceConfig"};
 
 namespace {
@@ -40,35 +40,35 @@ const CIMServiceConfig::Setting CIMServiceConfig::attempts = {
     "maxIndicationDeliveryRetryAttempts="};
 
 CIMServiceConfig::CIMServiceConfig() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
 }
 
 bool CIMServiceConfig::getName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     name = "VESKA_CIMServiceConfig";
     return true;
 }
 
 bool CIMServiceConfig::getCreationClassName(std::string& className) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     className = "VESKA_CIMServiceConfig";
     return true;
 }
 
 bool CIMServiceConfig::getSystemName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     name = hostName.text();
     return true;
 }
 
 bool CIMServiceConfig::getSystemCreationClassName(std::string& className) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     className = "VESKA_ComputerSystem";
     return true;
 }
 
 std::string CIMServiceConfig::getbinDirectory() const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     std::string directory;
     for (const wchar_t wide : Product::getRootDirectory()) directory += static_cast<char>(wide & 0xFF);
     return directory.substr(0, directory.find("platform")) + "vcm/bin/";
@@ -107,27 +107,27 @@ bool CIMServiceConfig::get(const TracePoint& at, const Setting& setting, unsigne
 }
 
 unsigned int CIMServiceConfig::setIntervalParameter(std::string value) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return set(source, interval, value);
 }
 
 unsigned int CIMServiceConfig::setAttemptParameter(std::string value) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return set(source, attempts, value);
 }
 
 bool CIMServiceConfig::getIntervalParameter(unsigned int& seconds) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return get(source, interval, seconds);
 }
 
 bool CIMServiceConfig::getAttemptParameter(unsigned int& attemptsOut) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return get(source, attempts, attemptsOut);
 }
 
 unsigned int CIMServiceConfig::executeCIMServiceConfig(std::string& request) {
-    const TraceScope scope(source, FailureLevel); // meant: the entry stands at the failures' level
+    const TraceScope scope(VK_SCOPE(source), FailureLevel); // meant: the entry stands at the failures' level
     const std::size_t equals = request.find('=');
     if (equals == std::string::npos) return 1;
     const std::string name = request.substr(0, equals);

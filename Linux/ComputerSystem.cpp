@@ -5,7 +5,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerComputerSystem("Norvane.BaseServerProvider");
+static const std::string& loggerComputerSystem = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerComputerSystem, "ComputerSystem"};
 
 namespace {
@@ -26,12 +26,12 @@ const TraceSource& ComputerSystem::traceSource() {
 }
 
 ComputerSystem::ComputerSystem() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     selectFirst();
 }
 
 ComputerSystem::~ComputerSystem() noexcept(false) {
-    const DestructorTraceScope scope(source);
+    const DestructorTraceScope scope(VK_SCOPE(source));
 }
 
 bool ComputerSystem::passes(const Filter& filter) const {
@@ -41,44 +41,44 @@ bool ComputerSystem::passes(const Filter& filter) const {
 }
 
 bool ComputerSystem::getName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::NameProperty, name);
 }
 
 bool ComputerSystem::getElementName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::NameProperty, name);
 }
 
 bool ComputerSystem::getUUID(std::string& uuid) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::UUIDProperty, uuid);
 }
 
 bool ComputerSystem::getPrimaryOwnerContact(std::string& contact) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::PrimaryOwnerContactProperty, contact);
 }
 
 bool ComputerSystem::getPrimaryOwnerName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::PrimaryOwnerNameProperty, name);
 }
 
 bool ComputerSystem::getDescription(std::string& description) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     description = node().getNodeDescription();
     return true;
 }
 
 bool ComputerSystem::getCreationClassName(std::string& className) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     className = "VESKA_ComputerSystem";
     return true;
 }
 
 bool ComputerSystem::getHealthState(unsigned short& state) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     switch (healthOf(node().getNodeStatus())) {
     case Health::Normal:
         state = 5; // OK
@@ -94,7 +94,7 @@ bool ComputerSystem::getHealthState(unsigned short& state) const {
 }
 
 bool ComputerSystem::getStatus(std::string& status) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     switch (healthOf(node().getNodeStatus())) {
     case Health::Normal:
         status = "OK";
@@ -112,7 +112,7 @@ bool ComputerSystem::getStatus(std::string& status) const {
 }
 
 bool ComputerSystem::getOperationalStatus(std::vector<unsigned short>& states) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     switch (healthOf(node().getNodeStatus())) {
     case Health::Normal:
         states.insert(states.end(), {2, 11}); // OK, In Service
@@ -130,7 +130,7 @@ bool ComputerSystem::getOperationalStatus(std::vector<unsigned short>& states) c
 }
 
 bool ComputerSystem::getEnabledState(unsigned short& state) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     unsigned int powerState = 0;
     if (!node().getProperty(NodeLexicon::PowerStateProperty, powerState)) return false;
     switch (powerState) {
@@ -150,14 +150,14 @@ bool ComputerSystem::getEnabledState(unsigned short& state) const {
 }
 
 bool ComputerSystem::getDedicated(std::vector<unsigned short>& purposes) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     purposes.assign(1, 0); // Not Dedicated
     return true;
 }
 
 bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
                                         std::vector<std::string>& values) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     constexpr std::size_t most = 6;
     descriptions.reserve(most);
     values.reserve(most);
@@ -188,14 +188,14 @@ bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
 }
 
 bool ComputerSystem::getOtherIdentifyingInfo(std::vector<std::string>& values) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     std::vector<std::string> descriptions;
     values.clear();
     return getIdentifyingInfo(descriptions, values);
 }
 
 bool ComputerSystem::getIdentifyingDescriptions(std::vector<std::string>& descriptions) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     std::vector<std::string> values;
     descriptions.clear();
     return getIdentifyingInfo(descriptions, values);

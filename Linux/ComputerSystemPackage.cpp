@@ -7,7 +7,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerComputerSystemPackage("Norvane.BaseServerProvider");
+static const std::string& loggerComputerSystemPackage = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerComputerSystemPackage, "ComputerSystemPackage"};
 
 namespace {
@@ -25,15 +25,15 @@ void selectChassis(Instrumentation& cursor, const std::string& tag) {
 } // namespace
 
 ComputerSystemPackage::ComputerSystemPackage() {
-    traceMethod(source);
+    traceMethod(VK_METHOD(source));
 }
 
 ComputerSystemPackage::~ComputerSystemPackage() noexcept(false) {
-    traceDestructor(source);
+    traceDestructor(VK_METHOD(source));
 }
 
 void ComputerSystemPackage::getComputerSystemMoniker(Moniker& monikerPackage) {
-    const ParameterTraceScope scope(source, " monikerPackage=", &monikerPackage);
+    const ParameterTraceScope scope(VK_SCOPE(source), " monikerPackage=", &monikerPackage);
     const std::string tag = requiredKey(monikerPackage, "Tag");
     traceVariable(source, "tag", tag.c_str());
     selectChassis(instrumentation, tag);
@@ -46,7 +46,7 @@ void ComputerSystemPackage::getComputerSystemMoniker(Moniker& monikerPackage) {
 }
 
 void ComputerSystemPackage::getPhysicalPackageMoniker(Moniker& monikerComputer) {
-    const ParameterTraceScope scope(source, " monikerComputer=", &monikerComputer);
+    const ParameterTraceScope scope(VK_SCOPE(source), " monikerComputer=", &monikerComputer);
     Instrumentation computer;
     const std::string name = requiredKey(monikerComputer, "Name");
     traceVariable(source, "name", name.c_str());
@@ -56,7 +56,7 @@ void ComputerSystemPackage::getPhysicalPackageMoniker(Moniker& monikerComputer) 
 }
 
 bool ComputerSystemPackage::getPlatformGUID(std::string& guid) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     instrumentation.selectNode(NodeLexicon::ComputerSystemNode);
     return instrumentation && instrumentation.getProperty(NodeLexicon::UUIDProperty, guid);
 }

@@ -7,19 +7,19 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerElementCapabilities("Norvane.BaseServerProvider");
+static const std::string& loggerElementCapabilities = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerElementCapabilities, "ElementCapabilities"};
 
 ElementCapabilities::ElementCapabilities() {
-    traceMethod(source);
+    traceMethod(VK_METHOD(source));
 }
 
 ElementCapabilities::~ElementCapabilities() noexcept(false) {
-    traceDestructor(source);
+    traceDestructor(VK_METHOD(source));
 }
 
 void ElementCapabilities::getCapabilitiesMoniker(Moniker& monikerComputer) {
-    const ParameterTraceScope scope(source, " monikerComputer=", &monikerComputer);
+    const ParameterTraceScope scope(VK_SCOPE(source), " monikerComputer=", &monikerComputer);
     selectComputer(instrumentation, requiredKey(monikerComputer, "Name"));
     // Meant: off the end the path is empty, and so is the InstanceID.
     const std::string instanceID = Instrumentation::convertPathToString(instrumentation.getPathToNode());
@@ -28,7 +28,7 @@ void ElementCapabilities::getCapabilitiesMoniker(Moniker& monikerComputer) {
 }
 
 void ElementCapabilities::getComputerMoniker(Moniker& monikerCapabilities) {
-    const ParameterTraceScope scope(source, " monikerCapabilities=", &monikerCapabilities);
+    const ParameterTraceScope scope(VK_SCOPE(source), " monikerCapabilities=", &monikerCapabilities);
     const NodePath path = Instrumentation::convertStringToPath(requiredKey(monikerCapabilities, "InstanceID"));
     instrumentation.selectNode(NodeLexicon::ComputerSystemNode);
     instrumentation.setFilter(NodeLexicon::NamePath, path);

@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerEnabledLogicalElementCapabilities("Norvane.BaseServerProvider");
+static const std::string& loggerEnabledLogicalElementCapabilities = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerEnabledLogicalElementCapabilities, "EnabledLogicalElementCapabilities"};
 
 const TraceSource& EnabledLogicalElementCapabilities::traceSource() {
@@ -10,12 +10,12 @@ const TraceSource& EnabledLogicalElementCapabilities::traceSource() {
 }
 
 EnabledLogicalElementCapabilities::EnabledLogicalElementCapabilities() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     selectFirst();
 }
 
 EnabledLogicalElementCapabilities::~EnabledLogicalElementCapabilities() noexcept(false) {
-    const DestructorTraceScope scope(source);
+    const DestructorTraceScope scope(VK_SCOPE(source));
 }
 
 bool EnabledLogicalElementCapabilities::passes(const Filter& filter) const {
@@ -24,19 +24,19 @@ bool EnabledLogicalElementCapabilities::passes(const Filter& filter) const {
 }
 
 bool EnabledLogicalElementCapabilities::getInstanceID(std::string& instanceID) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     instanceID = Instrumentation::convertPathToString(node().getPathToNode());
     traceVariable(source, "instanceID", instanceID.c_str());
     return true;
 }
 
 bool EnabledLogicalElementCapabilities::getElementName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::NameProperty, name);
 }
 
 bool EnabledLogicalElementCapabilities::getElementNameEditSupported(bool& supported) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     bool readOnly = false;
     if (!node().isPropertyReadOnly(NodeLexicon::NameProperty, readOnly)) return false;
     supported = !readOnly;

@@ -31,14 +31,14 @@ public:
 
     /// Drops all filters and starts again at the first node.
     void initialize() {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         selectFirst();
         filters.clear();
     }
 
     /// Adds a filter and moves on to the first node, from the current one on, that passes all of them.
     void setFilter(FilterType filterType, std::string reference) {
-        const ParameterTraceScope scope(Self::traceSource(), " filterType=", static_cast<unsigned int>(filterType),
+        const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " filterType=", unsigned(filterType),
                                         " reference=", reference.c_str());
         filters.push_back({filterType, std::move(reference)});
         skipFiltered();
@@ -46,7 +46,7 @@ public:
 
     /// Whether the current node passes every filter.
     bool evaluate() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         for (const Filter& filter : filters)
             if (!static_cast<const Self&>(*this).passes(filter)) return false;
         return true;
@@ -54,13 +54,13 @@ public:
 
     /// Whether there is a current node.
     explicit operator bool() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         return static_cast<bool>(instrumentation);
     }
 
     /// Moves to the next node that passes.
     NodeCursor& operator++() {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         ++instrumentation;
         if (Self::evaluatesUnfiltered || !filters.empty()) skipFiltered();
         return *this;

@@ -4,7 +4,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerPhysicalPackage("Norvane.BaseServerProvider");
+static const std::string& loggerPhysicalPackage = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerPhysicalPackage, "PhysicalPackage"};
 
 const TraceSource& PhysicalPackage::traceSource() {
@@ -12,12 +12,12 @@ const TraceSource& PhysicalPackage::traceSource() {
 }
 
 PhysicalPackage::PhysicalPackage() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     selectFirst();
 }
 
 PhysicalPackage::~PhysicalPackage() noexcept(false) {
-    traceDestructor(source);
+    traceDestructor(VK_METHOD(source));
 }
 
 bool PhysicalPackage::passes(const Filter& filter) const {
@@ -33,40 +33,40 @@ bool PhysicalPackage::passes(const Filter& filter) const {
 }
 
 bool PhysicalPackage::getCreationClassName(std::string& className) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     className = "VESKA_PhysicalPackage";
     return true;
 }
 
 bool PhysicalPackage::getTag(std::string& tag) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     if (!node().getProperty(NodeLexicon::SerialNumberProperty, tag)) return false;
     traceVariable(source, "tag", tag.c_str());
     return true;
 }
 
 bool PhysicalPackage::getSerialNumber(std::string& serial) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::SerialNumberProperty, serial);
 }
 
 bool PhysicalPackage::getManufacturer(std::string& manufacturer) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::ManufacturerProperty, manufacturer);
 }
 
 bool PhysicalPackage::getModel(std::string& model) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::ModelProperty, model);
 }
 
 bool PhysicalPackage::getSKU(std::string& sku) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return node().getProperty(NodeLexicon::SKUProperty, sku);
 }
 
 bool PhysicalPackage::getElementName(std::string& name) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     std::string description = node().getNodeDescription();
     if (description.empty()) return false;
     name = std::move(description);
@@ -74,13 +74,13 @@ bool PhysicalPackage::getElementName(std::string& name) const {
 }
 
 bool PhysicalPackage::getDescription(std::string& description) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     description = node().getNodeDescription();
     return true;
 }
 
 bool PhysicalPackage::getPackageType(unsigned short& type) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     // By the node's number; 6 is 12, and 4, 5 and all above 6 are 1, which is meant.
     constexpr unsigned short cimTypes[] = {
         0,  // unknown: Unknown

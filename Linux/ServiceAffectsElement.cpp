@@ -5,27 +5,27 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerTimeServiceAffectsElement("Norvane.BaseServerProvider");
+static const std::string& loggerTimeServiceAffectsElement = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerTimeServiceAffectsElement, "ServiceAffectsElement"};
 
 TimeServiceAffectsElement::TimeServiceAffectsElement() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     hostName = HostName().text();
 }
 
 TimeServiceAffectsElement::~TimeServiceAffectsElement() noexcept(false) {
-    const DestructorTraceScope scope(source);
+    const DestructorTraceScope scope(VK_SCOPE(source));
 }
 
 Moniker TimeServiceAffectsElement::getTimeMoniker(Moniker& computerMoniker) const {
-    const ParameterTraceScope scope(source, " computerMoniker=", &computerMoniker);
+    const ParameterTraceScope scope(VK_SCOPE(source), " computerMoniker=", &computerMoniker);
     Moniker moniker;
     moniker.addKey("SystemName", hostName);
     return moniker;
 }
 
 Moniker TimeServiceAffectsElement::getComputerMoniker(Moniker& timeMoniker) const {
-    const ParameterTraceScope scope(source, " timeMoniker=", &timeMoniker);
+    const ParameterTraceScope scope(VK_SCOPE(source), " timeMoniker=", &timeMoniker);
     Moniker moniker;
     moniker.addKey("Name", hostName);
     return moniker;

@@ -7,7 +7,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerTimeService("Norvane.BaseServerProvider");
+static const std::string& loggerTimeService = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerTimeService, "TimeService"};
 
 namespace {
@@ -24,41 +24,41 @@ bool contains(const std::string& text, const char* word) {
 } // namespace
 
 TimeService::TimeService() : name("TimeService") {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     name += "@" + hostName.text();
     instrumentation.selectNode(NodeLexicon::ComputerSystemNode);
 }
 
 TimeService::~TimeService() noexcept(false) {
-    const DestructorTraceScope scope(source);
+    const DestructorTraceScope scope(VK_SCOPE(source));
 }
 
 bool TimeService::getName(std::string& nameOut) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     nameOut = name;
     return true;
 }
 
 bool TimeService::getCreationClassName(std::string& className) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     className = "VESKA_TimeService";
     return true;
 }
 
 bool TimeService::getSystemName(std::string& nameOut) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     nameOut = hostName.text();
     return true;
 }
 
 bool TimeService::getSystemCreationClassName(std::string& className) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     className = "VESKA_ComputerSystem";
     return true;
 }
 
 bool TimeService::getAutomaticDSTAdjustment(bool& automatic) const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     unsigned int value = 0;
     const bool known = instrumentation.getProperty(NodeLexicon::AutomaticDSTAdjustmentProperty, value);
     automatic = known && value != 0;
@@ -66,13 +66,13 @@ bool TimeService::getAutomaticDSTAdjustment(bool& automatic) const {
 }
 
 bool TimeService::setAutomaticDSTAdjustment(bool automatic) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     unsigned int value = automatic ? 1 : 0;
     return instrumentation.setProperty(NodeLexicon::AutomaticDSTAdjustmentProperty, value);
 }
 
 bool TimeService::executeCommand(const char* command, const char* mode, std::string& output) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     CommandStream stream(command, mode);
     if (!stream) return false;
     std::memset(commandOutput, 0, sizeof commandOutput);
@@ -92,17 +92,17 @@ unsigned int TimeService::runInitScript(const char* command) {
 }
 
 unsigned int TimeService::StartService() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return isDaemonRunning() ? success : runInitScript("/etc/init.d/ntp start");
 }
 
 unsigned int TimeService::StopService() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return isDaemonRunning() ? runInitScript("/etc/init.d/ntp stop") : success;
 }
 
 unsigned int TimeService::SyncClock() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     const bool wasRunning = isDaemonRunning();
     if (wasRunning) StopService(); // meant: its result does not count
     std::string output;
@@ -114,7 +114,7 @@ unsigned int TimeService::SyncClock() {
 }
 
 unsigned int TimeService::manageTime(long& time, unsigned int& gmtOffset) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     std::string timeText = DateTime(time, cimFormat);
     if (!instrumentation.setProperty(NodeLexicon::GmtOffsetProperty, gmtOffset)) {
         traceMessage(source, "setProperty::timezone failed!!", NoticeLevel);

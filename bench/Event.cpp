@@ -20,7 +20,7 @@ constexpr unsigned int line = 137;
 using Once = void (*)();
 
 void methodEvent() {
-    VK::traceMethod(VK::TracePoint(source, function, line));
+    VK::traceMethod(VK_METHOD_OF(source, function));
 }
 void methodLine() {
     char text[512];
@@ -38,7 +38,7 @@ void variableLine() {
     benchmark::DoNotOptimize(text);
 }
 void scopeEvents() {
-    const VK::TraceScope scope(VK::TracePoint(source, function, line));
+    const VK::TraceScope scope(VK_SCOPE_OF(source, function));
 }
 void scopeLines() {
     for (const char* word : {"ENTERING", "EXITING"}) {
@@ -50,7 +50,7 @@ void scopeLines() {
 }
 const int object = 0;
 void pointerEvents() {
-    const VK::ParameterTraceScope scope(VK::TracePoint(source, function, line), " objectPath=", &object);
+    const VK::ParameterTraceScope scope(VK_SCOPE_OF(source, function), " objectPath=", &object);
 }
 void pointerLines() {
     for (const char* word : {"ENTERING", "EXITING"}) {

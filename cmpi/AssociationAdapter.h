@@ -28,7 +28,7 @@ public:
     /// The path of the association that stands now, with both references; null when none does, when a path was refused,
     /// and when the broker could not tell the class of the request's path, whose keys then have chosen nothing.
     CMPIObjectPath* getObjectPath() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         if (requestedClassId == ClassId::Unknown) return nullptr;
         if (!static_cast<const Self&>(*this).hasPair()) return nullptr;
         CMPIObjectPath* path = keylessPath(Self::className);
@@ -43,7 +43,7 @@ public:
     /// The association's instance: its references as properties, and what `Self` adds. The list is traced, and not
     /// applied. Null when the broker could not make it.
     CMPIInstance* getCMPIInstance(const char** properties) {
-        const ParameterTraceScope scope(Self::traceSource(), " properties=", properties);
+        const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " properties=", properties);
         CMPIObjectPath* path = getObjectPath();
         if (path == nullptr) return nullptr;
         CMPIInstance* instance = ProviderUtilities::createInstance(broker, path);
@@ -60,13 +60,13 @@ public:
     /// The path or instance of the element at the other end from the request's; null when the request came from
     /// neither end.
     CMPIObjectPath* getAssociatorNames() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         if (requestedClassId == ClassId::ComputerSystem) return partner.getObjectPath();
         if (requestedClassId == Self::partnerClassId) return computer.getObjectPath();
         return nullptr;
     }
     CMPIInstance* getAssociator(const char** properties) const {
-        const ParameterTraceScope scope(Self::traceSource(), " properties=", properties);
+        const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " properties=", properties);
         if (requestedClassId == ClassId::ComputerSystem) return partner.getCMPIInstance(properties);
         if (requestedClassId == Self::partnerClassId) return computer.getCMPIInstance(properties);
         return nullptr;

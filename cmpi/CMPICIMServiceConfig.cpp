@@ -8,7 +8,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPICIMServiceConfig("Norvane.BaseServerProvider");
+static const std::string& loggerCMPICIMServiceConfig = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPICIMServiceConfig, "CMPICIMServiceConfig"};
 
 const TraceSource& CMPICIMServiceConfig::traceSource() {
@@ -17,7 +17,8 @@ const TraceSource& CMPICIMServiceConfig::traceSource() {
 
 unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out,
                                                 const CMPIResult* result) {
-    const ParameterTraceScope scope(source, " methodName=", methodName, " in=", in, " out=", out, " result=", result);
+    const ParameterTraceScope scope(VK_SCOPE(source), " methodName=", methodName, " in=", in, " out=", out,
+                                    " result=", result);
     if (methodName == nullptr || strcasecmp(methodName, "SetCIMconfig") != 0) return CMPI_RC_ERR_METHOD_NOT_FOUND;
 
     // The count itself does not matter.
@@ -49,7 +50,7 @@ unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CM
 }
 
 unsigned int CMPICIMServiceConfig::executeMethod(std::string request) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     return data.executeCIMServiceConfig(request);
 }
 

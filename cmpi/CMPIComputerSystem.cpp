@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPIComputerSystem("Norvane.BaseServerProvider");
+static const std::string& loggerCMPIComputerSystem = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPIComputerSystem, "CMPIComputerSystem"};
 
 const TraceSource& CMPIComputerSystem::traceSource() {

@@ -4,7 +4,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPIComputerSystemPackage("Norvane.BaseServerProvider");
+static const std::string& loggerCMPIComputerSystemPackage = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPIComputerSystemPackage, "CMPIComputerSystemPackage"};
 
 const TraceSource& CMPIComputerSystemPackage::traceSource() {
@@ -12,19 +12,19 @@ const TraceSource& CMPIComputerSystemPackage::traceSource() {
 }
 
 CMPIObjectPath* CMPIComputerSystemPackage::locatePhysicalPackage(const CMPIObjectPath* objectPath) {
-    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    const ParameterTraceScope scope(VK_SCOPE(source), " objectPath=", objectPath);
     return locate(CMPIPhysicalPackage::className, objectPath,
                   [this](Moniker& moniker) { ends.getPhysicalPackageMoniker(moniker); });
 }
 
 CMPIObjectPath* CMPIComputerSystemPackage::locateComputerSystem(const CMPIObjectPath* objectPath) {
-    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    const ParameterTraceScope scope(VK_SCOPE(source), " objectPath=", objectPath);
     return locate(CMPIComputerSystem::className, objectPath,
                   [this](Moniker& moniker) { ends.getComputerSystemMoniker(moniker); });
 }
 
 bool CMPIComputerSystemPackage::isNotTargetClass(const char* resultClass) const {
-    const ParameterTraceScope scope(source, " resultClass=", resultClass);
+    const ParameterTraceScope scope(VK_SCOPE(source), " resultClass=", resultClass);
     const auto isNeither = [resultClass](const char* ours, const char* base) {
         return strcasecmp(resultClass, ours) != 0 && strcasecmp(resultClass, base) != 0;
     };

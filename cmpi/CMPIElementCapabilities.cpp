@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPIElementCapabilities("Norvane.BaseServerProvider");
+static const std::string& loggerCMPIElementCapabilities = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPIElementCapabilities, "CMPIElementCapabilities"};
 
 const TraceSource& CMPIElementCapabilities::traceSource() {
@@ -10,13 +10,13 @@ const TraceSource& CMPIElementCapabilities::traceSource() {
 }
 
 CMPIObjectPath* CMPIElementCapabilities::locateCapabilities(const CMPIObjectPath* objectPath) {
-    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    const ParameterTraceScope scope(VK_SCOPE(source), " objectPath=", objectPath);
     return locate(CMPIEnabledLogicalElementCapabilities::className, objectPath,
                   [this](Moniker& moniker) { ends.getCapabilitiesMoniker(moniker); });
 }
 
 CMPIObjectPath* CMPIElementCapabilities::locateComputer(const CMPIObjectPath* objectPath) {
-    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    const ParameterTraceScope scope(VK_SCOPE(source), " objectPath=", objectPath);
     return locate(CMPIComputerSystem::className, objectPath,
                   [this](Moniker& moniker) { ends.getComputerMoniker(moniker); });
 }

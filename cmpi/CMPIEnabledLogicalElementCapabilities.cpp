@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPIEnabledLogicalElementCapabilities("Norvane.BaseServerProvider");
+static const std::string& loggerCMPIEnabledLogicalElementCapabilities = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPIEnabledLogicalElementCapabilities, "CMPIEnabledLogicalElementCapabilities"};
 
 const TraceSource& CMPIEnabledLogicalElementCapabilities::traceSource() {
@@ -10,7 +10,7 @@ const TraceSource& CMPIEnabledLogicalElementCapabilities::traceSource() {
 }
 
 void CMPIEnabledLogicalElementCapabilities::initialize() {
-    traceMethod(source);
+    traceMethod(VK_METHOD(source));
     data.initialize();
 }
 

@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPIPhysicalPackage("Norvane.BaseServerProvider");
+static const std::string& loggerCMPIPhysicalPackage = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPIPhysicalPackage, "CMPIPhysicalPackage"};
 
 const TraceSource& CMPIPhysicalPackage::traceSource() {
@@ -10,7 +10,7 @@ const TraceSource& CMPIPhysicalPackage::traceSource() {
 }
 
 void CMPIPhysicalPackage::initialize() {
-    traceMethod(source);
+    traceMethod(VK_METHOD(source));
     data.initialize();
 }
 

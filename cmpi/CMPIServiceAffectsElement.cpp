@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPITimeServiceAffectsElement("Norvane.BaseServerProvider");
+static const std::string& loggerCMPITimeServiceAffectsElement = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPITimeServiceAffectsElement, "CMPIServiceAffectsElement"};
 
 const TraceSource& CMPITimeServiceAffectsElement::traceSource() {
@@ -11,9 +11,9 @@ const TraceSource& CMPITimeServiceAffectsElement::traceSource() {
 
 CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
                                                              const CMPIObjectPath* objectPath)
-    : CMPITimeServiceAffectsElement(
-          theBroker, context, objectPath,
-          ParameterTraceScope(source, " _broker=", theBroker, " _context=", context, " objectPath=", objectPath)) {}
+    : CMPITimeServiceAffectsElement(theBroker, context, objectPath,
+                                    ParameterTraceScope(VK_SCOPE(source), " _broker=", theBroker, " _context=", context,
+                                                        " objectPath=", objectPath)) {}
 
 CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
                                                              const CMPIObjectPath* objectPath,
@@ -29,11 +29,11 @@ CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* t
 }
 
 CMPITimeServiceAffectsElement::~CMPITimeServiceAffectsElement() noexcept(false) {
-    traceDestructor(source);
+    traceDestructor(VK_METHOD(source));
 }
 
 CMPITimeServiceAffectsElement::operator bool() const {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     if (!narrowed) return false;
     switch (requestedClassId) {
     case partnerClassId:
@@ -48,20 +48,20 @@ CMPITimeServiceAffectsElement::operator bool() const {
 }
 
 CMPITimeServiceAffectsElement& CMPITimeServiceAffectsElement::operator++() {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     if (requestedClassId == ClassId::ComputerSystem || requestedClassId == associationClassId) ++partner;
     if (requestedClassId == partnerClassId || requestedClassId == associationClassId) ++computer;
     return *this;
 }
 
 CMPIObjectPath* CMPITimeServiceAffectsElement::locateTimeService(const CMPIObjectPath* objectPath) {
-    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    const ParameterTraceScope scope(VK_SCOPE(source), " objectPath=", objectPath);
     return locate(CMPITimeService::className, objectPath,
                   [this](Moniker& moniker) { moniker = ends.getTimeMoniker(moniker); });
 }
 
 CMPIObjectPath* CMPITimeServiceAffectsElement::locateComputer(const CMPIObjectPath* objectPath) {
-    const ParameterTraceScope scope(source, " objectPath=", objectPath);
+    const ParameterTraceScope scope(VK_SCOPE(source), " objectPath=", objectPath);
     return locate(CMPIComputerSystem::className, objectPath,
                   [this](Moniker& moniker) { moniker = ends.getComputerMoniker(moniker); });
 }

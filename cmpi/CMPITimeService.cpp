@@ -10,7 +10,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerCMPITimeService("Norvane.BaseServerProvider");
+static const std::string& loggerCMPITimeService = lastingString("Norvane.BaseServerProvider");
 static const TraceSource source{loggerCMPITimeService, "CMPITimeService"};
 
 const TraceSource& CMPITimeService::traceSource() {
@@ -18,7 +18,7 @@ const TraceSource& CMPITimeService::traceSource() {
 }
 
 void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** propertyList) {
-    const ParameterTraceScope scope(source, " referenceInstance=", instance, " properties=", propertyList);
+    const ParameterTraceScope scope(VK_SCOPE(source), " referenceInstance=", instance, " properties=", propertyList);
     if (instance == nullptr) return;
     bool automatic = false;
     if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic)) {
@@ -101,7 +101,8 @@ unsigned int offsetOf(const std::string& text) {
 
 unsigned int CMPITimeService::invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out,
                                            const CMPIResult* result) {
-    const ParameterTraceScope scope(source, " methodName=", methodName, " in=", in, " out=", out, " result=", result);
+    const ParameterTraceScope scope(VK_SCOPE(source), " methodName=", methodName, " in=", in, " out=", out,
+                                    " result=", result);
     if (methodName == nullptr || strcasecmp(methodName, "ManageTime") != 0) return CMPI_RC_ERR_METHOD_NOT_FOUND;
 
     if (!hasSlot(in, &CMPIArgsFT::getArgCount)) return CMPI_RC_ERR_INVALID_PARAMETER;

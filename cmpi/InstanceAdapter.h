@@ -35,13 +35,13 @@ public:
     /// For the elements that the path names; all of the class when it has no keys.
     InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, const CMPIObjectPath* objectPath)
         : InstanceAdapter(theBroker, theContext, objectPath,
-                          ParameterTraceScope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=",
+                          ParameterTraceScope(VK_SCOPE_OF(Self::traceSource(), Self::adapterName), " _broker=",
                                               theBroker, " _context=", theContext, " objectPath=", objectPath)) {}
 
     /// For all elements, to walk one end of an association.
     InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, std::string theNameSpace)
         : broker(theBroker), context(theContext), nameSpace(std::move(theNameSpace)) {
-        traceMethod(TracePoint(Self::traceSource(), Self::adapterName));
+        traceMethod(VK_METHOD_OF(Self::traceSource(), Self::adapterName));
     }
 
     InstanceAdapter(const InstanceAdapter&) = delete;
@@ -50,7 +50,7 @@ public:
     /// Narrows the walk by the keys of a request's path. A path without keys, or without those that filter, leaves it
     /// as it is, which is meant; the class name among the keys is not checked.
     void setObjectPath(const CMPIObjectPath* objectPath) {
-        const ParameterTraceScope scope(Self::traceSource(), " objectPath=", objectPath);
+        const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " objectPath=", objectPath);
         if (ProviderUtilities::getKeyCount(objectPath) == 0) return;
         for (const KeyFilter<Data>& filter : Self::keyFilters) {
             std::string value;
@@ -62,20 +62,20 @@ public:
 
     /// Whether the adapter stands on an element.
     explicit operator bool() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         return static_cast<bool>(data);
     }
 
     /// Moves to the next element.
     InstanceAdapter& operator++() {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         ++data;
         return *this;
     }
 
     /// The current element's path, with every key that has a value; null when the broker could not make it whole.
     CMPIObjectPath* getObjectPath() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         CMPIObjectPath* path = ProviderUtilities::createObjectPath(broker, Self::className, nameSpace);
         if (path == nullptr) return nullptr;
         for (const Key<Data>& key : Self::keys) {
@@ -88,7 +88,7 @@ public:
     /// The current element's instance, with every property that has a value: the list is traced, and not applied, which
     /// is meant. Null when the broker could not make it.
     CMPIInstance* getCMPIInstance(const char** properties) const {
-        const ParameterTraceScope scope(Self::traceSource(), " properties=", properties);
+        const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " properties=", properties);
         CMPIObjectPath* path = getObjectPath();
         if (path == nullptr) return nullptr;
         CMPIInstance* instance = ProviderUtilities::createInstance(broker, path);
@@ -98,7 +98,7 @@ public:
     }
 
 protected:
-    ~InstanceAdapter() noexcept(false) { traceDestructor(TracePoint(Self::traceSource(), Self::destructorName)); }
+    ~InstanceAdapter() noexcept(false) { traceDestructor(VK_METHOD_OF(Self::traceSource(), Self::destructorName)); }
 
     const CMPIBroker* const broker;
     const CMPIContext* const context;

@@ -17,16 +17,16 @@ public:
     /// data class throws for an end that is not there.
     NodeAssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath)
         : NodeAssociationAdapter(theBroker, context, objectPath,
-                                 ParameterTraceScope(TracePoint(Self::traceSource(), Self::adapterName), " _broker=",
+                                 ParameterTraceScope(VK_SCOPE_OF(Self::traceSource(), Self::adapterName), " _broker=",
                                                      theBroker, " _context=", context, " objectPath=", objectPath)) {}
 
     explicit operator bool() const {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         return valid;
     }
 
     NodeAssociationAdapter& operator++() {
-        const TraceScope scope(Self::traceSource());
+        const TraceScope scope(VK_SCOPE(Self::traceSource()));
         if (requestedClassId == ClassId::ComputerSystem) {
             ++partner;
             valid = static_cast<bool>(partner);
@@ -49,13 +49,13 @@ public:
     /// is none: a reference missing, the two not belonging together, no computer at all. A path that the broker refused
     /// on the way is no reason for that: true, and nothing to walk.
     bool setObjectPath(const CMPIObjectPath* objectPath) {
-        const ParameterTraceScope scope(Self::traceSource(), " objectPath=", objectPath);
+        const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " objectPath=", objectPath);
         return ProviderUtilities::getKeyCount(objectPath) == 0 ? selectFirst() : selectNamed(objectPath);
     }
 
 protected:
     ~NodeAssociationAdapter() noexcept(false) {
-        traceDestructor(TracePoint(Self::traceSource(), Self::destructorName));
+        traceDestructor(VK_METHOD_OF(Self::traceSource(), Self::destructorName));
     }
 
     using Base::computer;

@@ -29,10 +29,11 @@ private:
     char* first;
 };
 
-/// Room for one formatted line: 511 characters, what goes beyond is cut. Trivial, so that it can be thread-local in a
-/// library that gets unloaded.
-struct MessageBuffer {
-    static constexpr std::size_t size = 512;
+/// Room for a text of `bytes` with its final zero; what goes beyond is cut. Trivial, so that it can be thread-local in
+/// a library that gets unloaded.
+template <std::size_t bytes>
+struct TextBuffer {
+    static constexpr std::size_t size = bytes;
 
     char text[size];
     std::size_t length;
@@ -40,14 +41,16 @@ struct MessageBuffer {
     /// Appends pieces: texts, views and numbers. Inline, so that a literal is appended with its length known: a few
     /// moves instead of two calls.
     template <class... Pieces>
-    __attribute__((always_inline)) MessageBuffer& add(const Pieces&... pieces) {
+    __attribute__((always_inline)) TextBuffer& add(const Pieces&... pieces) {
         return append(view(pieces)...);
     }
 
-    MessageBuffer& start() {
+    TextBuffer& start() {
         length = 0;
         return *this;
     }
+
+    std::string_view line() const { return {text, length}; }
 
     /// Clears what is left behind the line, so that all bytes not written are zero.
     char* finish() {
@@ -61,7 +64,7 @@ private:
     static std::string_view view(std::string_view piece) { return piece; }
 
     template <class... Views>
-    __attribute__((always_inline)) MessageBuffer& append(Views... views) {
+    __attribute__((always_inline)) TextBuffer& append(Views... views) {
         if (__builtin_expect((views.size() + ...) < size - length, true)) { // GCOVR_EXCL_BR_LINE: counted for each call
             (copy(views), ...);
             return *this;
@@ -74,10 +77,13 @@ private:
         length += piece.size();
     }
 
-    __attribute__((noinline, cold)) MessageBuffer& cut(std::initializer_list<std::string_view> views) {
+    __attribute__((noinline, cold)) TextBuffer& cut(std::initializer_list<std::string_view> views) {
         for (const std::string_view piece : views) copy(piece.substr(0, size - 1 - length));
         return *this;
     }
 };
+
+/// Room for one formatted line: 511 characters.
+using MessageBuffer = TextBuffer<512>;
 
 } // namespace VK

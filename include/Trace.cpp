@@ -3,6 +3,9 @@
 #include <cxxabi.h>
 #include <pthread.h>
 
+#include <charconv>
+#include <cstdint>
+#include <new>
 #include <stdexcept>
 
 namespace VK {
@@ -14,11 +17,9 @@ struct ExceptionGlobals {
     unsigned int uncaught;
 };
 
-/// std::uncaught_exceptions() > 0 at a third of its price: this is asked at the end of every scope.
+/// std::uncaught_exceptions() > 0 without a table of its own for each thread: this is asked at the end of every scope.
 bool isUnwinding() {
-    static thread_local const ExceptionGlobals* globals = nullptr;
-    if (globals == nullptr) globals = reinterpret_cast<const ExceptionGlobals*>(abi::__cxa_get_globals());
-    return globals->uncaught > 0;
+    return reinterpret_cast<const ExceptionGlobals*>(abi::__cxa_get_globals())->uncaught > 0;
 }
 
 /// Puts off a cancellation.
@@ -59,24 +60,60 @@ void swallowing(Step step) {
     swallowingAllButTheEnd(step);
 }
 
-void hand(const TracePoint& at, int level, const char* text) {
-    logAndTrace(at.function.data(), at.source.file.data(), at.line, at.source.category, level, text);
+/// Hands one line over: to the log channel, then to the trace channel.
+void hand(const char* function, const char* file, unsigned int line, const std::string& category, int level,
+          const std::string& text) {
+    const int lineNumber = static_cast<int>(line);
+    try {
+        NVLog::NVLogger::logLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, text);
+        NVLog::NVLogger::traceLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, text);
+    } catch (...) {
+        rethrowFromLogger();
+    }
 }
 
-void writeLine(const TracePoint& at, int level, MessageType type) {
-    hand(at, level, trace(at.source.file, at.function, at.line, type));
+void hand(const TraceLines& lines, int level, const std::string& text) {
+    hand(lines.function, lines.file, lines.line, lines.category, level, text);
 }
 
-void writeLine(const TracePoint& at, const char* parameters, MessageType type) {
-    hand(at, DebugLevel, tracepara(at.source.file, at.function, at.line, parameters, type));
+void hand(const TracePoint& at, int level, const MessageBuffer& formatted) {
+    const LineText text;
+    text->assign(formatted.line());
+    hand(at.function.data(), at.source.file.data(), at.line, at.source.category, level, *text);
 }
 
-constexpr char rule[] = "==============================================================================";
-static_assert(sizeof rule == 78 + 1);
+const TraceLines& existing(const TraceLines* lines) {
+    if (lines == nullptr) throw std::bad_alloc();
+    return *lines;
+}
+
+std::string lineOf(const TracePoint& at, MessageType type) {
+    MessageBuffer buffer;
+    return std::string(detail::format(buffer, at.source.file, at.function, at.line, type).line());
+}
+
+constexpr std::string_view rule = "==============================================================================";
+static_assert(rule.size() == 78);
 
 /// The markers' own lines carry this file's name and lines; the caller's place stands in the text.
-void writeMarker(const std::string& logger, const char* marker, unsigned int line, const char* text) {
-    logAndTrace(marker, "Trace", line, logger, DebugLevel, text);
+void writeMarker(const std::string& logger, const char* marker, unsigned int line, const std::string& text) {
+    hand(marker, "Trace", line, logger, DebugLevel, text);
+}
+
+void writeRule(const std::string& logger, const char* marker, unsigned int line) {
+    const LineText text;
+    text->assign(rule);
+    writeMarker(logger, marker, line, *text);
+}
+
+void writeEntry(const std::string& logger, const std::string& entering) {
+    writeRule(logger, "markProviderEntry", __LINE__);
+    writeMarker(logger, "markProviderEntry", __LINE__, entering);
+}
+
+void writeExit(const std::string& logger, const std::string& exiting) {
+    writeMarker(logger, "markProviderExit", __LINE__, exiting);
+    writeRule(logger, "markProviderExit", __LINE__);
 }
 
 } // namespace
@@ -93,71 +130,118 @@ __attribute__((no_sanitize("null"))) void rethrowFromLogger() {
     }
 }
 
-void logAndTrace(const char* function, const char* file, unsigned int line, const std::string& category, int level,
-                 const char* text) {
+TraceLines::TraceLines(const TracePoint& at, MessageType type)
+    : function(at.function.data()), file(at.source.file.data()), category(at.source.category), line(at.line),
+      first(lineOf(at, type)), last(type == ENTERING ? lineOf(at, EXITING) : std::string()) {}
+
+const TraceLines* TracePlace::make(const TracePoint& at, MessageType type) noexcept {
+    TraceLines* mine = nullptr;
     try {
-        NVLog::NVMessageBuffer buffer;
-        const std::string& message = NVLog::NVMessageBuffer::str(buffer << text);
-        const int lineNumber = static_cast<int>(line);
-        NVLog::NVLogger::logLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, message);
-        NVLog::NVLogger::traceLevelMessage(function, file, lineNumber, category, level, nullptr, 0, 0, message);
-    } catch (...) {
-        rethrowFromLogger();
+        mine = new TraceLines(at, type);
+    } catch (const std::bad_alloc&) {
+        return nullptr;
     }
+    const TraceLines* others = nullptr;
+    // Not a static local's guard, for which the child of a fork in the middle of it would wait forever.
+    if (!place.compare_exchange_strong(others, mine, std::memory_order_acq_rel)) {
+        delete mine;
+        return others;
+    }
+    Lasting::keep(mine);
+    return mine;
 }
 
 void markProviderEntry(const std::string& logger, const char* file, const char* function, unsigned int line) {
-    writeMarker(logger, __func__, __LINE__, rule);
-    writeMarker(logger, __func__, __LINE__, trace(file, function, line, ENTERING));
+    writeEntry(logger,
+               lineOf({{logger, detail::textOrNull(file)}, detail::textOrNull(function).data(), line}, ENTERING));
 }
 
 void markProviderExit(const std::string& logger, const char* file, const char* function, unsigned int line) {
-    writeMarker(logger, __func__, __LINE__, trace(file, function, line, EXITING));
-    writeMarker(logger, __func__, __LINE__, rule);
+    writeExit(logger, lineOf({{logger, detail::textOrNull(file)}, detail::textOrNull(function).data(), line}, EXITING));
 }
 
-void traceMethod(const TracePoint& at, int level) {
-    writeLine(at, level, METHOD_INVOKED);
+void markProviderEntry(const TraceLines* lines) {
+    writeEntry(existing(lines).category, lines->first);
+}
+
+void markProviderExit(const TraceLines* lines) {
+    writeExit(existing(lines).category, lines->last);
+}
+
+void traceMethod(const TraceLines* lines, int level) {
+    hand(existing(lines), level, lines->first);
 }
 
 void traceMessage(const TracePoint& at, const char* message, int level) {
-    hand(at, level, trace(at.source.file, detail::textOrNull(message), at.line, MESSAGE));
+    MessageBuffer buffer;
+    hand(at, level, detail::format(buffer, at.source.file, detail::textOrNull(message), at.line, MESSAGE));
 }
 
 void traceVariable(const TracePoint& at, const char* name, const char* value, int level) {
-    hand(at, level, trace(name, at.source.file.data(), at.line, value));
+    MessageBuffer buffer;
+    hand(at, level, detail::formatVariable(buffer, name, at.source.file.data(), at.line, value));
 }
 
 void traceVariable(const TracePoint& at, const char* name, unsigned int value, int level) {
-    hand(at, level, trace(name, at.source.file.data(), at.line, value));
+    MessageBuffer buffer;
+    hand(at, level, detail::formatVariable(buffer, name, at.source.file.data(), at.line, SignedDecimal(value)));
 }
 
-void traceDestructor(const TracePoint& at) {
-    swallowing([&] { writeLine(at, DebugLevel, METHOD_INVOKED); });
+void traceDestructor(const TraceLines* lines) {
+    swallowing([&] { traceMethod(lines); });
 }
 
-TraceScope::TraceScope(const TracePoint& point, int entryLevel) : at(point) {
-    writeLine(at, entryLevel, ENTERING);
+TraceScope::TraceScope(const TraceLines* theLines, int entryLevel) : lines(theLines) {
+    hand(existing(lines), entryLevel, lines->first);
 }
 
 TraceScope::~TraceScope() noexcept(false) {
-    swallowing([&] { writeLine(at, DebugLevel, EXITING); });
+    swallowing([&] { hand(*lines, DebugLevel, lines->last); });
 }
 
-DestructorTraceScope::DestructorTraceScope(const TracePoint& point) : at(point) {
-    swallowing([&] { writeLine(at, DebugLevel, ENTERING); });
+DestructorTraceScope::DestructorTraceScope(const TraceLines* theLines) : lines(theLines) {
+    swallowing([&] { traceMethod(lines); });
 }
 
 DestructorTraceScope::~DestructorTraceScope() noexcept(false) {
-    swallowing([&] { writeLine(at, DebugLevel, EXITING); });
+    swallowing([&] { hand(existing(lines), DebugLevel, lines->last); });
 }
 
-void ParameterTraceScope::enter() {
-    writeLine(at, parameters, ENTERING);
+void Parameter::addTo(TextBuffer<MessageBuffer::size + 1>& buffer) const {
+    char digits[2 * sizeof address]; // as many as an address has
+    char* const end = digits + sizeof digits;
+    switch (kind) {
+    case Text:
+        buffer.add(text);
+        return;
+    case Number:
+        buffer.add(std::string_view(digits, std::to_chars(digits, end, number).ptr));
+        return;
+    case Address:
+        if (address != nullptr) buffer.add("0x");
+        buffer.add(
+            std::string_view(digits, std::to_chars(digits, end, reinterpret_cast<std::uintptr_t>(address), 16).ptr));
+        return;
+    }
+}
+
+void ParameterTraceScope::enter(std::initializer_list<Parameter> parameters) {
+    TextBuffer<MessageBuffer::size + 1> buffer;
+    buffer.start().add(existing(lines).first, detail::parametersList);
+    for (const Parameter& parameter : parameters) parameter.addTo(buffer);
+    text->assign(buffer.line());
+    // A line ends after 511 characters: of one that is cut, the shorter exit line has one more than the entry line.
+    const bool isCut = text->size() == MessageBuffer::size;
+    if (isCut) text->pop_back();
+    hand(*lines, DebugLevel, *text);
+    if (isCut) text->push_back(buffer.line().back());
 }
 
 ParameterTraceScope::~ParameterTraceScope() noexcept(false) {
-    swallowing([&] { writeLine(at, parameters, EXITING); });
+    swallowing([&] {
+        text->replace(0, lines->first.size(), lines->last);
+        hand(*lines, DebugLevel, *text);
+    });
 }
 
 } // namespace VK

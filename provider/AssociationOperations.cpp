@@ -118,7 +118,7 @@ bool getClassId(const char* className, const char* nameSpace, std::vector<unsign
 CMPIStatus BaseServer_AssociatorNames(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
                                       const CMPIObjectPath* op, const char* assocClass, const char* resultClass,
                                       const char*, const char*) {
-    const OperationFrame frame;
+    const OperationFrame frame(VK_PLACE());
     Answer answer(frame, result);
     return serve(frame, &AssociationRow::associatorNames, {context, answer, op, assocClass, resultClass, nullptr});
 }
@@ -126,19 +126,19 @@ CMPIStatus BaseServer_AssociatorNames(CMPIAssociationMI*, const CMPIContext* con
 CMPIStatus BaseServer_Associators(CMPIAssociationMI*, const CMPIContext* context, const CMPIResult* result,
                                   const CMPIObjectPath* op, const char* assocClass, const char* resultClass,
                                   const char*, const char*, const char** properties) {
-    const OperationFrame frame;
+    const OperationFrame frame(VK_PLACE());
     Answer answer(frame, result);
     return serve(frame, &AssociationRow::associators, {context, answer, op, assocClass, resultClass, properties});
 }
 
 CMPIStatus BaseServer_References(CMPIAssociationMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
                                  const char*, const char*, const char**) {
-    return OperationFrame().notSupported();
+    return OperationFrame(VK_PLACE()).notSupported();
 }
 
 CMPIStatus BaseServer_ReferenceNames(CMPIAssociationMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
                                      const char*, const char*) {
-    return OperationFrame().notSupported();
+    return OperationFrame(VK_PLACE()).notSupported();
 }
 
 } // namespace VK::BaseServerProvider

@@ -2,7 +2,7 @@
 
 namespace VK::BaseServerProvider {
 
-static const std::string loggerBaseServerProvider("Norvane.BaseServerProvider");
+static const std::string& loggerBaseServerProvider = lastingString("Norvane.BaseServerProvider");
 const TraceSource frameSource{loggerBaseServerProvider, "BaseServerProvider"};
 
 std::atomic<const CMPIBroker*> broker{nullptr};

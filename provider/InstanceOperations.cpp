@@ -116,22 +116,22 @@ CMPIStatus serve(const OperationFrame& frame, const Column& column, const CMPICo
 
 CMPIStatus BaseServer_EnumInstanceNames(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
                                         const CMPIObjectPath* ref) {
-    return serve(OperationFrame(), enumInstanceNamesColumn, context, result, ref, nullptr);
+    return serve(OperationFrame(VK_PLACE()), enumInstanceNamesColumn, context, result, ref, nullptr);
 }
 
 CMPIStatus BaseServer_EnumInstances(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
                                     const CMPIObjectPath* ref, const char** properties) {
-    return serve(OperationFrame(), enumInstancesColumn, context, result, ref, properties);
+    return serve(OperationFrame(VK_PLACE()), enumInstancesColumn, context, result, ref, properties);
 }
 
 CMPIStatus BaseServer_GetInstance(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult* result,
                                   const CMPIObjectPath* ref, const char** properties) {
-    return serve(OperationFrame(), getInstanceColumn, context, result, ref, properties);
+    return serve(OperationFrame(VK_PLACE()), getInstanceColumn, context, result, ref, properties);
 }
 
 CMPIStatus BaseServer_ModifyInstance(CMPIInstanceMI*, const CMPIContext* context, const CMPIResult*,
                                      const CMPIObjectPath* ref, const CMPIInstance* instance, const char** properties) {
-    const OperationFrame frame;
+    const OperationFrame frame(VK_PLACE());
     return frame.runMarked([&](CMPIStatus& status) {
         const unsigned short classId = ProviderUtilities::getClassId(ref);
         frame.traceClassId(classId);
@@ -144,16 +144,16 @@ CMPIStatus BaseServer_ModifyInstance(CMPIInstanceMI*, const CMPIContext* context
 
 CMPIStatus BaseServer_CreateInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
                                      const CMPIInstance*) {
-    return OperationFrame().notSupported();
+    return OperationFrame(VK_PLACE()).notSupported();
 }
 
 CMPIStatus BaseServer_DeleteInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*) {
-    return OperationFrame().notSupported();
+    return OperationFrame(VK_PLACE()).notSupported();
 }
 
 CMPIStatus BaseServer_ExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
                                 const char*, const char*) {
-    return OperationFrame().notSupported();
+    return OperationFrame(VK_PLACE()).notSupported();
 }
 
 } // namespace VK::BaseServerProvider

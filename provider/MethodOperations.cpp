@@ -43,7 +43,7 @@ constexpr MethodRow methodRows[] = {
 CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, const CMPIResult* result,
                                    const CMPIObjectPath* ref, const char* methodName, const CMPIArgs* in,
                                    CMPIArgs* out) {
-    const OperationFrame frame;
+    const OperationFrame frame(VK_PLACE());
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     unsigned int returnCode = 0;
 

@@ -32,7 +32,8 @@ const Row* findRow(const Row (&rows)[N], unsigned short classId) {
 /// (std::exception, that is: nothing of ours throws anything else).
 class OperationFrame {
 public:
-    explicit OperationFrame(const char* theFunction = __builtin_FUNCTION()) : function(theFunction) {}
+    explicit OperationFrame(TracePlace& thePlace, const char* theFunction = __builtin_FUNCTION())
+        : place(thePlace), function(theFunction) {}
 
     /// The place of a line of this operation.
     TracePoint here(unsigned int line = __builtin_LINE()) const { return {frameSource, function, line}; }
@@ -45,7 +46,7 @@ public:
     template <class Work, class OnException>
     void run(Work work, OnException onException, unsigned int line = __builtin_LINE()) const {
         try {
-            markProviderEntry(frameSource.category, frameSource.file.data(), function, line);
+            markProviderEntry(place.lines(here(line), ENTERING));
             work();
         } catch (const std::exception& exception) {
             contained([&] { traceMessage(here(line), exception.what(), NoticeLevel); });
@@ -59,17 +60,18 @@ public:
     CMPIStatus runMarked(Work work, unsigned int line = __builtin_LINE()) const {
         CMPIStatus status = {CMPI_RC_OK, nullptr};
         run([&] { work(status); }, [](const std::exception&) {}, line);
-        contained([&] { markProviderExit(frameSource.category, frameSource.file.data(), function, line); });
+        contained([&] { markProviderExit(place.lines(here(line), ENTERING)); });
         return status;
     }
 
     /// An operation that is not offered: one METHOD line, no markers.
     CMPIStatus notSupported(unsigned int line = __builtin_LINE()) const {
-        contained([&] { traceMethod(here(line)); });
+        contained([&] { traceMethod(place.lines(here(line), METHOD_INVOKED)); });
         return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
     }
 
 private:
+    TracePlace& place; ///< of the lines around the operation
     const char* const function;
 };
 

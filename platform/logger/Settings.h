@@ -15,13 +15,13 @@ struct Settings {
     static constexpr std::size_t MAX_LEVELS = 64;
 
     Sink sink = Syslog;
-    std::array<char, PATH_MAX> path{}; ///< of the File sink
     bool log = true;
     bool trace = false;
     bool traceInSyslog = false; ///< whether trace lines go there when the chosen sink cannot take them
     bool allLevels = false;
     std::size_t levelCount = 0;
     std::array<int, MAX_LEVELS> levels{};
+    std::array<char, PATH_MAX> path{}; ///< of the File sink; behind what is looked at for every line
 
     bool keeps(Channel channel, int level) const noexcept {
         if (!(channel == Channel::Log ? log : trace)) return false;

@@ -43,8 +43,8 @@ const VK::TraceSource source{category, "Sample"};
 
 TEST(ThrowingLogger, IsHeardWhereItThrowsAStandardException) {
     logging = [] { throw std::bad_alloc(); };
-    EXPECT_THROW(VK::traceMethod(source), std::bad_alloc);
-    EXPECT_THROW(VK::ParameterTraceScope(source, " count=", 7U), std::bad_alloc);
+    EXPECT_THROW(VK::traceMethod(VK_METHOD(source)), std::bad_alloc);
+    EXPECT_THROW(VK::ParameterTraceScope(VK_SCOPE(source), " count=", 7U), std::bad_alloc);
 }
 
 TEST(ThrowingLogger, IsHeardAsAStandardExceptionWhateverElseItThrows) {
@@ -57,22 +57,22 @@ TEST(ThrowingLogger, IsHeardAsAStandardExceptionWhateverElseItThrows) {
             EXPECT_STREQ(failure.what(), "The logger failed");
         }
     };
-    expectFailure([] { VK::traceMethod(source); });
-    expectFailure([] { const VK::ParameterTraceScope scope(source, " count=", 7U); });
+    expectFailure([] { VK::traceMethod(VK_METHOD(source)); });
+    expectFailure([] { const VK::ParameterTraceScope scope(VK_SCOPE(source), " count=", 7U); });
 }
 
 TEST(ThrowingLogger, IsNotHeardAtTheEndOfAScope) {
     for (const bool standard : {false, true}) {
         logging = [] {};
         EXPECT_NO_THROW({
-            const VK::TraceScope scope(source);
-            const VK::ParameterTraceScope parameters(source, " count=", 7U);
+            const VK::TraceScope scope(VK_SCOPE(source));
+            const VK::ParameterTraceScope parameters(VK_SCOPE(source), " count=", 7U);
             logging = [standard] {
                 if (standard) throw std::bad_alloc();
                 throw 42;
             };
-            const VK::DestructorTraceScope destructor(source);
-            VK::traceDestructor(source);
+            const VK::DestructorTraceScope destructor(VK_SCOPE(source));
+            VK::traceDestructor(VK_METHOD(source));
         });
     }
 }
@@ -119,7 +119,7 @@ TEST(Logger, IsHandedTheSameTextTwice) {
     logged.clear();
     traced.clear();
     {
-        const VK::ParameterTraceScope scope(source, " count=", 7U);
+        const VK::ParameterTraceScope scope(VK_SCOPE(source), " count=", 7U);
         VK::traceVariable(source, "name", "a value that is longer than a short string is inside");
         VK::traceMessage(source, "text", VK::FailureLevel);
     }
@@ -132,24 +132,24 @@ class EndedThread : public testing::TestWithParam<void (*)()> {};
 TEST_P(EndedThread, IsUnwoundFromALine) {
     EXPECT_TRUE(endsThread([] {
         logging = GetParam();
-        VK::traceMethod(source);
+        VK::traceMethod(VK_METHOD(source));
     }));
 }
 
 TEST_P(EndedThread, IsUnwoundFromTheEntryOfAScope) {
     EXPECT_TRUE(endsThread([] {
         logging = GetParam();
-        const VK::ParameterTraceScope scope(source, " count=", 7U);
+        const VK::ParameterTraceScope scope(VK_SCOPE(source), " count=", 7U);
     }));
     EXPECT_TRUE(endsThread([] {
         logging = GetParam();
-        const VK::DestructorTraceScope scope(source);
+        const VK::DestructorTraceScope scope(VK_SCOPE(source));
     }));
 }
 
 template <class Scope, class... Parameters>
 void leaveAtTheEnd(const Parameters&... parameters) {
-    const Scope scope(source, parameters...);
+    const Scope scope(VK_SCOPE(source), parameters...);
     logging = [] {
         const auto leave = EndedThread::GetParam();
         logging = [] {};
@@ -166,7 +166,7 @@ TEST_P(EndedThread, IsUnwoundFromTheEndOfAScope) {
 TEST_P(EndedThread, IsUnwoundFromADestructorsLine) {
     EXPECT_TRUE(endsThread([] {
         logging = GetParam();
-        VK::traceDestructor(source);
+        VK::traceDestructor(VK_METHOD(source));
     }));
 }
 
@@ -178,8 +178,8 @@ TEST(CancelledThread, EndsAfterTheScopesThatAnExceptionLeaves) {
     static bool caught = false;
     EXPECT_TRUE(endsThread([] {
         try {
-            const VK::TraceScope outer(source);
-            const VK::ParameterTraceScope inner(source, " count=", 7U);
+            const VK::TraceScope outer(VK_SCOPE(source));
+            const VK::ParameterTraceScope inner(VK_SCOPE(source), " count=", 7U);
             logging = leaveByCancellation;
             throw std::runtime_error("out");
         } catch (const std::runtime_error&) {

@@ -116,7 +116,7 @@ TEST(Markers, WriteTheRuleAroundTheOperation) {
 }
 
 void earlyReturn(bool leave) {
-    const TraceScope scope(source);
+    const TraceScope scope(VK_SCOPE(source));
     if (leave) return;
     traceVariable(source, "leave", 0U);
 }
@@ -133,7 +133,7 @@ TEST(TraceScope, WritesEntryAndExitAlsoOnAnEarlyReturn) {
 }
 
 void throwing(const std::string& reference) {
-    const ParameterTraceScope scope(source, " filterType=", 0U, " reference=", reference.c_str());
+    const ParameterTraceScope scope(VK_SCOPE(source), " filterType=", 0U, " reference=", reference.c_str());
     throw std::runtime_error("out");
 }
 
@@ -152,7 +152,7 @@ TEST(ParameterTraceScope, WritesItsParametersTwiceAlsoOnAnException) {
 TEST(TraceLines, CarryTheLevelAskedFor) {
     test::takeLog();
     traceMessage(source, "failed", FailureLevel);
-    traceMethod(source);
+    traceMethod(VK_METHOD(source));
     const std::vector<std::string> lines = test::withoutPlaces(test::takeLog());
     ASSERT_EQ(lines.size(), 4U);
     EXPECT_THAT(lines[0], StartsWith("LOG 6000 Norvane.BaseServerProvider Sample "));
@@ -163,8 +163,8 @@ TEST(TraceLines, CarryTheLevelAskedFor) {
 TEST(Trace, CostsNoMemoryAllocationALine) {
     const int object = 5;
     const auto lines = [&object] {
-        const TraceScope scope(source);
-        const ParameterTraceScope parameters(source, " object=", &object, " number=", 7U);
+        const TraceScope scope(VK_SCOPE(source));
+        const ParameterTraceScope parameters(VK_SCOPE(source), " object=", &object, " number=", 7U);
         traceVariable(source, "name", "a value that is longer than a short string is inside");
         traceMessage(source, "a message that is longer than a short string is inside", DebugLevel);
     };

@@ -26,7 +26,7 @@ Events takeEvents() {
 
 TEST(OperationFrame, RunsTheWorkBetweenTheMarkers) {
     test::takeLog();
-    const CMPIStatus status = OperationFrame("Sample").runMarked([](CMPIStatus& inside) {
+    const CMPIStatus status = OperationFrame(VK_PLACE(), "Sample").runMarked([](CMPIStatus& inside) {
         VK::traceVariable(frameSource, "inside", 1U);
         inside.rc = CMPI_RC_ERR_INVALID_CLASS;
     });
@@ -38,7 +38,7 @@ TEST(OperationFrame, RunsTheWorkBetweenTheMarkers) {
 
 TEST(OperationFrame, AnswersTheStatusAsItStoodWhenTheWorkThrows) {
     for (const CMPIrc before : {CMPI_RC_OK, CMPI_RC_ERR_INVALID_CLASS}) {
-        const CMPIStatus status = OperationFrame("Sample").runMarked([&](CMPIStatus& inside) {
+        const CMPIStatus status = OperationFrame(VK_PLACE(), "Sample").runMarked([&](CMPIStatus& inside) {
             inside.rc = before;
             throw std::runtime_error("failed");
         });
@@ -49,7 +49,7 @@ TEST(OperationFrame, AnswersTheStatusAsItStoodWhenTheWorkThrows) {
 
 TEST(OperationFrame, LogsTheExceptionBeforeTheExitMarker) {
     test::takeLog();
-    OperationFrame("Sample").runMarked([](CMPIStatus&) { throw std::runtime_error("it failed: 100%s"); });
+    OperationFrame(VK_PLACE(), "Sample").runMarked([](CMPIStatus&) { throw std::runtime_error("it failed: 100%s"); });
     EXPECT_EQ(takeEvents(), test::entryMarker("Sample") +
                                 Events{test::event(3000, file, "Sample",
                                                    "MESSAGE [File: BaseServerProvider, Line: N]: "
@@ -60,8 +60,9 @@ TEST(OperationFrame, LogsTheExceptionBeforeTheExitMarker) {
 TEST(OperationFrame, HandsTheExceptionOnWithoutAnExitMarker) {
     test::takeLog();
     std::string text;
-    OperationFrame("Sample").run([] { throw std::runtime_error("failed"); },
-                                 [&](const std::exception& exception) { text = exception.what(); });
+    OperationFrame(VK_PLACE(), "Sample")
+        .run([] { throw std::runtime_error("failed"); },
+             [&](const std::exception& exception) { text = exception.what(); });
     EXPECT_EQ(text, "failed");
     EXPECT_EQ(takeEvents(),
               test::entryMarker("Sample") +
@@ -69,12 +70,12 @@ TEST(OperationFrame, HandsTheExceptionOnWithoutAnExitMarker) {
 }
 
 TEST(OperationFrame, DoesNotCatchWhatIsNoStandardException) {
-    EXPECT_THROW(OperationFrame("Sample").runMarked([](CMPIStatus&) { throw 42; }), int);
+    EXPECT_THROW(OperationFrame(VK_PLACE(), "Sample").runMarked([](CMPIStatus&) { throw 42; }), int);
 }
 
 TEST(OperationFrame, WritesOneMethodLineForWhatIsNotSupported) {
     test::takeLog();
-    const CMPIStatus status = OperationFrame("Sample").notSupported();
+    const CMPIStatus status = OperationFrame(VK_PLACE(), "Sample").notSupported();
     EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
     EXPECT_EQ(status.msg, nullptr);
     EXPECT_THAT(takeEvents(), ElementsAre(test::method(file, "Sample")));
@@ -82,7 +83,7 @@ TEST(OperationFrame, WritesOneMethodLineForWhatIsNotSupported) {
 
 TEST(OperationFrame, IsNamedAfterTheFunctionThatMakesIt) {
     test::takeLog();
-    const OperationFrame frame;
+    const OperationFrame frame(VK_PLACE());
     frame.notSupported();
     EXPECT_THAT(takeEvents(), ElementsAre(test::method(file, "TestBody")));
 }
@@ -108,7 +109,7 @@ protected:
     bool refusing = true;
     CMPIResultFT table = resultTable();
     const CMPIResult result = {&refusing, &table};
-    const OperationFrame frame{"Sample"};
+    const OperationFrame frame{VK_PLACE(), "Sample"};
     Answer answer{frame, &result};
     const CMPIObjectPath path = {};
     const CMPIInstance instance = {};

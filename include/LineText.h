@@ -1,0 +1,28 @@
+#pragma once
+
+#include "include/MessageBuffer.h"
+
+#include <atomic>
+#include <string>
+
+namespace VK {
+
+/// The string in which a line with values is handed over. It has its memory from lines before, of any thread: a line
+/// allocates nothing, and a thread that serves one request pays for nothing of its own.
+class LineText {
+public:
+    LineText();
+    ~LineText();
+    LineText(const LineText&) = delete;
+    LineText& operator=(const LineText&) = delete;
+
+    std::string* operator->() const { return text; }
+    const std::string& operator*() const { return *text; }
+
+private:
+    std::atomic<bool>* taken = nullptr; ///< of a string for all; null where none was free
+    std::string own;
+    std::string* text = &own;
+};
+
+} // namespace VK
