@@ -9,6 +9,7 @@ import subprocess
 import generator
 from programs import ROOMS
 
+FEW, PART = 25, 100  # mutants of a file, and of a part, that are chosen at random
 TAKEN = re.compile(r"-(I|isystem|D|U|std=)(.*)")
 
 
@@ -60,20 +61,22 @@ class Choice:
                 lines.setdefault(file, set()).update(range(first, first + count))
         return lines
 
-    def at_random(self, seed, files):
-        """Without end but for that of the mutants; a file as often as it is long."""
+    def at_random(self, seed, files, count=None):
+        """Parts, each of a few mutants of a few files, until so many are chosen or all files were; no file comes twice, and a
+        long one is the likelier to come early."""
         numbers = random.Random(seed)
-        weights = {file: len((self.root / file).read_bytes()) for file in files}
-        left = {}
-        while weights:
-            file, = numbers.choices(list(weights), list(weights.values()))
-            if file not in left:
-                left[file] = list(self.mutants_of(file))
-                numbers.shuffle(left[file])
-            if left[file]:
-                yield left[file].pop()
-            else:
-                del weights[file]
+        left = {file: len((self.root / file).read_bytes()) for file in files}
+        part, open_count = [], count or sum(left.values())
+        while left and open_count:
+            file, = numbers.choices(list(left), list(left.values()))
+            del left[file]
+            some = self.mutants_of(file)
+            part += numbers.sample(some, min(len(some), FEW, PART - len(part), open_count - len(part)))
+            if len(part) in (PART, open_count):
+                yield part
+                part, open_count = [], open_count - len(part)
+        if part:
+            yield part
 
 
 def taken(command):

@@ -3,6 +3,7 @@
 What stands in strings, comments, directives and macros is left alone, and so is what only declares: parameters, members,
 enumerators, sizes of arrays, arguments of templates.
 """
+import contextlib
 import dataclasses
 import re
 
@@ -42,8 +43,9 @@ def walk_function(source, node):
     body = [child for child in children if child.kind in (Kind.COMPOUND_STMT, Kind.CXX_TRY_STMT)]
     if body and node.kind == Kind.CONSTRUCTOR:  # what its members begin with
         body = [child for child in children if child.kind.is_expression()] + body
-    for child in body:
-        walk(source, child, full_name(node), node, node)
+    with computed_when_compiling(source, node):
+        for child in body:
+            walk(source, child, full_name(node), node, node)
 
 
 def walk_variable(source, node, function):
@@ -51,10 +53,20 @@ def walk_variable(source, node, function):
     name_end = node.location.offset + len(node.spelling)
     if source.text[node.location.offset:name_end] != node.spelling:
         return  # made by a macro
-    for child in node.get_children():
-        between = source.text[name_end:start_of(child)]
-        if start_of(child) >= name_end and not re.fullmatch(r"\s*(\[[^]]*\]\s*)*\[\s*", between):
-            walk(source, child, function, node, node)
+    with computed_when_compiling(source, node):
+        for child in node.get_children():
+            between = source.text[name_end:start_of(child)]
+            if start_of(child) >= name_end and not re.fullmatch(r"\s*(\[[^]]*\]\s*)*\[\s*", between):
+                walk(source, child, function, node, node)
+
+
+@contextlib.contextmanager
+def computed_when_compiling(source, node):
+    """While it lasts, mutants are found that a process cannot choose, if the declaration says constexpr or the like."""
+    fixed = re.search(r"\bconst(expr|eval|init)\b", source.text[start_of(node):node.location.offset]) is not None
+    source.fixed += fixed
+    yield
+    source.fixed -= fixed
 
 
 def walk(source, node, function, holder, outer):

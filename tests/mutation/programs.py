@@ -1,26 +1,37 @@
 """Which test programs there are, which of them are near a source, and what they find."""
+import collections
+import functools
 import json
 import pathlib
 import re
+import signal
+import tempfile
+import threading
 import time
 
+import workspace
+
 ROOMS = ("provider", "cmpi", "Linux", "include", "platform")
-WHOLE = r"^(load|system)\."  # tests that are no GoogleTest programs
-SECONDS = 30  # that a program may take beyond ten times what it takes unchanged
+WHOLE = re.compile(r"(load|system)\.")  # tests that are no GoogleTest programs
+ENDLESS = "no end"
+UNSTEADY = 4  # times that an unchanged program is tried, each without the tests that failed before
+SECONDS = 5  # that a program may compute beyond five times what it takes unchanged
 
 
 class Program:
-    """A GoogleTest program, or a part of its tests."""
+    """A GoogleTest program or a part of its tests; or another test."""
 
-    def __init__(self, target, path, sources, suites=()):
+    def __init__(self, target, path=None, sources=(), suites=()):
         self.target = target
         self.path = path
         self.sources = [pathlib.PurePath(source) for source in sources]
         self.suites = suites
 
-    def command(self):
-        chosen = ":".join(f"{suite}.*:*/{suite}.*:{suite}/*" for suite in self.suites)  # those with parameters and types
-        return [self.path, "--gtest_fail_fast", *([f"--gtest_filter={chosen}"] if chosen else [])]
+    def command(self, left_out=()):
+        if not self.path:
+            return ["ctest", "--test-dir", "build", "-R", f"^{re.escape(self.target)}$"]
+        chosen = ":".join(f"{suite}.*:*/{suite}.*:{suite}/*" for suite in self.suites) or "*"  # with parameters and types
+        return [self.path, "--gtest_fail_fast", f"--gtest_filter={chosen}-{':'.join(left_out)}"]
 
     def key(self):
         return self.target, tuple(self.suites)
@@ -30,16 +41,19 @@ class Program:
 
 
 class Programs:
-    def __init__(self, workspace):
-        self.workspace = workspace
-        self.environments = {}
-        self.seconds = {}  # by program: what it takes unchanged
+    def __init__(self, copy, size):
+        self.copy = copy
+        self.size = size
         self.known = sorted(self.read_targets(), key=lambda program: program.target)
-        self.targets = [program.target for program in self.known]
+        self.environments = {}
+        self.locks = collections.defaultdict(threading.Lock)
+        self.seconds = {}  # by program: what it takes unchanged
+        self.left_out = collections.defaultdict(list)  # by target: the tests that fail unchanged
+        self.reached = {}  # by program: the places of mutants, one byte for each number
 
     def read_targets(self):
         """From what CMake says of its targets."""
-        replies = self.workspace.tree / "build/.cmake/api/v1/reply"
+        replies = self.copy.tree / "build/.cmake/api/v1/reply"
         for file in replies.glob("target-*.json"):
             target = json.loads(file.read_text())
             sources = [source["path"] for source in target.get("sources", [])]
@@ -47,6 +61,7 @@ class Programs:
                     any(source.endswith("Test.cpp") for source in sources):
                 yield Program(target["name"], f"build/{target['artifacts'][0]['path']}", sources)
 
+    @functools.cache
     def rounds(self, file):
         """The programs that may notice that a file was mutated: the tests that mirror it, its room's, all others."""
         file = pathlib.PurePath(file)
@@ -67,33 +82,56 @@ class Programs:
             return None
         if len([source for source in program.sources if source.stem.endswith("Test")]) == len(named):
             return program
-        texts = [(self.workspace.tree / source).read_text() for source in named]
+        texts = [(self.copy.tree / source).read_text() for source in named]
         suites = sorted({suite for text in texts for suite in re.findall(r"^(?:TYPED_)?TEST(?:_F|_P)?\((\w+)", text, re.M)})
         return Program(program.target, program.path, program.sources, suites)
 
-    def environment_of(self, program):
-        """The variables that a program's tests are given, as ctest knows them since it was built."""
-        if program.target not in self.environments:
-            known = json.loads(self.workspace.output(["ctest", "--test-dir", "build", "--show-only=json-v1", "-R",
-                                                      rf"^{program.target}\."]))
-            given = [value for test in known["tests"][:1] for each in test["properties"]
-                     if each["name"] == "ENVIRONMENT" for value in each["value"]]
-            self.environments[program.target] = dict(value.split("=", 1) for value in given)
-        return self.environments[program.target]
+    def read_tests(self):
+        """What ctest knows once all is built: the variables that programs are given, and tests of other kinds."""
+        listed = json.loads(self.copy.output(["ctest", "--test-dir", "build", "--show-only=json-v1"]))["tests"]
+        for test in listed:
+            given = [value for each in test["properties"] if each["name"] == "ENVIRONMENT" for value in each["value"]]
+            self.environments[test["name"].split(".")[0]] = dict(value.split("=", 1) for value in given)
+        self.known += [Program(test["name"]) for test in listed if WHOLE.match(test["name"])]
 
-    def failure_of(self, program):
-        """What failed in a program; None when it passed."""
-        usual = self.seconds.get(program.key(), SECONDS)
-        start = time.monotonic()
-        status, said = self.workspace.run(program.command(), 10 * usual + SECONDS, self.environment_of(program))
-        if status == 0:
-            self.seconds.setdefault(program.key(), time.monotonic() - start)
-            return None
-        return f"{program.target}: {reason(status, said)}"
+    def quickest(self, programs):
+        """Quick ones first, and before them those of which nothing is known yet."""
+        return sorted(programs, key=lambda program: self.seconds.get(program.key(), 0))
 
-    def whole_failure(self):
-        """What failed of the tests of the whole provider that are programs of other kinds."""
-        status, said = self.workspace.run(["ctest", "--test-dir", "build", "-R", WHOLE, "--stop-on-failure"], 1200)
+    def reaches(self, program, number):
+        """Whether a program gets to a mutant's place; it is run unchanged before its first use, and has to pass."""
+        with self.locks[program.key()]:
+            if program.key() not in self.reached:
+                self.try_unchanged(program)
+        return self.reached[program.key()][number]
+
+    def try_unchanged(self, program):
+        with tempfile.NamedTemporaryFile() as reached:
+            reached.truncate(self.size)
+            for _ in range(UNSTEADY):
+                start = time.monotonic()
+                failed = self.run(program, reached=reached.name)
+                self.seconds[program.key()] = time.monotonic() - start
+                if failed is None:
+                    self.reached[program.key()] = reached.read()
+                    return
+                if "." not in failed or not program.path:
+                    break
+                print(f"left out, for it fails unchanged: {program.target}: {failed}", flush=True)
+                self.left_out[program.target].append(failed)
+        raise workspace.Failure(f"the unchanged copy fails: {program.target}: {failed}")
+
+    def failure_of(self, program, mutant=None):
+        """What failed in a program twice, run as a mutant or not; None when it passed."""
+        failed = self.run(program, mutant)
+        if failed not in (None, ENDLESS):
+            failed = self.run(program, mutant)
+        return failed and f"{program.target}: {failed}"
+
+    def run(self, program, mutant=None, reached=None):
+        seconds = SECONDS + 5 * self.seconds.get(program.key(), 60)
+        status, said = self.copy.run(program.command(self.left_out[program.target]), int(seconds),
+                                     self.environments.get(program.target), mutant, reached)
         return None if status == 0 else reason(status, said)
 
 
@@ -102,8 +140,8 @@ def in_parts(programs, size=8):
 
 
 def reason(status, said):
-    if status is None:
-        return "no end"
+    if status in (None, *(128 + number for number in (signal.SIGKILL, signal.SIGXCPU))):
+        return ENDLESS
     failed = re.search(r"\[  FAILED  \] (\S+)", said) or re.search(r"Test +#\d+: (\S+) .*(?:Failed|Exception|Timeout)", said)
     if failed:
         return failed.group(1).rstrip(",")

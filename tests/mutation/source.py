@@ -19,6 +19,9 @@ class Mutant:
     old: str
     function: str
     last_line: int
+    # The expression or statement that a process may have either way, from its start to its end; None where the mistake has
+    # to be there when it is compiled.
+    place: tuple[int, int] | None = dataclasses.field(default=None, compare=False)
 
     def apply(self, text):
         return text[:self.start] + self.new + text[self.end:]
@@ -39,14 +42,16 @@ class Source:
         self.text = read(path)
         self.line_starts = [0] + [found.end() for found in re.finditer("\n", self.text)]
         self.mutants = set()
+        self.fixed = 0  # how many of what is being read are computed when compiling
 
     def line_of(self, offset):
         return bisect.bisect_right(self.line_starts, offset)
 
-    def add(self, function, kind, start, end, new):
+    def add(self, function, kind, start, end, new, place=None):
         old = self.text[start:end]
         if old != new:
-            self.mutants.add(Mutant(self.name, self.line_of(start), start, end, kind, new, old, function, self.line_of(end)))
+            self.mutants.add(Mutant(self.name, self.line_of(start), start, end, kind, new, old, function, self.line_of(end),
+                                    None if self.fixed else place))
 
     def text_of(self, node):
         return self.text[start_of(node):end_of(node)]
@@ -74,6 +79,10 @@ def start_of(node):
 
 def end_of(node):
     return node.extent.end.offset
+
+
+def place_of(node):
+    return start_of(node), end_of(node)
 
 
 def full_name(node):

@@ -4,11 +4,12 @@ import re
 from clang.cindex import CursorKind as Kind
 from clang.cindex import TypeKind
 
-from source import end_of, start_of
+from source import end_of, place_of, start_of
 
 COMPARISONS = {"==": "!=", "!=": "==", "<": ">=", ">=": "<", ">": "<=", "<=": ">"}
 BOUNDARIES = {"<": "<=", "<=": "<", ">": ">=", ">=": ">"}
 CONNECTIVES = ("&&", "||")
+NEGATION, REMOVED = "negation", "removed statement"
 LITERAL = re.compile(r"(0[xX][0-9a-fA-F]+|[0-9]+)([uUlLzZ]*)")
 
 FUNCTIONS = (Kind.FUNCTION_DECL, Kind.FUNCTION_TEMPLATE, Kind.CXX_METHOD, Kind.CONSTRUCTOR, Kind.DESTRUCTOR,
@@ -23,7 +24,8 @@ def mutate_operator(source, operands, function):
     operator, start = source.operator_of(operands)
     for kind, table in (("comparison", COMPARISONS), ("boundary", BOUNDARIES)):
         if operator in table:
-            source.add(function, kind, start, start + len(operator), table[operator])
+            source.add(function, kind, start, start + len(operator), table[operator],
+                       (start_of(operands[0]), end_of(operands[-1])))
     if operator in CONNECTIVES:
         for operand in (operands[0], operands[-1]):
             negate(source, operand, function)
@@ -40,12 +42,12 @@ def negate(source, node, function):
         operator, _ = source.operator_of(list(node.get_children()))
         if operator in COMPARISONS or operator in CONNECTIVES:
             return
-    source.add(function, "negation", start_of(node), end_of(node), f"!({text})")
+    source.add(function, NEGATION, start_of(node), end_of(node), f"!({text})", place_of(node))
 
 
 def drop_negation(source, node, function):
     if re.match(r"!(?!=)", source.text_of(node)):  # clang makes a != b of a == b where it has to
-        source.add(function, "negation", start_of(node), start_of(node) + 1, "")
+        source.add(function, NEGATION, start_of(node), start_of(node) + 1, "", place_of(node))
 
 
 def mutate_constant(source, node, function):
@@ -61,7 +63,7 @@ def mutate_constant(source, node, function):
         new = {16: f"0x{value:X}", 8: f"0{value:o}", 10: str(value)}[base] + suffix
     else:
         return
-    source.add(function, "constant", start_of(node), end_of(node), new)
+    source.add(function, "constant", start_of(node), end_of(node), new, place_of(node))
 
 
 def swap_rows(source, node, rows, function, holder):
@@ -97,7 +99,7 @@ def remove_statement(source, node, holder, outer, function):
     start, end = start_of(node), end_of(node)
     if node.kind == Kind.DECL_STMT:
         if holder.kind == Kind.COMPOUND_STMT and is_guard(source, node, holder):
-            source.add(function, "removed statement", start, end - 1, "")
+            source.add(function, REMOVED, start, end - 1, "")
         return
     if not node.kind.is_expression() and node.kind not in JUMPS:
         return
@@ -107,7 +109,7 @@ def remove_statement(source, node, holder, outer, function):
         return  # the head of a loop
     if node.kind == Kind.RETURN_STMT and (outer.kind in FUNCTIONS or outer.kind == Kind.LAMBDA_EXPR):
         return  # nothing would be returned
-    source.add(function, "removed statement", start, end, "")
+    source.add(function, REMOVED, start, end, "", (start, source.text.index(";", end) + 1))
 
 
 def is_guard(source, node, holder):

@@ -5,22 +5,15 @@ read-only, or in memory: whatever a mutant does with the host's files, clock, na
 """
 import fcntl
 import os
-import resource
 import shutil
 import signal
 import subprocess
 import tempfile
 
-from source import read, write
-
 BUILD = "build"
-# Mutants are built with warnings as errors, too; these are what a mistake brings with it.
-UNWARNED = ("unused-variable unused-but-set-variable unused-but-set-parameter unused-parameter unused-function unused-value "
-            "return-type conversion sign-compare type-limits tautological-compare bool-compare bool-operation "
-            "int-in-bool-context parentheses implicit-fallthrough empty-body maybe-uninitialized uninitialized array-bounds "
-            "stringop-overflow stringop-overread stringop-truncation restrict nonnull dangling-else misleading-indentation "
-            "shift-count-overflow overflow switch format-truncation format-overflow unused-local-typedefs infinite-recursion")
-PRAGMAS = " ".join(f'_Pragma("GCC diagnostic ignored \\"-W{warning}\\"")' for warning in UNWARNED.split())
+# A mutant that loops may log without end, or fill the memory.
+LIMITS = [f"--fsize={1 << 28}", f"--as={8 << 30}", "--core=0"]
+PATIENCE = 4  # seconds that may pass for each that a process may compute: it sleeps, and others compute, too
 
 
 class Failure(Exception):
@@ -32,6 +25,7 @@ class Workspace:
         self.root = root
         self.tree = folder / "tree"
         self.log = folder / "log"
+        self.reached = root / BUILD / "reached"  # in the sandbox
         self.jobs = jobs
         self.tree.mkdir(parents=True, exist_ok=True)
         self.lock = open(folder / "lock", "w", encoding="ascii")
@@ -66,14 +60,16 @@ class Workspace:
         query = self.tree / BUILD / ".cmake/api/v1/query/codemodel-v2"
         query.parent.mkdir(parents=True, exist_ok=True)
         query.touch()
+        (self.tree / BUILD / "Testing").mkdir(exist_ok=True)
+        (self.tree / BUILD / "reached").touch()
         # A program is not linked again because a library's insides have changed.
         command = ["cmake", "--preset", "release", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON"]
         if self.logged(command) != 0:
             raise Failure(f"the copy cannot be configured:\n{self.log.read_text(errors='replace')[-2000:]}")
 
-    def sandboxed(self, command):
+    def sandboxed(self, command, *places):
         return ["bwrap", "--ro-bind", "/", "/", "--dev", "/dev", "--proc", "/proc", "--tmpfs", "/tmp",
-                "--bind", self.tree, self.root, "--unshare-pid", "--unshare-ipc", "--unshare-uts", "--unshare-net",
+                *(places or ("--bind", self.tree, self.root)), "--unshare-pid", "--unshare-ipc", "--unshare-uts", "--unshare-net",
                 "--cap-drop", "CAP_SYS_TIME", "--die-with-parent", "--chdir", self.root, "--", *command]
 
     def logged(self, command):
@@ -84,22 +80,27 @@ class Workspace:
     def output(self, command):
         return subprocess.run(self.sandboxed(command), check=True, stdout=subprocess.PIPE, stdin=subprocess.DEVNULL).stdout
 
-    def build(self, targets):
+    def build(self, targets, *options):
         """None when the targets are built; else what went wrong."""
-        if self.logged(["cmake", "--build", BUILD, "-j", str(self.jobs), "--target", *targets]) == 0:
+        if self.logged(["cmake", "--build", BUILD, "-j", str(self.jobs), "--target", *targets, "--", *options]) == 0:
             return None
         said = self.log.read_text(errors="replace")
         # A program that is built is asked for its tests at once.
         return "cannot start" if "Error running test executable" in said else "does not compile"
 
-    def run(self, command, seconds, environment=None):
-        """The status and output of a command; a status of None when it did not end in time."""
+    def run(self, command, seconds, environment=None, mutant=None, reached=None):
+        """The status and output of a command, as a mutant or none; a status of None when it did not end in time. A file
+        given as `reached` learns which mutants' places were, and there is no mutant then."""
+        places = ["--ro-bind", self.tree, self.root, "--tmpfs", self.root / BUILD / "Testing"]
+        if reached:
+            places += ["--bind", reached, self.reached]
+        limits = LIMITS + [f"--rss={0 if reached else mutant or 'unlimited'}:", f"--cpu={seconds}"]
         with tempfile.TemporaryFile() as output:
-            child = subprocess.Popen(self.sandboxed(command), stdout=output, stderr=subprocess.STDOUT,
-                                     stdin=subprocess.DEVNULL, start_new_session=True, preexec_fn=limit,
+            child = subprocess.Popen(["prlimit", *limits, *self.sandboxed(command, *places)], stdout=output,
+                                     stderr=subprocess.STDOUT, stdin=subprocess.DEVNULL, start_new_session=True,
                                      env={**os.environ, "TMPDIR": "/tmp", **(environment or {})})
             try:
-                status = child.wait(seconds)
+                status = child.wait(PATIENCE * seconds)
             except subprocess.TimeoutExpired:
                 status = None
             finally:
@@ -108,26 +109,3 @@ class Workspace:
                     child.wait()
             output.seek(0)
             return status, output.read().decode(errors="replace")
-
-    def mutated(self, mutant):
-        return Mutated(self.tree / mutant.file, mutant)
-
-
-def limit():
-    resource.setrlimit(resource.RLIMIT_FSIZE, (1 << 30, 1 << 30))  # a mutant that loops may log without end
-    resource.setrlimit(resource.RLIMIT_CORE, (0, 0))
-
-
-class Mutated:
-    """While it lasts, the mutant stands in the copy."""
-
-    def __init__(self, path, mutant):
-        self.path = path
-        self.mutant = mutant
-
-    def __enter__(self):
-        self.original = read(self.path)
-        write(self.path, f"{PRAGMAS}\n{self.mutant.apply(self.original)}")
-
-    def __exit__(self, *_):
-        write(self.path, self.original)
