@@ -3,6 +3,7 @@
  *
  * OBJECT(type): a handle and its table. TABLE(type, size, slots...): a version, and slots in this order behind it.
  * SLOTS(type, first, slots...): slots from that one on, counted in pointers. FROM(number, names...): names that count.
+ * AT_START(type, size, members...): members of that size at offset 0. ARRAYS(types...): the code of arrays of each type.
  */
 #pragma once
 
@@ -13,6 +14,13 @@
 #define TABLE(type, size, ...) STRUCT(type, size, 8) FIELD(type, ftVersion, 0, 4) SLOTS(type, 1, __VA_ARGS__)
 #define SLOTS(type, first, ...) EACH_OF(SLOT, type, first, __VA_ARGS__)
 #define SLOT(type, number, member) FIELD(type, member, 8 * (number), 8)
+#define AT_START(type, size, ...) EACH_OF(AT_START_##size, type, 0, __VA_ARGS__)
+#define AT_START_8(type, number, member) FIELD(type, member, 0, 8)
+#define AT_START_4(type, number, member) FIELD(type, member, 0, 4)
+#define AT_START_2(type, number, member) FIELD(type, member, 0, 2)
+#define AT_START_1(type, number, member) FIELD(type, member, 0, 1)
+#define ARRAYS(...) EACH_OF(ARRAY_CODE, , 0, __VA_ARGS__)
+#define ARRAY_CODE(nothing, number, type) VALUE(CMPI_##type##A, (8192 | CMPI_##type))
 #define FROM(first, ...) EACH_OF(COUNTED, , first, __VA_ARGS__)
 #define COUNTED(nothing, number, name) VALUE(name, number)
 
