@@ -44,18 +44,6 @@ TEST(ComputerSystem, TellsHealthFromTheNodeStatus) {
     }
 }
 
-TEST(ComputerSystem, TellsAPredictiveFailure) {
-    test::simulateOne([](test::Node& node) { node.status = 20; });
-    const ComputerSystem system;
-    unsigned short health = 0;
-    std::string text;
-    Numbers states;
-    EXPECT_TRUE(system.getHealthState(health) && system.getStatus(text) && system.getOperationalStatus(states));
-    EXPECT_EQ(health, 10);
-    EXPECT_EQ(text, "Pred Fail");
-    EXPECT_THAT(states, ElementsAre(3, 5));
-}
-
 TEST(ComputerSystem, AppendsTheOperationalStatusToWhatTheCallerHas) {
     const std::pair<unsigned, Numbers> expected[] = {{0, {9, 0}}, {1, {9, 2, 11}}, {20, {9, 3, 5}}, {21, {9, 3}}};
     for (const auto& [status, wanted] : expected) {
@@ -66,25 +54,14 @@ TEST(ComputerSystem, AppendsTheOperationalStatusToWhatTheCallerHas) {
     }
 }
 
-TEST(ComputerSystem, TellsTheEnabledStateFromThePowerState) {
-    struct Case {
-        unsigned powerState;
-        unsigned short enabledState;
-    };
-    for (const Case expected : {Case{0, 0}, Case{1, 2}, Case{16, 4}}) {
-        test::simulateOne([&](test::Node& node) { node.properties[123] = expected.powerState; });
+TEST(ComputerSystem, TellsTheEnabledStateFromThePowerStateAndLeavesItForOthers) {
+    const std::pair<unsigned, unsigned short> expected[] = {{0, 0},  {1, 2},   {16, 4},  {7, 77},
+                                                            {2, 77}, {15, 77}, {17, 77}, {4294967295U, 77}};
+    for (const auto& [powerState, enabledState] : expected) {
+        test::simulateOne([power = powerState](test::Node& node) { node.properties[123] = power; });
         unsigned short state = 77;
         EXPECT_TRUE(ComputerSystem().getEnabledState(state));
-        EXPECT_EQ(state, expected.enabledState) << "power state " << expected.powerState;
-    }
-}
-
-TEST(ComputerSystem, SuppliesTheEnabledStateUnchangedForOtherPowerStates) {
-    for (const unsigned powerState : {7U, 2U, 15U, 17U, 4294967295U}) {
-        test::simulateOne([&](test::Node& node) { node.properties[123] = powerState; });
-        unsigned short state = 77;
-        EXPECT_TRUE(ComputerSystem().getEnabledState(state)) << "power state " << powerState;
-        EXPECT_EQ(state, 77) << "power state " << powerState;
+        EXPECT_EQ(state, enabledState) << "power state " << powerState;
     }
 }
 

@@ -23,16 +23,6 @@ TEST(EnabledLogicalElementCapabilities, AreOneForEachComputerNamedByItsPath) {
     EXPECT_THAT(instanceIDs(capabilities), testing::ElementsAre("/computer/0", "/computer/1"));
 }
 
-TEST(EnabledLogicalElementCapabilities, TellTheInstanceIDInTheLog) {
-    test::simulate({test::computer(0, "node7")});
-    const EnabledLogicalElementCapabilities capabilities;
-    test::takeLog();
-    std::string id;
-    EXPECT_TRUE(capabilities.getInstanceID(id));
-    EXPECT_THAT(test::takeLog(), testing::Contains(testing::ContainsRegex(
-                                     " LOG 4000 .*: VARIABLE: 'instanceID' has Value '/computer/0' at line")));
-}
-
 TEST(EnabledLogicalElementCapabilities, StayOnTheNodeWhoseInstanceIDTheFilterNames) {
     test::simulate({test::computer(0, "node7")});
     EnabledLogicalElementCapabilities named;
@@ -100,28 +90,6 @@ TEST(EnabledLogicalElementCapabilities, SupplyNothingElse) {
     EXPECT_EQ(length, 7);
     EXPECT_THAT(states, testing::ElementsAre(7));
     EXPECT_EQ(mask, "untouched");
-}
-
-TEST(EnabledLogicalElementCapabilities, AreAskedWhetherTheyPassAtEveryStepAlsoWithoutFilters) {
-    test::simulate({test::computer(0, "a"), test::computer(1, "b")});
-    EnabledLogicalElementCapabilities capabilities;
-    test::takeLog();
-    ++capabilities;
-    EXPECT_THAT(test::takeLog(), testing::Contains(testing::ContainsRegex(" LOG .*ENTERING: evaluate\\(\\)")).Times(1));
-    ++capabilities;
-    EXPECT_THAT(test::takeLog(), testing::Not(testing::Contains(testing::HasSubstr("evaluate"))));
-}
-
-TEST(EnabledLogicalElementCapabilities, WriteNoLineForWhatTheHostCannotSupply) {
-    test::simulate({test::computer(0, "node7")});
-    const EnabledLogicalElementCapabilities capabilities;
-    test::takeLog();
-    std::string text;
-    unsigned short number = 0;
-    std::vector<unsigned short> numbers;
-    EXPECT_FALSE(capabilities.getMaxElementNameLen(number) || capabilities.getRequestedStatesSupported(numbers) ||
-                 capabilities.getElementNameMask(text) || capabilities.getStateAwareness(numbers));
-    EXPECT_THAT(test::takeLog(), testing::IsEmpty());
 }
 
 } // namespace

@@ -33,22 +33,4 @@ TEST(SingleElement, HasNothingToFilter) {
     EXPECT_TRUE(static_cast<bool>(sample));
 }
 
-TEST(SingleElement, IsWalkedWithoutALine) {
-    test::simulate({test::computer(0, "node7")});
-    VK::BaseServerProvider::TimeService service;
-    VK::BaseServerProvider::CIMServiceConfig configuration;
-    const auto walk = [](auto& element) {
-        element.setFilter({}, "another");
-        EXPECT_TRUE(static_cast<bool>(element));
-        ++element;
-        EXPECT_FALSE(static_cast<bool>(element));
-    };
-    test::takeLog();
-    walk(service);
-    walk(configuration);
-    EXPECT_THAT(test::takeLog(), testing::IsEmpty());
-    EXPECT_TRUE(service.getName(*std::make_unique<std::string>())) << "which writes, unlike these";
-    EXPECT_THAT(test::takeLog(), testing::Not(testing::IsEmpty()));
-}
-
 } // namespace

@@ -106,13 +106,6 @@ TEST(CMPIElementCapabilities, GiveTheWholeInstanceAtTheOtherEnd) {
                 ElementsAre("InstanceID", "ElementName", "ElementNameEditSupported"));
 }
 
-TEST(CMPIElementCapabilities, EndAfterNothingForASourceOfAnotherClass) {
-    test::simulate({test::computer(0, "node7"), test::chassis(0, 0, "A")});
-    const om::Answer answer = test::associatorNames(test::path("VESKA_PhysicalPackage", {{"Tag", "A"}}), className);
-    EXPECT_THAT(answer.results, IsEmpty());
-    EXPECT_TRUE(answer.done);
-}
-
 TEST(CMPIElementCapabilities, ReturnNothingWhenAskedFromTheAssociationItself) {
     test::simulate({test::computer(0, "a"), test::computer(1, "b")});
     for (const om::ObjectPath& source : {test::path(className), association("a", "/computer/0")}) {
@@ -183,15 +176,6 @@ TEST(CMPIElementCapabilities, AreNoneForAnUnknownComputerAlsoWhereTheBrokerHasNo
         const VK::BaseServerProvider::CMPIElementCapabilities adapter(&without.broker, nullptr, source);
         EXPECT_EQ(static_cast<bool>(adapter), found) << name;
     }
-}
-
-TEST(CMPIElementCapabilities, TraceTheClassOfTheRequest) {
-    test::simulate({test::computer(0, "node7")});
-    test::takeLog();
-    test::associatorNames(computerPath("node7"), className);
-    EXPECT_THAT(test::withoutPlaces(test::takeLog()),
-                Contains("LOG 4000 Norvane.BaseServerProvider CMPIElementCapabilities CMPIElementCapabilities: "
-                         "VARIABLE: 'requestedClassId' has Value '1' [Line] in CMPIElementCapabilities"));
 }
 
 } // namespace

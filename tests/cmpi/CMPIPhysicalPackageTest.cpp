@@ -1,5 +1,4 @@
-#include "cmpi/CMPIPhysicalPackage.h"
-#include "support/Provider.h"
+#include "support/Requests.h"
 #include "support/SimulatedHost.h"
 
 #include <gmock/gmock.h>
@@ -25,42 +24,29 @@ std::vector<std::string> tags(const om::Answer& answer) {
     return found;
 }
 
-TEST(CMPIPhysicalPackage, NamesAChassisByClassAndSerialNumber) {
-    test::simulate({test::chassis(0, 0, "CZ1234")});
+TEST(CMPIPhysicalPackage, NamesAChassisByClassAndBySerialNumberWhereItHasOne) {
+    test::simulate({test::chassis(0, 0, "CZ1234"), test::without(test::chassis(0, 1, ""), 50)});
     const om::Answer answer = test::names("VESKA_PhysicalPackage");
-    ASSERT_EQ(answer.results.size(), 1U);
-    EXPECT_EQ(test::print(test::paths(answer)[0]),
-              "VESKA_PhysicalPackage.CreationClassName=\"VESKA_PhysicalPackage\",Tag=\"CZ1234\"");
+    EXPECT_THAT(test::printed(answer),
+                ElementsAre("VESKA_PhysicalPackage.CreationClassName=\"VESKA_PhysicalPackage\",Tag=\"CZ1234\"",
+                            "VESKA_PhysicalPackage.CreationClassName=\"VESKA_PhysicalPackage\""));
     EXPECT_EQ(test::paths(answer)[0].nameSpace, "root/cimv2");
     EXPECT_TRUE(answer.done);
-}
-
-TEST(CMPIPhysicalPackage, NamesAChassisWithoutSerialNumberByItsClassAlone) {
-    test::Node chassis = test::chassis(0, 0, "");
-    chassis.properties.erase(50);
-    test::simulate({chassis});
-    EXPECT_EQ(test::print(test::paths(test::names("VESKA_PhysicalPackage"))[0]),
-              "VESKA_PhysicalPackage.CreationClassName=\"VESKA_PhysicalPackage\"");
-    EXPECT_EQ(property(only(test::instances("VESKA_PhysicalPackage")), "Tag"), "(not set)");
+    EXPECT_THAT(tags(test::instances("VESKA_PhysicalPackage")), ElementsAre("CZ1234", "(not set)"));
 }
 
 TEST(CMPIPhysicalPackage, SetsWhatTheHostSuppliesInOrderAndNothingElse) {
     test::simulate({test::chassis(0, 0, "CZ1234")});
     const om::Instance instance = only(test::instances("VESKA_PhysicalPackage"));
-    EXPECT_THAT(test::namesOf(instance.properties),
-                ElementsAre("Tag", "Description", "CreationClassName", "ElementName", "Manufacturer", "Model", "SKU",
-                            "SerialNumber", "PackageType"));
-    EXPECT_EQ(property(instance, "Tag"), "CZ1234");
-    EXPECT_EQ(property(instance, "Description"), "Rack Mount Chassis");
-    EXPECT_EQ(property(instance, "CreationClassName"), "VESKA_PhysicalPackage");
-    EXPECT_EQ(property(instance, "ElementName"), "Rack Mount Chassis");
-    EXPECT_EQ(property(instance, "Manufacturer"), "Example");
-    EXPECT_EQ(property(instance, "Model"), "Box");
-    EXPECT_EQ(property(instance, "SKU"), "SKU-1");
-    EXPECT_EQ(property(instance, "SerialNumber"), "CZ1234");
-    const om::Value& type = *test::find(instance.properties, "PackageType");
-    EXPECT_EQ(type.type, CMPI_uint16);
-    EXPECT_EQ(std::get<std::uint64_t>(type.data), 2U);
+    const auto text = [](const char* name, const char* value) {
+        return om::NamedValue(name, {CMPI_string, std::string(value)});
+    };
+    EXPECT_THAT(instance.properties,
+                ElementsAre(text("Tag", "CZ1234"), text("Description", "Rack Mount Chassis"),
+                            text("CreationClassName", "VESKA_PhysicalPackage"),
+                            text("ElementName", "Rack Mount Chassis"), text("Manufacturer", "Example"),
+                            text("Model", "Box"), text("SKU", "SKU-1"), text("SerialNumber", "CZ1234"),
+                            om::NamedValue("PackageType", {CMPI_uint16, std::uint64_t{2}})));
 }
 
 TEST(CMPIPhysicalPackage, SetsAnEmptyDescriptionButNoElementName) {
@@ -89,13 +75,9 @@ TEST(CMPIPhysicalPackage, IsNarrowedByTagAndBySystemName) {
 
 TEST(CMPIPhysicalPackage, DoesNotApplyThePropertyList) {
     test::simulate({test::chassis(0, 0, "A")});
-    om::Request request;
-    request.operation = om::Operation::EnumInstances;
-    request.path = test::path("VESKA_PhysicalPackage");
-    request.propertyList = {"Tag"};
-    EXPECT_EQ(only(test::provider().run(request)).properties.size(), 9U);
-    request.propertyList = std::vector<std::string>{};
-    EXPECT_EQ(only(test::provider().run(request)).properties.size(), 9U);
+    const om::Request request = test::asking(om::Operation::EnumInstances, test::path("VESKA_PhysicalPackage"));
+    for (const std::vector<std::string>& list : {std::vector<std::string>{"Tag"}, {}})
+        EXPECT_EQ(only(test::provider().run(test::askingFor(list, request))).properties.size(), 9U);
 }
 
 TEST(CMPIPhysicalPackage, AnswersAnUnknownTagWithNothingAndNoError) {
@@ -104,37 +86,6 @@ TEST(CMPIPhysicalPackage, AnswersAnUnknownTagWithNothingAndNoError) {
     EXPECT_THAT(answer.results, IsEmpty());
     EXPECT_EQ(answer.code, CMPI_RC_OK);
     EXPECT_TRUE(answer.done);
-}
-
-/// What the adapter's functions wrote into the log channel, from the function's name on.
-std::vector<std::string> linesOf(const std::string& function) {
-    const std::string head = "LOG 4000 Norvane.BaseServerProvider CMPIPhysicalPackage ";
-    std::vector<std::string> lines;
-    for (const std::string& line : test::withoutPlaces(test::takeLog()))
-        if (line.rfind(head + function, 0) == 0) lines.push_back(line.substr(head.size()));
-    return lines;
-}
-
-TEST(CMPIPhysicalPackage, FiltersByTagFirstAndTracesBoth) {
-    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
-    test::takeLog();
-    test::get(test::path("VESKA_PhysicalPackage", {{"SystemName", "/computer/0"}, {"Tag", "A"}}));
-    EXPECT_THAT(
-        linesOf("setObjectPath: VARIABLE"),
-        ElementsAre("setObjectPath: VARIABLE: 'tag' has Value 'A' [Line] in CMPIPhysicalPackage",
-                    "setObjectPath: VARIABLE: 'systemName' has Value '/computer/0' [Line] in CMPIPhysicalPackage"));
-}
-
-TEST(CMPIPhysicalPackage, StartsAgainFromTheFirstChassisWithAMethodLine) {
-    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
-    VK::BaseServerProvider::CMPIPhysicalPackage adapter(test::provider().broker(), nullptr, "root/cimv2");
-    ++adapter;
-    EXPECT_FALSE(adapter);
-    test::takeLog();
-    adapter.initialize();
-    EXPECT_THAT(linesOf("initialize"),
-                ElementsAre("initialize: METHOD: initialize() was invoked in CMPIPhysicalPackage [Line]"));
-    EXPECT_TRUE(adapter);
 }
 
 } // namespace

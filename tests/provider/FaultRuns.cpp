@@ -1,5 +1,6 @@
 #include "provider/FaultRuns.h"
 
+#include "support/HostName.h"
 #include "support/NoCommands.h"
 #include "support/SimulatedHost.h"
 
@@ -53,26 +54,8 @@ bool runWith(const FaultCase& each, const om::Fault& fault, const std::string& k
 
 } // namespace
 
-om::Request asking(om::Operation operation, const om::ObjectPath& path) {
-    om::Request request;
-    request.operation = operation;
-    request.path = path;
-    return request;
-}
-
-om::Request calling(const std::string& className, const std::string& method, std::vector<om::NamedValue> in) {
-    om::Request request = asking(om::Operation::InvokeMethod, paths(names(className)).at(0));
-    request.method = method;
-    request.values = std::move(in);
-    return request;
-}
-
 void simulateHostForFaults() {
-    static const std::string hostName = [] {
-        simulate({});
-        return text(*find(paths(names("VESKA_TimeService")).at(0).keys, "SystemName"));
-    }();
-    simulate({computer(0, hostName), computer(1, "node8"), chassis(0, 0, "CZ1"), chassis(0, 1, "CZ2"),
+    simulate({computer(0, hostName()), computer(1, "node8"), chassis(0, 0, "CZ1"), chassis(0, 1, "CZ2"),
               chassis(1, 0, "CZ3")});
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "support/Provider.h"
+#include "support/Requests.h"
 
 #include <nlohmann/json.hpp>
 
@@ -16,11 +16,6 @@ struct FaultCase {
     std::string name;
     om::Request request;
 };
-
-/// A request for that path, with nothing else said.
-om::Request asking(om::Operation operation, const om::ObjectPath& path);
-/// The same for a method of the class's first instance.
-om::Request calling(const std::string& className, const std::string& method, std::vector<om::NamedValue> in);
 
 /// Makes the process's host one of two computers, one with two chassis; the first is named like this host, so that it
 /// has the time service.

@@ -10,8 +10,8 @@ namespace {
 
 const std::string rule(78, '=');
 
-std::string line(const char* word, const std::string& function, const std::string& file, const std::string& list) {
-    return word + (": " + function) + "() in " + file + " [Line]" + (list.empty() ? "" : ",Parameters List: " + list);
+std::string line(const std::string& word, const std::string& function) {
+    return word + ": " + function + "() in BaseServerProvider [Line]";
 }
 
 } // namespace
@@ -40,14 +40,6 @@ std::string event(int level, const std::string& file, const std::string& functio
     return std::to_string(level) + " " + file + " " + function + ": " + text;
 }
 
-std::string entering(const std::string& file, const std::string& function, const std::string& parameters) {
-    return event(4000, file, function, line("ENTERING", function, file, parameters));
-}
-
-std::string exiting(const std::string& file, const std::string& function, const std::string& parameters) {
-    return event(4000, file, function, line("EXITING", function, file, parameters));
-}
-
 std::string method(const std::string& file, const std::string& function) {
     return event(4000, file, function, "METHOD: " + function + "() was invoked in " + file + " [Line]");
 }
@@ -59,11 +51,11 @@ std::string variable(const std::string& file, const std::string& function, const
 
 std::vector<std::string> entryMarker(const std::string& operation) {
     return {event(4000, "Trace", "markProviderEntry", rule),
-            event(4000, "Trace", "markProviderEntry", line("ENTERING", operation, "BaseServerProvider", ""))};
+            event(4000, "Trace", "markProviderEntry", line("ENTERING", operation))};
 }
 
 std::vector<std::string> exitMarker(const std::string& operation) {
-    return {event(4000, "Trace", "markProviderExit", line("EXITING", operation, "BaseServerProvider", "")),
+    return {event(4000, "Trace", "markProviderExit", line("EXITING", operation)),
             event(4000, "Trace", "markProviderExit", rule)};
 }
 

@@ -14,8 +14,6 @@ std::vector<std::string> events(const std::vector<std::string>& lines);
 std::string event(int level, const std::string& file, const std::string& function, const std::string& text);
 
 /// Events as the provider's functions write them.
-std::string entering(const std::string& file, const std::string& function, const std::string& parameters = "");
-std::string exiting(const std::string& file, const std::string& function, const std::string& parameters = "");
 std::string method(const std::string& file, const std::string& function);
 std::string variable(const std::string& file, const std::string& function, const std::string& name,
                      const std::string& value);

@@ -14,9 +14,13 @@ using test::calling;
 using test::FaultCase;
 using test::Outcome;
 
+om::ObjectPath first(const std::string& className) {
+    return test::paths(test::names(className)).at(0);
+}
+
 om::Request settingTime() {
     const om::Value element = {CMPI_ref, std::make_shared<const om::ObjectPath>(test::path("VESKA_ComputerSystem"))};
-    return calling("VESKA_TimeService", "ManageTime",
+    return calling(first("VESKA_TimeService"), "ManageTime",
                    {{"GetRequest", {CMPI_boolean, false}},
                     {"ManagedElement", element},
                     {"TimeData", {CMPI_dateTime, std::string("20240101120000.000000+060")}}});
@@ -33,10 +37,10 @@ std::vector<FaultCase> methodCases() {
     return {{"ManageTime, reading", readingTime},
             {"ManageTime, setting", settingTime()},
             {"ManageTime, refused", withoutElement},
-            {"SetCIMconfig", calling("VESKA_CIMServiceConfig", "SetCIMconfig", settings)},
-            {"a method that the class lacks", calling("VESKA_CIMServiceConfig", "Reset", settings)},
-            {"a class without methods", calling("VESKA_ComputerSystem", "RequestStateChange", {})},
-            {"an association without methods", calling("VESKA_ComputerSystemPackage", "Reset", {})}};
+            {"SetCIMconfig", calling(first("VESKA_CIMServiceConfig"), "SetCIMconfig", settings)},
+            {"a method that the class lacks", calling(first("VESKA_CIMServiceConfig"), "Reset", settings)},
+            {"a class without methods", calling(first("VESKA_ComputerSystem"), "RequestStateChange", {})},
+            {"an association without methods", calling(first("VESKA_ComputerSystemPackage"), "Reset", {})}};
 }
 
 /// What a method answered: one number twice, or FAILED with an exception's text.

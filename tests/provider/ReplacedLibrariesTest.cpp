@@ -137,26 +137,13 @@ TEST_F(ThrowingLogger, GivesTheExceptionsTextToTheCallerOfAMethod) {
     EXPECT_EQ(answer["done"], true);
 }
 
-TEST_F(ThrowingLogger, LosesNothingOfTheAnswerWhereOnlyExitLinesFail) {
-    for (const char* thrown : {"exception", "text", "number"}) {
-        const nlohmann::json answer = ask(getOne, preloading(REPLACED_LOGGER) + Environment{
-                                                                                    {"REPLACEMENT_THROWS", thrown},
-                                                                                    {"REPLACEMENT_IN", "log"},
-                                                                                    {"REPLACEMENT_MATCH", "EXITING"},
-                                                                                });
-        expectIntact(answer, thrown);
-    }
-}
-
-TEST_F(ThrowingLogger, LosesNothingOfTheAnswerWhereOnlyDestructorsFail) {
-    for (const char* thrown : {"exception", "text", "number"}) {
-        const nlohmann::json answer = ask(getOne, preloading(REPLACED_LOGGER) + Environment{
-                                                                                    {"REPLACEMENT_THROWS", thrown},
-                                                                                    {"REPLACEMENT_IN", "trace"},
-                                                                                    {"REPLACEMENT_MATCH", "~"},
-                                                                                });
-        expectIntact(answer, thrown);
-    }
+TEST_F(ThrowingLogger, LosesNothingOfTheAnswerWhereOnlyExitLinesOrDestructorsFail) {
+    for (const char* thrown : {"exception", "text", "number"})
+        for (const auto& [operation, line] : {std::pair("log", "EXITING"), std::pair("trace", "~")})
+            expectIntact(ask(getOne, preloading(REPLACED_LOGGER) + Environment{{"REPLACEMENT_THROWS", thrown},
+                                                                               {"REPLACEMENT_IN", operation},
+                                                                               {"REPLACEMENT_MATCH", line}}),
+                         std::string(thrown) + " at " + line);
 }
 
 TEST_F(ThrowingLogger, MayFailAtAnyCall) {

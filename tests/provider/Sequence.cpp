@@ -12,7 +12,6 @@ namespace test {
 namespace {
 
 constexpr char brokerFile[] = "Broker";
-constexpr char shellFile[] = "Shell";
 constexpr char called[] = "called";
 constexpr char category[] = "Norvane.BaseServerProvider";
 
@@ -29,15 +28,14 @@ void write(const char* file, const std::string& function, const std::string& tex
 
 } // namespace
 
-std::vector<std::string> sequence(const om::Request& request, om::Answer* answer) {
+std::vector<std::string> sequence(const om::Request& request) {
     om::Request watched = request;
     watched.onCall = [](const std::string& slot) { write(brokerFile, slot, called); };
     om::ObjectManager& manager = provider(); // loaded before the log is looked at
     takeLog();
-    tellCommands([](const std::string& function, const std::string& asked) { write(shellFile, function, asked); });
-    om::Answer given = manager.run(watched);
+    tellCommands([](const std::string& function, const std::string& asked) { write("Shell", function, asked); });
+    manager.run(watched);
     tellCommands({});
-    if (answer != nullptr) *answer = std::move(given);
     std::vector<std::string> lines = takeLog();
     lines.erase(std::remove_if(lines.begin(), lines.end(), isOfALibrary), lines.end());
     return events(lines);
@@ -45,22 +43,6 @@ std::vector<std::string> sequence(const om::Request& request, om::Answer* answer
 
 std::string brokerCall(const std::string& slot) {
     return event(4000, brokerFile, slot, called);
-}
-
-std::string command(const std::string& function, const std::string& command) {
-    return event(4000, shellFile, function, command);
-}
-
-std::optional<std::size_t> first(const std::vector<std::string>& events, const std::string& event) {
-    const auto found = std::find(events.begin(), events.end(), event);
-    if (found == events.end()) return std::nullopt;
-    return static_cast<std::size_t>(found - events.begin());
-}
-
-std::optional<std::size_t> last(const std::vector<std::string>& events, const std::string& event) {
-    const auto found = std::find(events.rbegin(), events.rend(), event);
-    if (found == events.rend()) return std::nullopt;
-    return static_cast<std::size_t>(events.rend() - found) - 1;
 }
 
 } // namespace test

@@ -2,7 +2,6 @@
 
 #include "objectmanager/broker/ObjectManager.h"
 
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -10,16 +9,10 @@
 namespace test {
 
 /// Runs the request on an empty log. Its events in order, as LogEvents.h has them; between the lines stand calls to the
-/// broker and commands, as they are made below. Lines of the platform's libraries are left out. `answer`, where given,
-/// receives the answer.
-std::vector<std::string> sequence(const om::Request& request, om::Answer* answer = nullptr);
+/// broker and commands, as they are made below. Lines of the platform's libraries are left out.
+std::vector<std::string> sequence(const om::Request& request);
 
-/// The events of a call to the broker and of a command (`popen` or `system`).
+/// The event of a call to the broker.
 std::string brokerCall(const std::string& slot);
-std::string command(const std::string& function, const std::string& command);
-
-/// Where an event stands for the first and for the last time; nothing when it does not.
-std::optional<std::size_t> first(const std::vector<std::string>& events, const std::string& event);
-std::optional<std::size_t> last(const std::vector<std::string>& events, const std::string& event);
 
 } // namespace test

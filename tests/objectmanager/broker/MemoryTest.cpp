@@ -3,7 +3,9 @@
 #include "tests/objectmanager/broker/BrokerFixture.h"
 
 #include <cstdint>
-#include <thread>
+#include <future>
+
+#include <malloc.h>
 
 namespace om {
 namespace {
@@ -43,17 +45,36 @@ TEST_F(Memory, ReallocKeepsTheContentAndTheOldBlockOnFailure) {
 }
 
 TEST_F(Memory, WhatIsForgottenIsFreedWithTheBroker) {
-    for (int i = 0; i < 3; ++i) EXPECT_STREQ(mft->cmpiStrDup(broker, "left behind"), "left behind");
+    constexpr std::size_t size = std::size_t{1} << 20;
+    const auto used = [] {
+        const struct mallinfo2 all = mallinfo2();
+        return all.uordblks + all.hblkhd;
+    };
+    const std::size_t before = used();
+    {
+        const Broker forgetful(Schema::builtin(), "root/test");
+        const CMPIBroker* const handle = forgetful.handle();
+        EXPECT_STREQ(handle->mft->cmpiStrDup(handle, "left behind"), "left behind");
+        ASSERT_NE(handle->mft->cmpiMalloc(handle, size), nullptr);
+    }
+    EXPECT_LT(used(), before + size);
 }
 
-TEST_F(Memory, ThreadsAllocateAtOnce) {
-    const auto work = [this] {
-        for (int i = 0; i < 500; ++i) mft->cmpiFree(broker, mft->cmpiRealloc(broker, mft->cmpiMalloc(broker, 8), 64));
+TEST_F(Memory, ThreadsAllocateAtOnceAndKeepTheirOwnBlocks) {
+    const auto work = [this](char own) {
+        std::size_t kept = 0;
+        for (int i = 0; i < 500; ++i) {
+            auto* block = static_cast<char*>(mft->cmpiMalloc(broker, 8));
+            std::memset(block, own, 8);
+            block = static_cast<char*>(mft->cmpiRealloc(broker, block, 64));
+            kept += std::string(block, 8) == std::string(8, own) ? 1 : 0;
+            mft->cmpiFree(broker, block);
+        }
+        return kept;
     };
-    std::thread first(work);
-    std::thread second(work);
-    first.join();
-    second.join();
+    std::future<std::size_t> other = std::async(std::launch::async, work, 'a');
+    EXPECT_EQ(work('b'), 500U);
+    EXPECT_EQ(other.get(), 500U);
 }
 
 } // namespace

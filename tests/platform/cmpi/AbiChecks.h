@@ -2,6 +2,7 @@
  * The binary interface as static assertions, in C and in C++: it compiles exactly where every size, offset and number
  * is as the tables say.
  */
+#include "Layout.h"
 #include "cmpift.h"
 
 #include <stddef.h>

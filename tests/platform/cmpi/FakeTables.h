@@ -2,6 +2,8 @@
 
 // Function tables whose every slot notes which one it is and what it was called with.
 
+#include "Layout.h"
+
 #include <cmpift.h>
 
 #include <cstdint>

@@ -1,5 +1,7 @@
 // Status helpers and tests of objects and values.
 
+#include "Layout.h"
+
 #include <cmpift.h>
 
 #include <gtest/gtest.h>

@@ -1,4 +1,5 @@
 /* Every macro compiles in C without a warning, for a plain variable as value too. Nothing here runs. */
+#include "Layout.h"
 #include "cmpift.h"
 
 void callEveryMacro(void);
