@@ -1,7 +1,9 @@
 """vk-provider-register against an installation of SFCB that records what is asked of it."""
 
 import os
+import resource
 import shutil
+import subprocess
 import unittest
 
 import fakes
@@ -90,6 +92,19 @@ class Sfcb(Register):
         for line in self.register("--dry-run", "remove").stdout.splitlines():
             self.assertTrue(line.startswith("would run: "), line)
         self.assertEqual(manager.calls(), [])
+        self.assertEqual(snapshot_of(self.root), before)
+
+    def test_a_dry_run_that_cannot_write_its_output_changes_nothing(self):
+        manager = fakes.sfcb(self.root, up=True)
+        said = self.register("--dry-run", "install").stdout
+        manager.calls()
+        before, room = snapshot_of(self.root), said.index("sfcbstage")
+        with open(folder() / "output", "wb") as output:
+            done = subprocess.run([PREFIX / "sbin/vk-provider-register", "--root", self.root, "--dry-run", "install"],
+                                  stdout=output, stderr=subprocess.PIPE, check=False,
+                                  preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (room, room)))
+        self.assertEqual(done.returncode, 1, done.stderr)
+        manager.calls()
         self.assertEqual(snapshot_of(self.root), before)
 
     def test_a_failed_install_leaves_nothing_staged_and_the_repository_as_it_was(self):

@@ -6,6 +6,7 @@ import os
 
 from owner import Owner
 
+
 class Cimconfig(Owner):
     name = title = "cimconfig"
 

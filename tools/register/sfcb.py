@@ -127,6 +127,8 @@ class Sfcb(Manager):
             self.run(program, "-n", self.product.namespace, *words, done=done)
             self.run("sfcbrepos", "-f", done="built the repository")
         except BaseException:
+            if self.options.dry_run:
+                raise
             for path in self.staged:
                 path.unlink(missing_ok=True)
                 if path in older:
