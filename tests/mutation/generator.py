@@ -40,7 +40,8 @@ def walk_declaration(source, node):
 
 def walk_function(source, node):
     children = list(node.get_children())
-    body = [child for child in children if child.kind in (Kind.COMPOUND_STMT, Kind.CXX_TRY_STMT)]
+    body = [child for child in children if child.kind in (Kind.COMPOUND_STMT, Kind.CXX_TRY_STMT)
+            and source.text_of(child).startswith(("{", "try"))]  # and not what clang makes of = default
     if body and node.kind == Kind.CONSTRUCTOR:  # what its members begin with
         body = [child for child in children if child.kind.is_expression()] + body
     with computed_when_compiling(source, node):

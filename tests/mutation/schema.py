@@ -23,14 +23,11 @@ UNWARNED = ("unused-variable unused-but-set-variable unused-but-set-parameter un
             "duplicated-branches duplicated-cond logical-op narrowing extra address shadow pedantic")
 PRELUDE = "#pragma once\n" + "".join(f'#pragma GCC diagnostic ignored "-W{each}"\n' for each in UNWARNED.split()) + """
 #include <sys/syscall.h>
-#ifdef __cplusplus
-extern "C"
-#endif
-long vkCall(long, ...) __asm__("syscall");
+extern "C" long vkCall(long, ...) __asm__("syscall");
 static long vkChosen = -1;
 static unsigned char* vkReached;
 
-__attribute__((unused, noinline, cold)) static void vkChoose(void) {
+__attribute__((unused, noinline, cold)) static void vkChoose() {
     unsigned long limits[2] = {0, 0};
     vkCall(SYS_prlimit64, 0, 5 /* RLIMIT_RSS */, 0, limits);
     if (limits[0] == 0) {

@@ -38,6 +38,8 @@ def negate(source, node, function):
     text = source.text_of(node)
     if not text or text.startswith("!") or text in ("true", "false"):
         return
+    if text.endswith(tuple(COMPARISONS)):  # where clang's node of a comparison ends that it makes of <=>
+        return
     if node.kind in (Kind.BINARY_OPERATOR, Kind.CALL_EXPR):
         operator, _ = source.operator_of(list(node.get_children()))
         if operator in COMPARISONS or operator in CONNECTIVES:

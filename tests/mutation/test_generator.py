@@ -38,6 +38,12 @@ class MutantsTest(unittest.TestCase):
         self.expect(with_cxx20, "2 same: comparison: == -> !=", "3 other: comparison: != -> ==",
                     arguments=["-std=c++20"])
 
+    def test_a_comparison_made_of_a_three_way_one_counts_once(self):
+        self.expect("#include <compare>\nstruct Time { int at; auto operator<=>(const Time&) const = default; };\n"
+                    "int late(Time a, Time b) {\n    if (a >= b) return 2;\n    return 3;\n}",
+                    "4 late: comparison: >= -> <", "4 late: boundary: >= -> >", "4 late: removed statement: return 2 -> nothing",
+                    "4 late: constant: 2 -> 3", "5 late: constant: 3 -> 4", arguments=["-std=c++20"])
+
     def test_brackets_of_templates_are_no_comparisons(self):
         self.expect("template <class T> struct Box { T held; };\nBox<Box<int>> twice(Box<Box<int>>&& box) { return box; }")
 
