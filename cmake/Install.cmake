@@ -13,7 +13,8 @@ set_target_properties(${runtime_libraries} PROPERTIES BUILD_WITH_INSTALL_RPATH O
 # Debug information names the sources from the tree's root on, not where the tree lay when it was built.
 # gcov's notes name them as they are.
 if(NOT VK_COVERAGE)
-    foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_core vkcim)
+    foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_core vkcim
+            vk_command_line vk_snapshot vk-host-snapshot vk_check vk-provider-check)
         target_compile_options(${target} PRIVATE
             -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)
     endforeach()
@@ -37,6 +38,7 @@ install(CODE "
     endif()" COMPONENT provider)
 
 install(TARGETS vkcim RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
+install(TARGETS vk-host-snapshot vk-provider-check RUNTIME DESTINATION ${CMAKE_INSTALL_SBINDIR} COMPONENT tools)
 
 install(DIRECTORY platform/include/nvlog platform/include/vk
     DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/vk-baseserver COMPONENT development)
@@ -54,12 +56,6 @@ function(vk_configured file destination component kind)
 endfunction()
 vk_configured(tools/vk-provider-register.in ${CMAKE_INSTALL_SBINDIR} provider PROGRAMS)
 install(DIRECTORY tools/register DESTINATION ${VK_SHARE_DIR} COMPONENT provider FILES_MATCHING PATTERN "*.py")
-vk_configured(tools/vk-provider-check.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
-# vk-host-snapshot sees the same placeholders as the provider.
-set(placeholders ${CMAKE_SOURCE_DIR}/platform/host/Placeholders.inc)
-set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${placeholders})
-file(READ ${placeholders} VK_PLACEHOLDERS)
-vk_configured(tools/vk-host-snapshot.in ${CMAKE_INSTALL_SBINDIR} tools PROGRAMS)
 install(FILES ${VK_SCHEMA_DIR}/libvknabaseserverprofileprovider.7 DESTINATION ${CMAKE_INSTALL_MANDIR}/man7
     COMPONENT provider)
 vk_configured(docs/man/vk-provider-register.8.in ${CMAKE_INSTALL_MANDIR}/man8 provider FILES)

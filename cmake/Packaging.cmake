@@ -60,7 +60,7 @@ set(CPACK_DEBIAN_PROVIDER_PACKAGE_CONTROL_EXTRA ${scripts}/debian/postinst ${scr
     ${CMAKE_SOURCE_DIR}/packaging/debian/shlibs ${CMAKE_SOURCE_DIR}/packaging/debian/triggers)
 set(CPACK_DEBIAN_PROVIDER_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 set(CPACK_DEBIAN_TOOLS_PACKAGE_NAME vk-baseserver-tools)
-set(CPACK_DEBIAN_TOOLS_PACKAGE_DEPENDS "vk-baseserver-provider (= ${PROJECT_VERSION}), python3")
+set(CPACK_DEBIAN_TOOLS_PACKAGE_DEPENDS "vk-baseserver-provider (= ${PROJECT_VERSION})")
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_NAME vk-baseserver-dev)
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_SECTION libdevel)
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_DEPENDS "vk-baseserver-provider (= ${PROJECT_VERSION})")

@@ -6,6 +6,8 @@ set(VK_PROVIDER_LOCATION vknabaseserverprofileprovider) # the library's name
 set(VK_PROVIDER_NAMESPACE root/cimv2)
 set(VK_PROVIDER_VENDOR VK)
 
+# The product's root directory, with a final slash.
+set(VK_ROOT_DIRECTORY ${CMAKE_INSTALL_PREFIX}/lib/vk/platform/)
 # Where the provider looks for the object manager's command cimconfig.
 set(VK_COMMAND_FOLDER ${CMAKE_INSTALL_PREFIX}/lib/vk/vcm/bin)
 set(VK_MULTIARCH ${CMAKE_LIBRARY_ARCHITECTURE})

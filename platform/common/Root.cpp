@@ -91,6 +91,12 @@ const Root& Root::host() {
     return root;
 }
 
+Root Root::recordedIn(Record& record) const {
+    Root root = *this;
+    root.asked = &record;
+    return root;
+}
+
 int Root::open(const std::string& path, int flags, mode_t mode) const {
     if (path.find('\0') != std::string::npos) return -EINVAL;
     flags |= O_CLOEXEC | ((flags & O_PATH) != 0 ? 0 : O_NOCTTY); // openat2 refuses what O_PATH does not use
@@ -110,6 +116,7 @@ int Root::open(const std::string& path, int flags, mode_t mode) const {
 }
 
 Root::Contents Root::read(const std::string& path, std::size_t limit) const {
+    if (asked != nullptr) asked->read.push_back(path);
     const int opened = open(path, O_RDONLY | O_NONBLOCK);
     if (opened < 0) return failure(-opened);
     const FileDescriptor fd(opened);
@@ -118,6 +125,7 @@ Root::Contents Root::read(const std::string& path, std::size_t limit) const {
 }
 
 Root::Contents Root::readLink(const std::string& path) const {
+    if (asked != nullptr) asked->followed.push_back(path);
     const int opened = open(path, O_PATH | O_NOFOLLOW);
     if (opened < 0) return failure(-opened);
     const FileDescriptor fd(opened);
@@ -133,6 +141,7 @@ Root::Contents Root::readLink(const std::string& path) const {
 }
 
 Root::Contents Root::resolve(const std::string& path) const {
+    if (asked != nullptr) asked->followed.push_back(path);
     FileDescriptor root = openRoot(directory);
     if (!root) return failure(errno);
     RootWalk walk(std::move(root));

@@ -78,10 +78,11 @@ bool isLenovosModel(const Fact& manufacturer, const Fact& version) {
 void takeBaseBoard(HardwareFacts& facts, const Root& root, const Tables& tables) {
     const Fact product = firstOf({tables.baseBoard(&SmbiosBaseBoard::product, FirmwareText::Model),
                                   fromSysfs(root, "board_name", FirmwareText::Model)});
+    const Fact manufacturer = firstOf({tables.baseBoard(&SmbiosBaseBoard::manufacturer),
+                                       fromSysfs(root, "board_vendor"), facts.firmwareManufacturer});
     if (!product) return;
     facts.firmwareModel = product;
-    facts.firmwareManufacturer = firstOf({tables.baseBoard(&SmbiosBaseBoard::manufacturer),
-                                          fromSysfs(root, "board_vendor"), facts.firmwareManufacturer});
+    facts.firmwareManufacturer = manufacturer;
 }
 
 /// Manufacturer and model as the firmware has them.

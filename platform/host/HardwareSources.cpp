@@ -10,11 +10,7 @@ namespace VK::Host {
 
 namespace {
 
-const std::string TABLES = "/sys/firmware/dmi/tables";
-const std::string ENTRY_POINT = TABLES + "/smbios_entry_point";
-const std::string TABLE = TABLES + "/DMI";
 const std::string MACHINE_INFO = "/etc/machine-info";
-const std::string SYSINFO = "/proc/sysinfo";
 
 Fact damaged(const std::string& file, const std::string& problem) {
     Fact fact = missing(file, EBADMSG);
@@ -47,12 +43,13 @@ Fact MachineInfo::operator[](const char* key) const {
 }
 
 Tables::Tables(const Root& root) {
+    // Both at once: a root that keeps a record is to know both.
     const Root::Contents entryPoint = root.read(ENTRY_POINT);
+    const Root::Contents table = root.read(TABLE);
     if (!entryPoint) {
         none = unreadable(root, ENTRY_POINT, entryPoint.error);
         return;
     }
-    const Root::Contents table = root.read(TABLE);
     if (!table) {
         none = unreadable(root, TABLE, table.error);
         return;

@@ -9,6 +9,11 @@
 
 namespace VK::Host {
 
+inline const std::string TABLES = "/sys/firmware/dmi/tables";
+inline const std::string ENTRY_POINT = TABLES + "/smbios_entry_point";
+inline const std::string TABLE = TABLES + "/DMI";
+inline const std::string SYSINFO = "/proc/sysinfo";
+
 /// What an administrator wrote into /etc/machine-info; nothing of it is a placeholder.
 class MachineInfo {
 public:

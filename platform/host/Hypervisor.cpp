@@ -1,5 +1,10 @@
 #include "host/Hypervisor.h"
 
+bool VK::Host::isKvmGuest(const Root& root, const HardwareFacts& facts) {
+    return (root.isLive() && processorSaysKvm()) || facts.firmwareModel.text.starts_with("KVM") ||
+           facts.firmwareManufacturer.text.starts_with("QEMU");
+}
+
 #if defined(__x86_64__) || defined(__i386__)
 
 #include <cpuid.h>

@@ -41,14 +41,15 @@ unsigned int powerState(const Root& root) {
 }
 
 bool hasUncorrectableMemoryErrors(const Root& root) {
+    bool found = false;
     const std::string folder = "/sys/devices/system/edac/mc/";
     for (const std::string& name : root.list(folder).names) {
         if (name.rfind("mc", 0) != 0) continue;
         std::string file = folder;
         file.append(name).append("/ue_count");
-        if (root.read(file).text.find_first_of("123456789") != std::string::npos) return true;
+        found = root.read(file).text.find_first_of("123456789") != std::string::npos || found;
     }
-    return false;
+    return found;
 }
 
 } // namespace VK::Host

@@ -57,16 +57,16 @@ bool isLike(std::string_view digits, std::string_view pattern) {
            (pattern.find('t') == std::string_view::npos || hasNoServiceTag(digits, pattern));
 }
 
-/// Unset ones, and those that whole product lines share. A text does not say how its bytes are stored, and the version
-/// of the tables often states it wrongly: both orders count.
+} // namespace
+
+// A text does not say how its bytes are stored, and the version of the tables often states it wrongly: both orders
+// count.
 bool isSharedUuid(std::string_view uuid) {
     const std::string digits = digitsOf(uuid);
     const std::string other = inOtherOrder(digits);
     return std::any_of(std::begin(SHARED), std::end(SHARED),
                        [&](std::string_view pattern) { return isLike(digits, pattern) || isLike(other, pattern); });
 }
-
-} // namespace
 
 std::string uuidFromBytes(std::string_view bytes, SmbiosVersion version) {
     static constexpr char DIGITS[] = "0123456789abcdef";

@@ -14,15 +14,9 @@ namespace VK {
 
 namespace {
 
-bool startsWith(const std::string& text, const char* start) {
-    return text.rfind(start, 0) == 0;
-}
-
 bool findOutKvm() {
     if (const std::optional<bool> given = productOverrides().kvm; given) return *given;
-    if (HostSource::current().kind != HostSource::Snapshot && Host::processorSaysKvm()) return true;
-    const Host::HardwareFacts& facts = Tree::realHost().hardware();
-    return startsWith(facts.firmwareModel.text, "KVM") || startsWith(facts.firmwareManufacturer.text, "QEMU");
+    return Host::isKvmGuest(Root::host(), Tree::realHost().hardware());
 }
 
 } // namespace

@@ -6,6 +6,7 @@
 #include "zone/ZoneChange.h"
 #include "zone/ZoneInForce.h"
 
+#include <algorithm>
 #include <climits>
 
 namespace VK::Tree {
@@ -154,6 +155,18 @@ const ChangingProperty* changingProperty(const Node& node, unsigned int number) 
     for (const ChangingProperty& row : COMPUTER_NOW)
         if (row.number == number) return &row;
     return nullptr;
+}
+
+unsigned int statusOf(const Root& root, const Node& node) {
+    constexpr unsigned int UNCORRECTABLE_ERRORS = 22;
+    if (node.type == Lexicon::ComputerSystemNode && Host::hasUncorrectableMemoryErrors(root))
+        return std::max(node.status, UNCORRECTABLE_ERRORS); // the worse, the larger
+    return node.status;
+}
+
+void readEverything(const Root& root) {
+    for (const Node& node : hostNodes(Host::readHardware(root))) statusOf(root, node);
+    for (const ChangingProperty& row : COMPUTER_NOW) row.read(root);
 }
 
 } // namespace VK::Tree

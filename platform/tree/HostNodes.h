@@ -25,4 +25,10 @@ struct ChangingProperty {
 /// The node's changing property of that number; null where it has none.
 const ChangingProperty* changingProperty(const Node& node, unsigned int number);
 
+/// The node's status now, which includes what may change at any time.
+unsigned int statusOf(const Root& root, const Node& node);
+
+/// Reads all that a host's nodes are made of, for a root that keeps a record.
+void readEverything(const Root& root);
+
 } // namespace VK::Tree

@@ -1,11 +1,8 @@
 #include "tree/RealHost.h"
 
-#include "host/State.h"
 #include "logger/LogLine.h"
 #include "tree/HostNodes.h"
-#include "vk/NodeLexicon.h"
 
-#include <algorithm>
 #include <cerrno>
 
 namespace VK::Tree {
@@ -73,10 +70,7 @@ std::optional<bool> RealHost::isReadOnly(const Node& node, unsigned int property
 }
 
 unsigned int RealHost::status(const Node& node) {
-    constexpr unsigned int UNCORRECTABLE_ERRORS = 22;
-    if (node.type == NodeLexicon::ComputerSystemNode && Host::hasUncorrectableMemoryErrors(root))
-        return std::max(node.status, UNCORRECTABLE_ERRORS); // the worse, the larger
-    return node.status;
+    return statusOf(root, node);
 }
 
 } // namespace VK::Tree

@@ -1,7 +1,5 @@
 """Folders that hold the files of a host, for the tests of vk-host-snapshot."""
 
-import importlib.machinery
-import importlib.util
 import json
 import os
 import struct
@@ -69,11 +67,3 @@ def instances(root, name):
 
 def properties(root, name):
     return instances(root, name)[0]
-
-
-def program():
-    """vk-host-snapshot as a module."""
-    loader = importlib.machinery.SourceFileLoader("vk_host_snapshot", str(SNAPSHOT))
-    module = importlib.util.module_from_spec(importlib.util.spec_from_loader(loader.name, loader))
-    loader.exec_module(module)
-    return module

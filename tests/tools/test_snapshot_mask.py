@@ -1,13 +1,10 @@
 """vk-host-snapshot --mask: a masked copy tells the same but for what names the machine."""
 
-import ast
 import os
-import re
 import struct
 import unittest
-from pathlib import Path
 
-from hosts import SYSTEM_UUID, instances, make_host, program, properties, structure, table, take
+from hosts import SYSTEM_UUID, instances, make_host, properties, structure, table, take
 
 
 class Masked(unittest.TestCase):
@@ -186,39 +183,12 @@ class Tables(unittest.TestCase):
             copy = self.masked(data)
             self.assertNotIn(b"SECRET", copy)
             self.assertNotIn(b"\xAA\xBB", copy[-2:])
-            found, rest = program().structures(copy)
-            self.assertEqual(len(found), 5)
-            self.assertEqual((len(rest), rest[:2]), (len(broken), broken[:2]))
+            at = len(table()) - 6
+            self.assertEqual(copy[at:at + 2], broken[:2])
 
     def test_zeros_behind_the_structures_stay(self):
         data = table()[:-6] + bytes(20)
         self.assertEqual(self.masked(data)[-20:], bytes(20))
-
-
-class Fillers(unittest.TestCase):
-    """The texts that say nothing are those that the provider takes for such: its own tests read the same list."""
-
-    LIST = Path(__file__).resolve().parents[1] / "support/FirmwareTexts.inc"
-
-    def test_are_the_providers_placeholders(self):
-        is_filler = program().is_filler
-        compared = 0
-        for row in ast.parse(re.sub("^//.*", "", self.LIST.read_text(encoding="ascii"), flags=re.M)).body:
-            kind, text = row.value.args[0].id, row.value.args[1].value
-            if kind == "Other":  # serial numbers, which alone are masked, are no other kind
-                self.assertEqual(is_filler(text), row.value.func.id == "SAYS_NOTHING", text)
-                compared += 1
-        self.assertGreater(compared, 100)
-
-    def test_shared_uuids_stay_in_either_order(self):
-        program_ = program()
-        for text in ("00020003-0004-0005-0006-000700080009", "03000200-0400-0500-0006-000700080009",
-                     "03020100-0504-0706-0809-0a0b0c0d0e0f", "10000000-0000-8000-0040-000000000000",
-                     "12345678-1234-5678-90ab-cddeefaabbcc", "ffffff00-ffff-ffff-ffff-ffffffffffff",
-                     "4c4c4544-0000-2010-8020-80c04f202020"):
-            self.assertEqual(program_.Mask().uuid(text), text)
-        for text in (str(SYSTEM_UUID), "4c4c4544-0000-2010-8020-80c04f202031", "10000000-0000-0000-0000-0cc47a133878"):
-            self.assertNotEqual(program_.Mask().uuid(text), text)
 
 
 class Texts(unittest.TestCase):

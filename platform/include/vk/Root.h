@@ -33,6 +33,12 @@ public:
         explicit operator bool() const { return error == 0; }
     };
 
+    /// What a root was asked for, in order.
+    struct Record {
+        std::vector<std::string> read;     ///< files to read, there or not
+        std::vector<std::string> followed; ///< paths that may be links or lead through some
+    };
+
     /// How much is read of any file unless a caller says otherwise.
     static constexpr std::size_t DEFAULT_LIMIT = std::size_t{1} << 20;
 
@@ -43,6 +49,9 @@ public:
 
     /// The root of the process's host (vk/HostSource.h): the snapshot's folder, else `/`.
     static const Root& host();
+
+    /// The same root, noting in the record what it is asked for. As long as the record lives, and in one thread.
+    Root recordedIn(Record& record) const;
 
     /// Whether these are the running host's own files: this is `/`, and not as a snapshot.
     bool isLive() const { return live; }
@@ -74,6 +83,7 @@ public:
 private:
     std::string directory;
     bool live;
+    Record* asked = nullptr;
 };
 
 } // namespace VK

@@ -55,6 +55,19 @@ TEST_F(SnapshotRoot, ReadsAnEmptyFileAsSuccess) {
     EXPECT_EQ(root.read("/etc/machine-id").text, "");
 }
 
+TEST_F(SnapshotRoot, RecordsWhatItIsAskedFor) {
+    folder.link("hostname", "etc/name");
+    Root::Record record;
+    const Root recording = root.recordedIn(record);
+    recording.read("/etc/hostname");
+    recording.resolve("/etc");
+    recording.readLink("/etc/name");
+    recording.list("/etc");
+    root.read("/etc/other");
+    EXPECT_THAT(record.read, ElementsAre("/etc/hostname"));
+    EXPECT_THAT(record.followed, ElementsAre("/etc", "/etc/name"));
+}
+
 TEST_F(SnapshotRoot, ReadsBytesAsTheyAre) {
     const std::string bytes("\0\xff\n\0", 4);
     folder.write("DMI", bytes);

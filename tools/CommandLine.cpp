@@ -1,0 +1,27 @@
+#include "tools/CommandLine.h"
+
+namespace tools {
+
+void addCommonOptions(CLI::App& app) {
+    app.set_help_flag("-h,--help", "Print this and exit");
+    app.set_version_flag("--version", app.get_name() + " " VK_VERSION, "Print the version and exit");
+    app.get_formatter()->label("REQUIRED", "");
+}
+
+std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, Output output) {
+    try {
+        app.parse(std::vector<std::string>(words.rbegin(), words.rend())); // CLI11 takes them from the back
+        return std::nullopt;
+    } catch (const CLI::Success& success) { // --help and --version
+        return app.exit(success, output.out, output.error);
+    } catch (const CLI::Error& error) {
+        return refuse(app, error.what(), output);
+    }
+}
+
+int refuse(const CLI::App& app, const std::string& problem, Output output) {
+    output.error << app.get_name() << ": " << problem << "\nTry '" << app.get_name() << " --help'.\n";
+    return UNUSABLE_ARGUMENTS;
+}
+
+} // namespace tools

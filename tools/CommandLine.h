@@ -1,0 +1,29 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+#include <optional>
+#include <ostream>
+#include <string>
+#include <vector>
+
+namespace tools {
+
+/// Where a program writes.
+struct Output {
+    std::ostream& out;
+    std::ostream& error;
+};
+
+constexpr int UNUSABLE_ARGUMENTS = 2;
+
+/// The options that every program has.
+void addCommonOptions(CLI::App& app);
+
+/// Reads the words behind the program's name: nothing, or the exit status of what has been said already.
+std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, Output output);
+
+/// Says why arguments cannot be used, and returns the exit status.
+int refuse(const CLI::App& app, const std::string& problem, Output output);
+
+} // namespace tools

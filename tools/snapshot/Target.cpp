@@ -1,0 +1,128 @@
+#include "tools/snapshot/Target.h"
+
+#include "logger/LogLine.h"
+
+#include <cerrno>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace snapshot {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+constexpr mode_t CLOSED_DIRECTORY = 0700;
+constexpr mode_t CLOSED_FILE = 0600;
+
+/// A final slash would follow a link.
+fs::path withoutFinalSlash(const fs::path& path) {
+    return path.has_filename() || !path.has_relative_path() ? path : withoutFinalSlash(path.parent_path());
+}
+
+/// What stands before the last slash, and what behind it.
+std::pair<std::string, std::string> split(const std::string& name) {
+    const std::size_t slash = name.rfind('/');
+    return slash == std::string::npos ? std::pair(std::string(), name)
+                                      : std::pair(name.substr(0, slash), name.substr(slash + 1));
+}
+
+VK::FileDescriptor openDirectory(int at, const std::string& name) {
+    return VK::FileDescriptor(openat(at, name.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+}
+
+bool writeAll(int fd, std::string_view bytes) {
+    while (!bytes.empty()) {
+        const ssize_t count = ::write(fd, bytes.data(), bytes.size());
+        if (count < 0 && errno != EINTR) return false;
+        bytes.remove_prefix(count > 0 ? static_cast<std::size_t>(count) : 0);
+    }
+    return true;
+}
+
+} // namespace
+
+Failure::Failure(const fs::path& path, int error) : std::runtime_error(path.string() + ": " + VK::errorText(error)) {}
+
+Target::Target(const fs::path& directory) : path(withoutFinalSlash(directory)) {
+    try {
+        makeMissing(path);
+        openItself();
+    } catch (const Failure&) {
+        removeMade();
+        throw;
+    }
+}
+
+void Target::makeMissing(const fs::path& directory) {
+    std::error_code error;
+    if (directory.empty() || fs::symlink_status(directory, error).type() != fs::file_type::not_found) return;
+    makeMissing(directory.parent_path());
+    if (mkdir(directory.c_str(), CLOSED_DIRECTORY) != 0) throw Failure(directory, errno);
+    made.push_back(directory);
+}
+
+/// Nobody else may have put anything there, or be able to, or to read what comes there.
+void Target::openItself() {
+    VK::FileDescriptor fd = openDirectory(AT_FDCWD, path);
+    struct stat status {};
+    if (!fd || fstat(fd.get(), &status) != 0) throw Failure(path, errno);
+    if (status.st_uid != geteuid()) throw Failure(path.string() + " belongs to somebody else");
+    if ((status.st_mode & 077) != 0) throw Failure(path.string() + " is open to others: chmod 700 closes it");
+    std::error_code error;
+    if (!fs::is_empty(path, error) || error) throw Failure(path.string() + " is not empty");
+    directories.emplace(std::string(), std::move(fd));
+}
+
+void Target::write(const std::string& name, std::string_view bytes) {
+    const int flags = O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC;
+    const auto [parent, own] = split(name);
+    const VK::FileDescriptor file(openat(open(parent, name), own.c_str(), flags, CLOSED_FILE));
+    if (!file) fail(name);
+    entries.push_back(name);
+    if (!writeAll(file.get(), bytes)) fail(name);
+}
+
+void Target::link(const std::string& name, const std::string& target) {
+    const auto [parent, own] = split(name);
+    if (symlinkat(target.c_str(), open(parent, name), own.c_str()) != 0) fail(name);
+    entries.push_back(name);
+}
+
+/// A directory below it that is to hold that name, made where need be.
+int Target::open(const std::string& directory, const std::string& forName) {
+    const auto found = directories.find(directory);
+    if (found != directories.end()) return found->second.get();
+    const auto [above, own] = split(directory);
+    const int parent = open(above, forName);
+    if (mkdirat(parent, own.c_str(), CLOSED_DIRECTORY) != 0) fail(forName);
+    VK::FileDescriptor& fd = directories[directory];
+    fd = openDirectory(parent, own);
+    if (!fd) fail(forName);
+    return fd.get();
+}
+
+void Target::fail(const std::string& name) const {
+    throw Failure(path / name, errno);
+}
+
+bool Target::remove() {
+    bool removed = true;
+    const auto take = [&](const std::string& name, int flags) {
+        const auto [folder, own] = split(name);
+        removed = unlinkat(directories[folder].get(), own.c_str(), flags) == 0 && removed;
+    };
+    for (const std::string& name : entries) take(name, 0);
+    // What stands in a directory comes behind it in the alphabet.
+    for (auto each = directories.rbegin(); each != directories.rend(); ++each)
+        if (!each->first.empty()) take(each->first, AT_REMOVEDIR);
+    return removeMade() && removed;
+}
+
+bool Target::removeMade() {
+    while (!made.empty() && rmdir(made.back().c_str()) == 0) made.pop_back();
+    return made.empty();
+}
+
+} // namespace snapshot

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "logger/FileDescriptor.h"
+
+#include <filesystem>
+#include <map>
+#include <stdexcept>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace snapshot {
+
+/// A file or directory that cannot be made, or a directory that is not to be written to; says which and why.
+class Failure : public std::runtime_error {
+public:
+    using std::runtime_error::runtime_error;
+    Failure(const std::filesystem::path& path, int error);
+};
+
+/// The directory of a snapshot: no path is followed below it that this run did not make.
+class Target {
+public:
+    /// Makes the directory where it is not there. One that is has to be empty, its user's own and closed to others.
+    /// Nothing is left of it where that fails.
+    explicit Target(const std::filesystem::path& directory);
+
+    void write(const std::string& name, std::string_view bytes);
+    void link(const std::string& name, const std::string& target);
+
+    /// Takes away all that this run made: false where something of it stays.
+    bool remove();
+
+    const std::filesystem::path& getPath() const { return path; }
+
+private:
+    void openItself();
+    void makeMissing(const std::filesystem::path& directory);
+    bool removeMade();
+    int open(const std::string& directory, const std::string& forName);
+    [[noreturn]] void fail(const std::string& name) const;
+
+    std::filesystem::path path;
+    std::vector<std::filesystem::path> made;               ///< the directory and those above it, as far as made here
+    std::map<std::string, VK::FileDescriptor> directories; ///< below it, by name
+    std::vector<std::string> entries;                      ///< files and links
+};
+
+} // namespace snapshot
