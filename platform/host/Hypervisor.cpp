@@ -1,5 +1,12 @@
 #include "host/Hypervisor.h"
 
+#include "vk/KvmGuest.h"
+
+int vkIsKvmGuest(const char* root) {
+    const VK::Root host(root);
+    return VK::Host::isKvmGuest(host, VK::Host::readHardware(host)) ? 1 : 0;
+}
+
 bool VK::Host::isKvmGuest(const Root& root, const HardwareFacts& facts) {
     return (root.isLive() && processorSaysKvm()) || facts.firmwareModel.text.starts_with("KVM") ||
            facts.firmwareManufacturer.text.starts_with("QEMU");
