@@ -99,23 +99,30 @@ TEST_F(CmpiMessages, CarryEveryKindOfInsertWithItsType) {
 }
 
 TEST_F(CmpiMessages, CarryUpToTenInsertsInOrder) {
-    std::string inserts;
 #define S(n) CMFmtSint(n)
-#define EXPECT_INSERTS(count, ...)                                                                                     \
-    CMGetMessage(broker, "7", "", &status, CMFmtArgs##count(__VA_ARGS__));                                             \
-    inserts += " sint32:" #count;                                                                                      \
-    EXPECT_EQ(lastMessage, "7||" #count + inserts);
-    EXPECT_INSERTS(1, S(1))
-    EXPECT_INSERTS(2, S(1), S(2))
-    EXPECT_INSERTS(3, S(1), S(2), S(3))
-    EXPECT_INSERTS(4, S(1), S(2), S(3), S(4))
-    EXPECT_INSERTS(5, S(1), S(2), S(3), S(4), S(5))
-    EXPECT_INSERTS(6, S(1), S(2), S(3), S(4), S(5), S(6))
-    EXPECT_INSERTS(7, S(1), S(2), S(3), S(4), S(5), S(6), S(7))
-    EXPECT_INSERTS(8, S(1), S(2), S(3), S(4), S(5), S(6), S(7), S(8))
-    EXPECT_INSERTS(9, S(1), S(2), S(3), S(4), S(5), S(6), S(7), S(8), S(9))
-    EXPECT_INSERTS(10, S(1), S(2), S(3), S(4), S(5), S(6), S(7), S(8), S(9), S(10))
-#undef EXPECT_INSERTS
+    const auto inserts = [] { return lastMessage.substr(4); };
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs1(S(1)));
+    EXPECT_EQ(inserts(), " sint32:1");
+    EXPECT_EQ(lastMessage[3], '1');
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs2(S(1), S(2)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs3(S(1), S(2), S(3)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs4(S(1), S(2), S(3), S(4)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3 sint32:4");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs5(S(1), S(2), S(3), S(4), S(5)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3 sint32:4 sint32:5");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs6(S(1), S(2), S(3), S(4), S(5), S(6)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3 sint32:4 sint32:5 sint32:6");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs7(S(1), S(2), S(3), S(4), S(5), S(6), S(7)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3 sint32:4 sint32:5 sint32:6 sint32:7");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs8(S(1), S(2), S(3), S(4), S(5), S(6), S(7), S(8)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3 sint32:4 sint32:5 sint32:6 sint32:7 sint32:8");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs9(S(1), S(2), S(3), S(4), S(5), S(6), S(7), S(8), S(9)));
+    EXPECT_EQ(inserts(), " sint32:1 sint32:2 sint32:3 sint32:4 sint32:5 sint32:6 sint32:7 sint32:8 sint32:9");
+    CMGetMessage(broker, "7", "", &status, CMFmtArgs10(S(1), S(2), S(3), S(4), S(5), S(6), S(7), S(8), S(9), S(10)));
+    EXPECT_EQ(lastMessage, "7||10 sint32:1 sint32:2 sint32:3 sint32:4 sint32:5 sint32:6 sint32:7 sint32:8 sint32:9 "
+                           "sint32:10");
 #undef S
 }
 
