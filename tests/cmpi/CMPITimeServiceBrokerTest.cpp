@@ -199,13 +199,6 @@ TEST_F(CMPITimeServiceBrokerTest, IgnoresANullInstance) {
     EXPECT_EQ(test::simulatedProperty("/computer/0", 200), 0);
 }
 
-TEST_F(CMPITimeServiceBrokerTest, StandsOnOneElement) {
-    CMPITimeService adapter(broker, nullptr, "root/cimv2");
-    EXPECT_TRUE(static_cast<bool>(adapter));
-    ++adapter;
-    EXPECT_FALSE(static_cast<bool>(adapter));
-}
-
 /// Arguments and a date-time whose slots can be taken away; those that are there ask the real ones.
 class WithoutSlots {
 public:

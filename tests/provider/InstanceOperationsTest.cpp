@@ -79,19 +79,6 @@ TEST(GetInstance, DoesNotKnowTheTimeServicesAssociationAlthoughItIsEnumerated) {
     EXPECT_FALSE(answer.done);
 }
 
-TEST(GetInstance, ReturnsNothingAndOkForKeysThatMatchNothing) {
-    simulateOneComputer();
-    const om::Answer answer = test::get(test::path("VESKA_ComputerSystem", {{"Name", "other"}}));
-    EXPECT_EQ(answer.code, CMPI_RC_OK);
-    EXPECT_THAT(answer.results, IsEmpty());
-    EXPECT_TRUE(answer.done);
-}
-
-TEST(GetInstance, ReturnsEveryElementOfTheWalkNotOnlyTheFirst) {
-    test::simulate({test::computer(0, "node7"), test::computer(1, "node8")});
-    EXPECT_THAT(test::get(test::path("VESKA_ComputerSystem")).results, SizeIs(2));
-}
-
 /// A path of the chassis association that names neither end, so that its adapter throws.
 om::ObjectPath unknownAssociation(const char* className) {
     return test::path(className, {{"Odd", "key"}});

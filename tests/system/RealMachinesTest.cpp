@@ -10,7 +10,11 @@
 namespace {
 
 using nlohmann::json;
+using testing::Contains;
+using testing::Each;
 using testing::IsEmpty;
+using testing::Not;
+using testing::StartsWith;
 
 struct Machine {
     const char* folder;
@@ -20,6 +24,9 @@ struct Machine {
     const char* manufacturer;
     const char* model;
     int packageType;
+    const char* description;
+    const char* sku; ///< empty: none
+    const char* chassisName;
 };
 
 void PrintTo(const Machine& machine, std::ostream* stream) {
@@ -28,15 +35,15 @@ void PrintTo(const Machine& machine, std::ostream* stream) {
 
 constexpr Machine machines[] = {
     {"workstation-2.6", "workstation-26", "30d3f174-7f5d-11e1-bbda-5f0d3dbc082e", "CZC214446Z", "Hewlett-Packard",
-     "HP Z600 Workstation", 3},
+     "HP Z600 Workstation", 3, "Hewlett-Packard HP Z600 Workstation", "WD059AV", "Mini Tower"},
     {"rack-server-2.7", "rack-server-27", "00000000-0000-0000-0000-0cc47a133878", "9000116105", "Supermicro",
-     "X9DBL-3F/X9DBL-iF", 3},
+     "X9DBL-3F/X9DBL-iF", 3, "Thomas-Krenn.AG X9DBL-3F/X9DBL-iF", "", "Main Server Chassis"},
     {"rack-server-3.2", "rack-server-32", "00112233-4455-6677-8899-aabbccddeeff", "", "Dell Inc.", "PowerEdge R777sd",
-     2},
+     2, "Dell Inc. PowerEdge R777sd", "SKU=0777;ModelName=PowerEdge R777sd", "Rack Mount Chassis"},
     {"desktop-3.1", "desktop-31", "032e02b4-0499-0533-a106-940700080009", "", "Gigabyte Technology Co., Ltd.",
-     "X399 AORUS XTREME", 3},
-    {"mini-pc-3.5", "mini-pc-35", "", "BN1004GH10075", "AZW", "EQ", 3},
-    {"storage-2.7", "storage-27", "", "", "Synology", "RS3614xs+", 2},
+     "X399 AORUS XTREME", 3, "Gigabyte Technology Co., Ltd. X399 AORUS XTREME", "", "Desktop"},
+    {"mini-pc-3.5", "mini-pc-35", "", "BN1004GH10075", "AZW", "EQ", 3, "AZW EQ", "", "Desktop"},
+    {"storage-2.7", "storage-27", "", "", "Synology", "RS3614xs+", 2, "Synology RS3614xs+", "", "Rack Mount Chassis"},
 };
 
 class RealMachines : public testing::TestWithParam<Machine> {
@@ -74,6 +81,17 @@ TEST_P(RealMachines, PublishTheirComputerSystem) {
     const json computer = instance("VESKA_ComputerSystem");
     EXPECT_EQ(text(computer, "Name"), GetParam().name);
     EXPECT_EQ(text(computer, "UUID"), GetParam().uuid);
+    EXPECT_EQ(text(computer, "Description"), GetParam().description);
+    EXPECT_EQ(computer["HealthState"]["value"], 5);
+    const auto information = computer["OtherIdentifyingInfo"]["value"].get<std::vector<std::string>>();
+    const std::string tag = GetParam().tag;
+    EXPECT_THAT(information, Contains(GetParam().model + (":" + tag)).Times(tag.empty() ? 0 : 1));
+    EXPECT_THAT(information, Contains(tag).Times(tag.empty() ? 0 : 1));
+}
+
+TEST_P(RealMachines, HaveTablesWithoutAProblem) {
+    const auto notes = test::vkcim({"report"}, environment)["notes"].get<std::vector<std::string>>();
+    EXPECT_THAT(notes, Each(Not(StartsWith("/")))) << "which the line about a table's fault begins with";
 }
 
 TEST_P(RealMachines, PublishTheirChassis) {
@@ -83,6 +101,8 @@ TEST_P(RealMachines, PublishTheirChassis) {
     EXPECT_EQ(text(chassis, "Manufacturer"), GetParam().manufacturer);
     EXPECT_EQ(text(chassis, "Model"), GetParam().model);
     EXPECT_EQ(chassis["PackageType"]["value"], GetParam().packageType);
+    EXPECT_EQ(text(chassis, "SKU"), GetParam().sku);
+    EXPECT_EQ(text(chassis, "ElementName"), GetParam().chassisName);
 }
 
 TEST_P(RealMachines, CarryTheComputersUUIDAsPlatformGUID) {

@@ -1,7 +1,6 @@
 #include "zone/ZoneMemory.h"
 
-#include "support/HostCopy.h"
-#include "support/LogCapture.h"
+#include "platform/zone/HostWithZones.h"
 #include "zone/ZoneChange.h"
 #include "zone/ZoneInForce.h"
 
@@ -14,7 +13,6 @@ namespace VK::Zone {
 
 namespace {
 
-using support::HostCopy;
 using support::takeLog;
 using testing::AllOf;
 using testing::ElementsAre;
@@ -24,12 +22,9 @@ using testing::StartsWith;
 constexpr const char* berlin = "/usr/share/zoneinfo/Europe/Berlin";
 const std::string memory = "var/lib/vk/instrumentation/former-zone";
 
-class ZoneMemoryOfHost : public testing::Test {
+class ZoneMemoryOfHost : public HostWithZones {
 protected:
-    ZoneMemoryOfHost() {
-        host.useZone("Europe/Berlin");
-        takeLog();
-    }
+    ZoneMemoryOfHost() { host.useZone("Europe/Berlin"); }
 
     ino_t inodeOf(const std::string& name) const {
         struct stat status {};
@@ -38,7 +33,6 @@ protected:
     }
     std::vector<std::string> state() const { return root.list("/var/lib/vk/instrumentation").names; }
 
-    const HostCopy host;
     const Root root{host.path()};
 };
 
