@@ -1,8 +1,8 @@
 #include "tree/TreeFile.h"
 
 #include "common/AtomicFile.h"
-#include "logger/FileDescriptor.h"
 #include "common/FileLock.h"
+#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 #include "zone/Clock.h"
 
-#include "logger/FileDescriptor.h"
 #include "common/Text.h"
+#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
 #include "zone/ZoneInForce.h"
 

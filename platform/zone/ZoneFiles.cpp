@@ -1,7 +1,7 @@
 #include "zone/ZoneFiles.h"
 
-#include "logger/FileDescriptor.h"
 #include "common/FileLock.h"
+#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
 #include "zone/ZoneInForce.h"
 #include "zone/ZoneMemory.h"
