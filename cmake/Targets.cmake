@@ -12,25 +12,33 @@ endfunction()
 
 # vk_built_for_tests(NAME): what belongs to the tests is built in half the time without optimisation and with the lines of
 # its functions alone for debuggers; what is tested is built as it is shipped all the same.
+add_library(vk_unoptimised INTERFACE)
+target_compile_options(vk_unoptimised INTERFACE $<$<CONFIG:RelWithDebInfo>:-O0> -g1)
+if(VK_SANITIZE MATCHES undefined)
+    # Asked at every access of the product; a test's own wrong pointer crashes it or is the address sanitizer's.
+    target_compile_options(vk_unoptimised INTERFACE -fno-sanitize=null,alignment,object-size,vptr)
+endif()
 function(vk_built_for_tests name)
-    target_compile_options(${name} PRIVATE $<$<CONFIG:RelWithDebInfo>:-O0> -g1)
+    # In this order, as the last option counts.
+    target_link_libraries(${name} PRIVATE vk_settings vk_unoptimised)
     set_target_properties(${name} PROPERTIES VK_UNOPTIMISED ON)
 endfunction()
 
-# vk_test(NAME SOURCES... [LINK LIBS...] [ENV VAR=VALUE...]): a GoogleTest program, each of its tests known to ctest.
+# vk_test(NAME SOURCES... [LINK LIBS...] [ENV VAR=VALUE...] [LABELS LABELS...] [COST SECONDS]): a GoogleTest program,
+# each of its tests known to ctest, which begins with those of the highest cost.
 function(vk_test name)
-    cmake_parse_arguments(ARG "" "" "LINK;ENV;LABELS" ${ARGN})
+    cmake_parse_arguments(ARG "" "" "LINK;ENV;LABELS;COST" ${ARGN})
     add_executable(${name} ${ARG_UNPARSED_ARGUMENTS})
     target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR} ${CMAKE_SOURCE_DIR}/platform ${CMAKE_SOURCE_DIR}/tests)
-    target_link_libraries(${name} PRIVATE vk_settings ${ARG_LINK} GTest::gmock_main)
     vk_built_for_tests(${name})
+    target_link_libraries(${name} PRIVATE ${ARG_LINK} GTest::gmock_main)
     set_target_properties(${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/tests)
     if(TARGET test_headers)
         target_precompile_headers(${name} REUSE_FROM test_headers)
     endif()
     # An empty value would vanish on the way, and the next property's name be taken for it.
     set(properties TIMEOUT 300)
-    foreach(property IN ITEMS ENV LABELS)
+    foreach(property IN ITEMS ENV LABELS COST)
         if(ARG_${property})
             string(REPLACE ";" "\\;" values "${ARG_${property}}")
             string(REPLACE ENV ENVIRONMENT property ${property})
