@@ -3,7 +3,8 @@
  *
  * OBJECT(type): a handle and its table. TABLE(type, size, slots...): a version, and slots in this order behind it.
  * SLOTS(type, first, slots...): slots from that one on, counted in pointers. FROM(number, names...): names that count.
- * AT_START(type, size, members...): members of that size at offset 0. ARRAYS(types...): the code of arrays of each type.
+ * AT_START(type, size, members...): members of that size at offset 0. ARRAYS(types...): the code of arrays of each
+ * type.
  */
 #pragma once
 
