@@ -155,50 +155,77 @@ bool ComputerSystem::getDedicated(std::vector<unsigned short>& purposes) const {
     return true;
 }
 
-bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
-                                        std::vector<std::string>& values) const {
-    const TraceScope scope(VK_SCOPE(source));
+void ComputerSystem::makeTexts(const std::string* uuid) const {
     constexpr std::size_t most = 6;
-    descriptions.reserve(most);
-    values.reserve(most);
-    const auto add = [&](std::string value, const char* description) {
-        values.push_back(std::move(value));
-        descriptions.emplace_back(description);
+    identity.descriptions.reserve(most);
+    identity.values.reserve(most);
+    const auto add = [this](std::string value, const char* description) {
+        identity.values.push_back(std::move(value));
+        identity.descriptions.emplace_back(description);
     };
 
-    std::string uuid;
-    if (getUUID(uuid)) {
-        add(uuid, "CIM:GUID");
+    if (uuid != nullptr) {
+        add(*uuid, "CIM:GUID");
         add(make_string(Product::getUid()), "CIM:UniqueSystemID");
     }
-
-    Instrumentation chassis; // tells only that there is one: serial number and model are the computer's, which is meant
-    chassis.selectNode(NodeLexicon::SystemChassisNode);
     std::string serial;
     std::string model;
-    if (chassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
+    // The computer's own serial number and model, not the chassis', which is meant.
+    if (*identity.hasChassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
         node().getProperty(NodeLexicon::ModelProperty, model)) {
         add(model + ":" + serial, "CIM:Model:SerialNumber");
         add(serial, "CIM:Tag");
     }
-
     add(make_string(Product::getArchitecture()), "CIM:Architecture");
     add("true", "CIM:SecureIndicationEnabled");
-    return static_cast<bool>(chassis);
+}
+
+/// Whether there is a chassis. The texts are made where there is one, or always, unless they are made already.
+bool ComputerSystem::identify(bool alwaysTexts) const {
+    const TraceScope scope(VK_SCOPE_OF(source, "getIdentifyingInfo"));
+    std::string uuid;
+    const bool hasUuid = getUUID(uuid);
+    if (!identity.hasChassis) {
+        Instrumentation chassis;
+        chassis.selectNode(NodeLexicon::SystemChassisNode);
+        identity.hasChassis = static_cast<bool>(chassis);
+    }
+    if (identity.values.empty() && (alwaysTexts || *identity.hasChassis)) makeTexts(hasUuid ? &uuid : nullptr);
+    return *identity.hasChassis;
+}
+
+bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
+                                        std::vector<std::string>& values) const {
+    const bool hasChassis = identify(true);
+    descriptions.insert(descriptions.end(), identity.descriptions.begin(), identity.descriptions.end());
+    values.insert(values.end(), identity.values.begin(), identity.values.end());
+    return hasChassis;
+}
+
+bool ComputerSystem::handOut(const TraceLines* lines, bool alwaysTexts, Texts Identity::*list, Texts& texts) const {
+    const TraceScope scope(lines);
+    texts.clear();
+    const bool hasChassis = identify(alwaysTexts);
+    texts = identity.*list;
+    return hasChassis;
 }
 
 bool ComputerSystem::getOtherIdentifyingInfo(std::vector<std::string>& values) const {
-    const TraceScope scope(VK_SCOPE(source));
-    std::vector<std::string> descriptions;
-    values.clear();
-    return getIdentifyingInfo(descriptions, values);
+    return handOut(VK_SCOPE(source), true, &Identity::values, values);
 }
 
 bool ComputerSystem::getIdentifyingDescriptions(std::vector<std::string>& descriptions) const {
-    const TraceScope scope(VK_SCOPE(source));
-    std::vector<std::string> values;
-    descriptions.clear();
-    return getIdentifyingInfo(descriptions, values);
+    return handOut(VK_SCOPE(source), true, &Identity::descriptions, descriptions);
+}
+
+// The lines are those of the getters.
+
+bool ComputerSystem::supplyOtherIdentifyingInfo(std::vector<std::string>& values) const {
+    return handOut(VK_SCOPE_OF(source, "getOtherIdentifyingInfo"), false, &Identity::values, values);
+}
+
+bool ComputerSystem::supplyIdentifyingDescriptions(std::vector<std::string>& descriptions) const {
+    return handOut(VK_SCOPE_OF(source, "getIdentifyingDescriptions"), false, &Identity::descriptions, descriptions);
 }
 
 } // namespace VK::BaseServerProvider

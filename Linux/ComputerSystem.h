@@ -2,6 +2,7 @@
 
 #include "Linux/NodeCursor.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -36,11 +37,15 @@ public:
     /// 2 enabled, 4 shutting down, 0 unknown; another power state answers true and leaves `state`, which is meant.
     bool getEnabledState(unsigned short& state) const;
     bool getDedicated(std::vector<unsigned short>& purposes) const;
-    /// Appends what identifies the computer, pair by pair. The answer tells only whether there is a chassis: without
-    /// one it is false although both vectors were filled, which is meant.
+    /// Appends what identifies the computer, pair by pair, as it was when first asked for on this node. The answer
+    /// tells only whether there is a chassis: without one it is false although both vectors were filled, which is
+    /// meant.
     bool getIdentifyingInfo(std::vector<std::string>& descriptions, std::vector<std::string>& values) const;
     bool getOtherIdentifyingInfo(std::vector<std::string>& values) const;
     bool getIdentifyingDescriptions(std::vector<std::string>& descriptions) const;
+    /// The last two for a reader that wants the texts only where the answer is true: else the argument stays empty.
+    bool supplyOtherIdentifyingInfo(std::vector<std::string>& values) const;
+    bool supplyIdentifyingDescriptions(std::vector<std::string>& descriptions) const;
 
     /// What this host cannot supply.
     bool getCaption(std::string&) const { return false; }
@@ -64,7 +69,25 @@ public:
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::ComputerSystemNode;
     static constexpr bool evaluatesUnfiltered = true;
+    static constexpr bool remembersNode = true;
     bool passes(const Filter& filter) const;
+    void forgetNode() { identity = {}; }
+
+private:
+    using Texts = std::vector<std::string>;
+
+    /// What identifies the computer that the cursor stands on, found out once.
+    struct Identity {
+        std::optional<bool> hasChassis;
+        Texts values; ///< empty until they are wanted, as are the descriptions
+        Texts descriptions;
+    };
+
+    bool identify(bool alwaysTexts) const;
+    void makeTexts(const std::string* uuid) const;
+    bool handOut(const TraceLines* lines, bool alwaysTexts, Texts Identity::*list, Texts& texts) const;
+
+    mutable Identity identity;
 };
 
 } // namespace VK::BaseServerProvider

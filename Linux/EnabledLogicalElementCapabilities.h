@@ -35,6 +35,7 @@ public:
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::ComputerSystemNode;
     static constexpr bool evaluatesUnfiltered = true;
+    static constexpr bool remembersNode = false;
     bool passes(const Filter& filter) const;
 };
 

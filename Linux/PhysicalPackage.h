@@ -64,6 +64,7 @@ public:
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::SystemChassisNode;
     static constexpr bool evaluatesUnfiltered = false; // meant: unlike the computer
+    static constexpr bool remembersNode = false;
     bool passes(const Filter& filter) const;
 };
 

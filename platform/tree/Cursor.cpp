@@ -1,5 +1,7 @@
 #include "tree/Cursor.h"
 
+#include "vk/NodeLexicon.h"
+
 namespace VK::Tree {
 
 Cursor::Cursor() : Cursor(NodeSource::current()) {}
@@ -7,6 +9,7 @@ Cursor::Cursor() : Cursor(NodeSource::current()) {}
 void Cursor::standOn(const Node* node) {
     current = node;
     knownStatus.reset();
+    knownName.reset();
 }
 
 void Cursor::selectType(unsigned int type) {
@@ -41,7 +44,10 @@ void Cursor::filterByPath(const std::string& path) {
 }
 
 std::optional<Value> Cursor::read(unsigned int property) const {
-    return current != nullptr ? host.read(*current, property) : std::nullopt;
+    if (current == nullptr) return std::nullopt;
+    if (property != NodeLexicon::NameProperty) return host.read(*current, property);
+    if (!knownName) knownName = host.read(*current, property);
+    return *knownName;
 }
 
 bool Cursor::write(unsigned int property, const Value& value) {

@@ -10,7 +10,8 @@
 namespace VK::Tree {
 
 /// What VK::Instrumentation is made of: a place among the nodes of one type, or on one node, of a host's tree as it
-/// stood when the nodes were selected.
+/// stood when the nodes were selected. A node's name and status are read once while the cursor stands on it: what one
+/// answer says of them is of one moment.
 class Cursor {
 public:
     /// Over the host of this process.
@@ -37,8 +38,6 @@ public:
     }
     bool write(unsigned int property, const Value& value);
     std::optional<bool> isReadOnly(unsigned int property) const;
-    /// Read once while the cursor stands where it does: what one answer tells of the health is of one moment, and a
-    /// host that reads it from files does so once.
     unsigned int status() const;
 
 private:
@@ -50,7 +49,9 @@ private:
     std::size_t rank = 0;
     const Node* current = nullptr;
     bool filtered = false;
-    mutable std::optional<unsigned int> knownStatus; ///< of the current node
+    // Of the current node, once read.
+    mutable std::optional<unsigned int> knownStatus;
+    mutable std::optional<std::optional<Value>> knownName;
 };
 
 } // namespace VK::Tree
