@@ -3,6 +3,7 @@
 #include "provider/BaseServerProvider.h"
 
 #include "vk/ClassId.h"
+#include "vk/HostLook.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -59,7 +60,12 @@ public:
     template <class Work>
     CMPIStatus runMarked(Work work, unsigned int line = __builtin_LINE()) const {
         CMPIStatus status = {CMPI_RC_OK, nullptr};
-        run([&] { work(status); }, [](const std::exception&) {}, line);
+        const auto lookingOnce = [&] {
+            const HostLook look;
+            work(status);
+        };
+        run(
+            lookingOnce, [](const std::exception&) {}, line);
         contained([&] { markProviderExit(place.lines(here(line), ENTERING)); });
         return status;
     }

@@ -2,6 +2,7 @@
 
 #include "common/RootWalk.h"
 #include "vk/HostSource.h"
+#include "vk/Kept.h"
 
 #include <algorithm>
 #include <array>
@@ -44,6 +45,7 @@ FileDescriptor openRoot(const std::string& directory) {
 }
 
 Root::Contents failure(int error) {
+    noteShortage(error);
     Root::Contents contents;
     contents.error = error;
     return contents;
@@ -98,10 +100,16 @@ Root Root::recordedIn(Record& record) const {
 }
 
 int Root::open(const std::string& path, int flags, mode_t mode) const {
+    const int opened = openBelow(path, flags, mode);
+    if (opened < 0) noteShortage(-opened);
+    return opened;
+}
+
+int Root::openBelow(const std::string& path, int flags, mode_t mode) const {
     if (path.find('\0') != std::string::npos) return -EINVAL;
     flags |= O_CLOEXEC | ((flags & O_PATH) != 0 ? 0 : O_NOCTTY); // openat2 refuses what O_PATH does not use
     if (live) {
-        const int fd = ::open(("/" + path).c_str(), flags, mode);
+        const int fd = ::open(path.rfind('/', 0) == 0 ? path.c_str() : ("/" + path).c_str(), flags, mode);
         return fd >= 0 ? fd : -errno;
     }
     FileDescriptor root = openRoot(directory);

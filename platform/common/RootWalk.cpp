@@ -28,7 +28,7 @@ void RootWalk::defer(const std::string& path) {
 }
 
 int RootWalk::follow(const FileDescriptor& link) {
-    if (++linksFollowed > MAX_LINKS) return ELOOP;
+    if (followed.size() > MAX_LINKS) return ELOOP;
     std::array<char, PATH_MAX> target{};
     const ssize_t length = readlinkat(link.get(), "", target.data(), target.size());
     if (length < 0) return errno;
@@ -43,12 +43,16 @@ int RootWalk::enter(const std::string& name, bool followLink) {
     FileDescriptor fd(openat(top(), name.c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC));
     if (!fd) {
         const int error = errno;
+        if (error == ENOENT) absent = below(name);
         if (error == ENOENT && pending.empty()) missing = name;
         return error;
     }
     struct stat status {};
     if (fstat(fd.get(), &status) != 0) return errno;
-    if (S_ISLNK(status.st_mode) && (followLink || !pending.empty())) return follow(fd);
+    if (S_ISLNK(status.st_mode) && (followLink || !pending.empty())) {
+        followed.push_back(below(name));
+        return follow(fd);
+    }
     if (!pending.empty() && !S_ISDIR(status.st_mode)) return ENOTDIR;
     steps.push_back({name, std::move(fd)});
     return 0;
@@ -86,6 +90,11 @@ std::string RootWalk::path() const {
     std::string text;
     for (const Step& step : steps) text += "/" + step.name;
     return text.empty() ? "/" : text;
+}
+
+std::string RootWalk::below(const std::string& name) const {
+    const std::string above = path();
+    return (above == "/" ? above : above + "/") + name;
 }
 
 } // namespace VK

@@ -28,6 +28,12 @@ public:
     /// Where the walk stands: absolute below the root.
     std::string path() const;
 
+    /// The same; after ENOENT the first path on the way that is not there.
+    std::string end() const { return absent.empty() ? path() : absent; }
+
+    /// Each link that was followed, absolute below the root, with no other on the way to it.
+    const std::vector<std::string>& links() const { return followed; }
+
 private:
     struct Step {
         std::string name;
@@ -37,13 +43,15 @@ private:
     int enter(const std::string& name, bool followLink);
     int follow(const FileDescriptor& link);
     void defer(const std::string& path);
+    std::string below(const std::string& name) const;
     int top() const { return steps.empty() ? root.get() : steps.back().fd.get(); }
 
     FileDescriptor root;
     std::vector<Step> steps;          ///< from below the root to here
     std::vector<std::string> pending; ///< names still to walk, the next one last
     std::string missing;              ///< the last name, when nothing is there
-    unsigned int linksFollowed = 0;
+    std::string absent;               ///< the path that a walk ended before
+    std::vector<std::string> followed;
 };
 
 } // namespace VK

@@ -26,29 +26,31 @@ std::uint64_t microsecondsNow() {
 } // namespace
 
 std::optional<std::string> hostName(const Root& root) {
-    if (!root.isLive()) return unlessEmpty(hostNameFromFile(root.read("/etc/hostname").text));
+    if (!root.isLive()) return unlessEmpty(hostNameFromFile(root.read(hostNameFile).text));
     std::array<char, LONGEST_NAME + 1> name{}; // the last byte stays zero, whatever is written before it
     if (gethostname(name.data(), LONGEST_NAME) != 0) return std::nullopt;
     return unlessEmpty(name.data());
 }
 
-unsigned int powerState(const Root& root) {
-    constexpr unsigned int ON = 1;
-    constexpr unsigned int SHUTTING_DOWN = 16;
-    const bool shutdown = utmpSaysShutdown(root.read("/run/utmp").text) ||
-                          scheduledShutdownIsDue(root.read("/run/systemd/shutdown/scheduled").text, microsecondsNow());
-    return shutdown ? SHUTTING_DOWN : ON;
+Shutdown readShutdown(const Root& root) {
+    return {utmpSaysShutdown(root.read(runLevelFile).text), root.read(scheduledShutdownFile).text};
+}
+
+bool Shutdown::isUnderWay() const {
+    return runLevel || scheduledShutdownIsDue(scheduled, microsecondsNow());
+}
+
+std::vector<std::string> memoryErrorFiles(const Root& root) {
+    std::vector<std::string> files;
+    for (const std::string& name : root.list(memoryControllers).names)
+        if (name.rfind("mc", 0) == 0) files.push_back(memoryControllers + "/" + name + "/ue_count");
+    return files;
 }
 
 bool hasUncorrectableMemoryErrors(const Root& root) {
-    bool found = false;
-    const std::string folder = "/sys/devices/system/edac/mc/";
-    for (const std::string& name : root.list(folder).names) {
-        if (name.rfind("mc", 0) != 0) continue;
-        std::string file = folder;
-        file.append(name).append("/ue_count");
+    bool found = false; // all are read: a root that keeps a record is to know them
+    for (const std::string& file : memoryErrorFiles(root))
         found = root.read(file).text.find_first_of("123456789") != std::string::npos || found;
-    }
     return found;
 }
 

@@ -4,6 +4,7 @@
 
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace VK::Host {
 
@@ -12,10 +13,28 @@ namespace VK::Host {
 /// The kernel's node name; below another root what /etc/hostname says. Nothing when there is none.
 std::optional<std::string> hostName(const Root& root);
 
-/// 1 on, 16 shutting down.
-unsigned int powerState(const Root& root);
+/// What the host's files say of its end.
+struct Shutdown {
+    bool runLevel = false; ///< the run level is that of a host that goes down
+    std::string scheduled; ///< the bytes of the file that announces a shutdown
+
+    /// Whether the host shuts down now.
+    bool isUnderWay() const;
+};
+
+Shutdown readShutdown(const Root& root);
 
 /// Whether any memory controller has counted an error that could not be corrected.
 bool hasUncorrectableMemoryErrors(const Root& root);
+
+// The files that these are made of.
+
+inline const std::string hostNameFile = "/etc/hostname";
+inline const std::string runLevelFile = "/run/utmp";
+inline const std::string scheduledShutdownFile = "/run/systemd/shutdown/scheduled";
+inline const std::string memoryControllers = "/sys/devices/system/edac/mc";
+
+/// One for each memory controller.
+std::vector<std::string> memoryErrorFiles(const Root& root);
 
 } // namespace VK::Host

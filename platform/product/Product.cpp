@@ -4,6 +4,7 @@
 #include "product/Widen.h"
 #include "vk/Architecture.h"
 #include "vk/HostFacts.h"
+#include "vk/Kept.h"
 #include "vk/Root.h"
 
 #include <string_view>
@@ -41,27 +42,27 @@ std::string readUid() {
 }
 
 Facts readFacts() {
-    const ProductOverrides& given = productOverrides();
+    const ProductOverrides given = productOverrides();
     return {given.architecture ? *given.architecture : architectureOf(Root::host()),
             withFinalSlash(given.rootDirectory ? *given.rootDirectory : VK_ROOT_DIRECTORY),
             given.uid ? *given.uid : readUid()};
 }
 
-const Facts& facts() {
-    static const Facts read = readFacts();
-    return read;
+std::shared_ptr<const Facts> facts() {
+    static Kept<Facts> kept;
+    return kept.get(readFacts);
 }
 
 } // namespace
 
 std::wstring Product::getArchitecture() {
-    return widen(facts().architecture);
+    return widen(facts()->architecture);
 }
 std::wstring Product::getRootDirectory() {
-    return widen(facts().rootDirectory);
+    return widen(facts()->rootDirectory);
 }
 std::wstring Product::getUid() {
-    return widen(facts().uid);
+    return widen(facts()->uid);
 }
 
 } // namespace VK

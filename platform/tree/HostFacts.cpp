@@ -6,6 +6,7 @@
 #include "tree/CurrentHost.h"
 #include "tree/Cursor.h"
 #include "vk/HostSource.h"
+#include "vk/Kept.h"
 #include "vk/NodeLexicon.h"
 #include "vk/Root.h"
 #include "zone/ZoneInForce.h"
@@ -16,24 +17,24 @@ namespace {
 
 bool findOutKvm() {
     if (const std::optional<bool> given = productOverrides().kvm; given) return *given;
-    return Host::isKvmGuest(Root::host(), Tree::realHost().hardware());
+    return Host::isKvmGuest(Root::host(), Tree::realHost().reading()->facts);
 }
 
 } // namespace
 
-const ProductOverrides& productOverrides() {
-    static const ProductOverrides overrides =
-        Tree::simulatedHost() != nullptr ? Tree::simulatedHost()->state()->product : ProductOverrides();
-    return overrides;
+ProductOverrides productOverrides() {
+    static Kept<ProductOverrides> overrides;
+    return *overrides.get(
+        [] { return Tree::simulatedHost() != nullptr ? Tree::simulatedHost()->state()->product : ProductOverrides(); });
 }
 
-const std::string& hostUuid() {
-    return Tree::realHost().hardware().uuid.text;
+std::string hostUuid() {
+    return Tree::realHost().reading()->facts.uuid.text;
 }
 
 bool hostIsKVM() {
-    static const bool kvm = findOutKvm();
-    return kvm;
+    static Kept<bool> kvm;
+    return *kvm.get(findOutKvm);
 }
 
 namespace {
@@ -44,8 +45,8 @@ std::vector<std::string> missingFacts() {
         if (problem.empty()) return {};
         return {HostSource::current().location + ": " + problem};
     }
-    Tree::RealHost& host = Tree::realHost();
-    return host.problem().empty() ? Host::notesOn(host.hardware()) : std::vector<std::string>{host.problem()};
+    const auto reading = Tree::realHost().reading();
+    return reading->problem.empty() ? Host::notesOn(reading->facts) : std::vector<std::string>{reading->problem};
 }
 
 std::string timeServiceNote() {

@@ -1,7 +1,6 @@
 #include "tree/HostNodes.h"
 
 #include "common/Text.h"
-#include "host/State.h"
 #include "zone/Clock.h"
 #include "zone/ZoneChange.h"
 #include "zone/ZoneInForce.h"
@@ -60,13 +59,14 @@ std::optional<bool> withNumber(const Value& value, unsigned int largest, Change 
 constexpr ChangingProperty COMPUTER_NOW[] = {
     {.number = Lexicon::NameProperty,
      .read =
-         [](const Root& root) {
-             const std::optional<std::string> name = Host::hostName(root);
+         [](HostNow& host) {
+             const std::optional<std::string> name = host.name();
              return name ? Told(*name) : std::nullopt;
          }},
-    {.number = Lexicon::PowerStateProperty, .read = [](const Root& root) { return Told(Host::powerState(root)); }},
+    {.number = Lexicon::PowerStateProperty,
+     .read = [](HostNow& host) { return Told(host.isShuttingDown() ? 16U : 1U); }},
     {.number = Lexicon::GmtOffsetProperty,
-     .read = [](const Root& root) { return Told(static_cast<unsigned int>(Zone::offsetInForce(root))); },
+     .read = [](HostNow& host) { return Told(static_cast<unsigned int>(Zone::offsetInForce(*host.zone()))); },
      .change =
          [](const Root& root, const Value& value) {
              return withNumber(value, UINT_MAX, [&root](unsigned int minutes) {
@@ -74,7 +74,7 @@ constexpr ChangingProperty COMPUTER_NOW[] = {
              });
          }},
     {.number = Lexicon::SystemTimeProperty,
-     .read = [](const Root& root) { return Told(Zone::systemTime(root)); },
+     .read = [](HostNow& host) { return Told(Zone::systemTime(*host.zone())); },
      .change =
          [](const Root& root, const Value& value) {
              const std::string* const time = std::get_if<std::string>(&value);
@@ -82,7 +82,7 @@ constexpr ChangingProperty COMPUTER_NOW[] = {
          },
      .onLiveHostsOnly = true},
     {.number = Lexicon::AutomaticDSTAdjustmentProperty,
-     .read = [](const Root& root) { return Told(Zone::hasDaylightSaving(root) ? 1U : 0U); },
+     .read = [](HostNow& host) { return Told(Zone::hasDaylightSaving(*host.zone()) ? 1U : 0U); },
      .change =
          [](const Root& root, const Value& value) {
              return withNumber(value, 1,
@@ -157,16 +157,17 @@ const ChangingProperty* changingProperty(const Node& node, unsigned int number) 
     return nullptr;
 }
 
-unsigned int statusOf(const Root& root, const Node& node) {
+unsigned int statusOf(HostNow& host, const Node& node) {
     constexpr unsigned int UNCORRECTABLE_ERRORS = 22;
-    if (node.type == Lexicon::ComputerSystemNode && Host::hasUncorrectableMemoryErrors(root))
+    if (node.type == Lexicon::ComputerSystemNode && host.hasUncorrectableMemoryErrors())
         return std::max(node.status, UNCORRECTABLE_ERRORS); // the worse, the larger
     return node.status;
 }
 
 void readEverything(const Root& root) {
-    for (const Node& node : hostNodes(Host::readHardware(root))) statusOf(root, node);
-    for (const ChangingProperty& row : COMPUTER_NOW) row.read(root);
+    HostNow now(root);
+    for (const Node& node : hostNodes(Host::readHardware(root))) statusOf(now, node);
+    for (const ChangingProperty& row : COMPUTER_NOW) row.read(now);
 }
 
 } // namespace VK::Tree

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/HardwareFacts.h"
+#include "tree/HostNow.h"
 #include "tree/NodeTree.h"
 #include "vk/NodeLexicon.h"
 #include "vk/Root.h"
@@ -16,7 +17,7 @@ std::vector<Node> hostNodes(const Host::HardwareFacts& facts);
 /// A property that may change at any time.
 struct ChangingProperty {
     NodeLexicon::Properties number;
-    std::optional<Value> (*read)(const Root& root);
+    std::optional<Value> (*read)(HostNow& host);
     /// Changes it: what the change answers; nothing for a value that it cannot take. Null: read-only.
     std::optional<bool> (*change)(const Root& root, const Value& value) = nullptr;
     bool onLiveHostsOnly = false; ///< of a snapshot it is read-only
@@ -26,7 +27,7 @@ struct ChangingProperty {
 const ChangingProperty* changingProperty(const Node& node, unsigned int number);
 
 /// The node's status now, which includes what may change at any time.
-unsigned int statusOf(const Root& root, const Node& node);
+unsigned int statusOf(HostNow& host, const Node& node);
 
 /// Reads all that a host's nodes are made of, for a root that keeps a record.
 void readEverything(const Root& root);

@@ -1,17 +1,19 @@
 #pragma once
 
 #include "host/HardwareFacts.h"
+#include "tree/HostNow.h"
 #include "tree/NodeSource.h"
+#include "vk/Kept.h"
 
 #include <memory>
-#include <mutex>
+#include <string>
 
 namespace VK::Tree {
 
 /// This host, or a snapshot of one below another root. What cannot change while a host runs is read once.
 class RealHost final : public NodeSource {
 public:
-    explicit RealHost(const Root& hostRoot) : root(hostRoot) {}
+    explicit RealHost(const Root& hostRoot) : root(hostRoot), now(root) {}
 
     std::shared_ptr<const NodeTree> tree() override;
     std::optional<Value> read(const Node& node, unsigned int property) override;
@@ -19,19 +21,19 @@ public:
     std::optional<bool> isReadOnly(const Node& node, unsigned int property) override;
     unsigned int status(const Node& node) override;
 
-    /// The facts behind the tree.
-    const Host::HardwareFacts& hardware();
-    /// The problem of a root that cannot be used, or an empty text.
-    const std::string& problem();
+    /// What cannot change while a host runs.
+    struct Reading {
+        Host::HardwareFacts facts;            ///< behind the tree
+        std::string problem;                  ///< of a root that cannot be used; empty when it can
+        std::shared_ptr<const NodeTree> tree; ///< never null
+    };
+    /// Never null. Read again the next time where descriptors ran out.
+    std::shared_ptr<const Reading> reading();
 
 private:
-    void readOnce();
-
     const Root root;
-    std::once_flag once;
-    Host::HardwareFacts facts;
-    std::string rootProblem;
-    std::shared_ptr<const NodeTree> nodes;
+    Kept<Reading> known;
+    HostNow now;
 };
 
 } // namespace VK::Tree

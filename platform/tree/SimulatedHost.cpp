@@ -4,28 +4,13 @@
 #include "logger/LogLine.h"
 #include "tree/TreeFile.h"
 #include "tree/TreeText.h"
+#include "vk/HostLook.h"
 
 #include <algorithm>
-#include <cerrno>
-#include <ctime>
 
 namespace VK::Tree {
 
 namespace {
-
-/// Two changes within one tick of the file system's clock leave the same stamp: one as young as this may still be
-/// followed by a change that it does not tell.
-constexpr std::int64_t CLOCK_TICK = 20'000'000;
-
-std::int64_t nanoseconds(const timespec& time) {
-    return std::int64_t{time.tv_sec} * 1'000'000'000 + time.tv_nsec;
-}
-
-std::int64_t now() {
-    timespec time{};
-    clock_gettime(CLOCK_REALTIME, &time);
-    return nanoseconds(time);
-}
 
 bool contains(const std::vector<unsigned int>& numbers, unsigned int number) {
     return std::find(numbers.begin(), numbers.end(), number) != numbers.end();
@@ -66,6 +51,10 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
         return changed;
     };
     const std::string problem = replaceTreeFile(file, LARGEST_FILE, change);
+    {
+        const std::lock_guard<std::mutex> lock(mutex);
+        lookAt = 0; // what we wrote shows at once
+    }
     if (problem.empty()) return true;
     logLine(FAILURE, "setProperty", __LINE__,
             file + ": property " + std::to_string(property) + " of " + inQuotes(node.path) +
@@ -73,36 +62,26 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
     return false;
 }
 
-SimulatedHost::Stamp SimulatedHost::stampOf(const struct stat& status) {
-    Stamp result;
-    result.identity = {status.st_dev,          status.st_ino,         status.st_size,        status.st_mtim.tv_sec,
-                       status.st_mtim.tv_nsec, status.st_ctim.tv_sec, status.st_ctim.tv_nsec};
-    result.changed = nanoseconds(status.st_ctim); // set by the kernel alone, with every change
-    return result;
-}
-
-SimulatedHost::Stamp SimulatedHost::stampNow() const {
-    struct stat status {};
-    if (stat(file.c_str(), &status) == 0) return stampOf(status);
-    Stamp result;
-    result.error = errno;
-    return result;
-}
-
-bool SimulatedHost::isKnown(const Stamp& at) const {
-    return known && settled && at.error == stamp.error && at.identity == stamp.identity;
+bool SimulatedHost::isKnown(const FileStamp& at) const {
+    return known && settled && at == stamp;
 }
 
 std::shared_ptr<const SimulatedHost::State> SimulatedHost::state() {
-    const Stamp at = stampNow();
+    const std::uint64_t look = HostLook::number();
+    {
+        const std::lock_guard<std::mutex> lock(mutex);
+        if (look != 0 && look == lookAt) return known;
+    }
+    const FileStamp at = FileStamp::behind(file.c_str());
     const std::lock_guard<std::mutex> lock(mutex);
     if (!isKnown(at)) readAnew();
+    lookAt = look;
     return known;
 }
 
 void SimulatedHost::readAnew() {
     const std::string before = known ? known->problem : std::string();
-    const std::int64_t begin = now();
+    const std::int64_t begin = FileStamp::now();
     const TreeFileContents contents = readTreeFile(file, LARGEST_FILE);
     auto fresh = std::make_shared<State>();
     TreeText text;
@@ -113,9 +92,9 @@ void SimulatedHost::readAnew() {
     fresh->problem = std::move(text.problem);
     if (!fresh->problem.empty() && fresh->problem != before)
         logLine(FAILURE, "readAnew", __LINE__, file + ": " + fresh->problem);
-    stamp = contents.error != 0 ? Stamp() : stampOf(contents.status);
+    stamp = contents.error != 0 ? FileStamp() : FileStamp(contents.status);
     stamp.error = contents.error;
-    settled = contents.error != 0 || stamp.changed + CLOCK_TICK < begin;
+    settled = stamp.tellsChangesFrom(begin);
     known = std::move(fresh);
 }
 

@@ -1,13 +1,12 @@
 #pragma once
 
+#include "common/FileStamp.h"
 #include "tree/NodeSource.h"
 #include "vk/HostFacts.h"
 
 #include <cstdint>
 #include <mutex>
 #include <string>
-#include <sys/stat.h>
-#include <tuple>
 
 namespace VK::Tree {
 
@@ -36,24 +35,16 @@ public:
     std::shared_ptr<const State> state();
 
 private:
-    /// Tells whether a file is still the one that was read.
-    struct Stamp {
-        std::tuple<dev_t, ino_t, off_t, time_t, long, time_t, long> identity{};
-        std::int64_t changed = 0; ///< nanoseconds since 1970
-        int error = 0;            ///< why there is no file, instead of all else
-    };
-
-    static Stamp stampOf(const struct stat& status);
-    Stamp stampNow() const;
-    bool isKnown(const Stamp& now) const;
+    bool isKnown(const FileStamp& now) const;
     void readAnew();
     std::string refusal(const Node& node, unsigned int property, const Value& value) const;
 
     const std::string file;
     std::mutex mutex;
     std::shared_ptr<const State> known;
-    Stamp stamp;
-    bool settled = false; ///< the stamp tells every later change
+    FileStamp stamp;
+    bool settled = false;     ///< the stamp tells every later change
+    std::uint64_t lookAt = 0; ///< the look (vk/HostLook.h) in which the file was asked last
 };
 
 } // namespace VK::Tree

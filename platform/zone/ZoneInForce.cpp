@@ -34,18 +34,32 @@ TimeZone zoneInForce(const Root& root) {
     return zoneOfFile(root, LOCAL_TIME).value_or(TimeZone());
 }
 
+void addZoneFiles(SeenFiles& files) {
+    files.add(LOCAL_TIME);
+    files.addLinks(ZONE_DIRECTORY); // both decide whether the file is trusted
+    files.addLinks("/etc");
+}
+
+int offsetInForce(const TimeZone& zone) {
+    return zone.at(std::time(nullptr)).offset / 60;
+}
+
+bool hasDaylightSaving(const TimeZone& zone) {
+    return zone.hasDaylightSavingFrom(std::time(nullptr));
+}
+
 int offsetInForce(const Root& root) {
-    return zoneInForce(root).at(std::time(nullptr)).offset / 60;
+    return offsetInForce(zoneInForce(root));
 }
 
 bool hasDaylightSaving(const Root& root) {
-    return zoneInForce(root).hasDaylightSavingFrom(std::time(nullptr));
+    return hasDaylightSaving(zoneInForce(root));
 }
 
-std::string systemTime(const Root& root) {
+std::string systemTime(const TimeZone& zone) {
     timespec now{};
     clock_gettime(CLOCK_REALTIME, &now);
-    return formatCimDateTime({now.tv_sec, now.tv_nsec / 1000}, zoneInForce(root).at(now.tv_sec).offset / 60);
+    return formatCimDateTime({now.tv_sec, now.tv_nsec / 1000}, zone.at(now.tv_sec).offset / 60);
 }
 
 } // namespace VK::Zone

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "common/SeenFiles.h"
 #include "vk/Root.h"
 #include "zone/ZoneFile.h"
 
@@ -28,7 +29,12 @@ TimeZone zoneInForce(const Root& root);
 int offsetInForce(const Root& root);
 bool hasDaylightSaving(const Root& root);
 
-/// Now, as a CIM date-time with microseconds and the offset in force.
-std::string systemTime(const Root& root);
+/// Adds the files that make the zone in force.
+void addZoneFiles(SeenFiles& files);
+
+/// The same of a zone that was read before; and now, as a CIM date-time with microseconds and its offset.
+int offsetInForce(const TimeZone& zone);
+bool hasDaylightSaving(const TimeZone& zone);
+std::string systemTime(const TimeZone& zone);
 
 } // namespace VK::Zone

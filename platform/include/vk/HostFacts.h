@@ -17,11 +17,11 @@ struct ProductOverrides {
 
 /// The overrides of the simulated host's file as it stood when first asked for; all absent when the process's host is
 /// not a simulated one (vk/HostSource.h), or its file cannot be read.
-const ProductOverrides& productOverrides();
+ProductOverrides productOverrides();
 
 /// The system's UUID as this machine's or the snapshot's files tell it; empty where they do not. What a simulated
 /// host's file holds of its computer does not count.
-const std::string& hostUuid();
+std::string hostUuid();
 
 /// Whether the host is a KVM virtual machine; found out once per process. A simulated host's file may say so. This
 /// machine: CPUID says KVMKVMKVM (x86), or the firmware's system product name starts with KVM, or its system

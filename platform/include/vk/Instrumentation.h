@@ -13,7 +13,8 @@ class NodePath {
 public:
     NodePath() = default;
     NodePath(std::string text) : text_(std::move(text)) {}
-    operator std::string() const { return text_; }
+    operator std::string() const& { return text_; }
+    operator std::string() && { return std::move(text_); }
 
     friend bool operator==(const NodePath& a, const NodePath& b) { return a.text_ == b.text_; }
     friend bool operator!=(const NodePath& a, const NodePath& b) { return !(a == b); }
@@ -26,10 +27,13 @@ private:
 ///
 /// The tree comes from this host, a snapshot of one, or a simulated host's file (vk/HostSource.h). A source that
 /// cannot be read is an empty tree and one log line at level 6000; a simulated host's file may have 16 MiB. What cannot
-/// change while a host runs is read once per process, the rest (host name, power state, clock, zone) at each call, and
-/// memory errors when a cursor is first asked for its node's status; a simulated host's file as it stands when nodes
-/// are selected. No operation throws but for std::bad_alloc. Cursors are independent of each other; one cursor belongs
-/// to one thread at a time.
+/// change while a host runs is read once per process. The rest is as it is now: clock and zone at each call, and a
+/// node's name and status when a cursor on it is first asked. Of this host power state and memory errors may be one
+/// second old, so that a request opens no file; of a snapshot every change shows at once, and its files are read again
+/// when they have changed; a simulated host's file is as it stands when nodes are selected. Within a look
+/// (vk/HostLook.h) snapshots and simulated hosts stay as they were at its beginning. What is known stays where
+/// descriptors run out, and what could not be read for that is read again the next time. No operation throws but for
+/// std::bad_alloc. Cursors are independent of each other; one cursor belongs to one thread at a time.
 class Instrumentation {
 public:
     /// A cursor that stands on nothing.

@@ -81,6 +81,8 @@ public:
     int open(const std::string& path, int flags, mode_t mode = 0) const;
 
 private:
+    int openBelow(const std::string& path, int flags, mode_t mode) const;
+
     std::string directory;
     bool live;
     Record* asked = nullptr;

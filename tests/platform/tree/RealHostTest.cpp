@@ -161,7 +161,7 @@ TEST(RealHost, ThatIsNotThereIsAnEmptyTree) {
     RealHost host(Root("/no/such/folder"));
     EXPECT_TRUE(host.tree()->isEmpty());
     EXPECT_TRUE(host.tree()->isEmpty());
-    EXPECT_EQ(host.problem(), "/no/such/folder: No such file or directory");
+    EXPECT_EQ(host.reading()->problem, "/no/such/folder: No such file or directory");
     EXPECT_THAT(takeLog(), ElementsAre("6000 /no/such/folder: No such file or directory"));
 }
 

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstdint>
+#include <sys/stat.h>
+#include <tuple>
+
+namespace VK {
+
+/// What a file was like when it was looked at: it tells whether it is still the one that was read.
+struct FileStamp {
+    FileStamp() = default;
+    explicit FileStamp(const struct stat& status);
+
+    /// Of what stands at a path, a link itself.
+    static FileStamp of(const char* path);
+    /// Of what a path leads to.
+    static FileStamp behind(const char* path);
+
+    /// Now, on the clock of `changed`.
+    static std::int64_t now();
+    /// Whether it tells every change from `instant` on. Two changes within one tick of the file system's clock leave
+    /// the same stamp: one that young may still be followed by a change that it does not tell.
+    bool tellsChangesFrom(std::int64_t instant) const;
+
+    friend bool operator==(const FileStamp& a, const FileStamp& b) {
+        return a.error == b.error && a.identity == b.identity;
+    }
+
+    std::tuple<dev_t, ino_t, off_t, time_t, long, time_t, long> identity{};
+    std::int64_t changed = 0; ///< nanoseconds since 1970; set by the kernel alone, with every change
+    int error = 0;            ///< why there is no file, instead of all else
+};
+
+} // namespace VK

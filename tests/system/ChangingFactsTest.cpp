@@ -1,0 +1,198 @@
+// What may change of a host that runs: how soon it shows, what forks see of it, and what is left of it where
+// descriptors run out. In namespaces of the test's own, with a coarse clock that only the test moves.
+
+#include "support/InChild.h"
+#include "support/Provider.h"
+#include "system/Namespaces.h"
+
+#include <gmock/gmock.h>
+
+#include <atomic>
+#include <ctime>
+#include <fstream>
+#include <functional>
+#include <list>
+#include <sys/resource.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+namespace {
+
+std::atomic<long> coarseMilliseconds{100'000};
+
+} // namespace
+
+// Found before the C library's.
+extern "C" int clock_gettime(clockid_t clock, timespec* time) noexcept {
+    if (clock != CLOCK_MONOTONIC_COARSE) return static_cast<int>(syscall(SYS_clock_gettime, clock, time));
+    const long now = coarseMilliseconds;
+    *time = {now / 1000, now % 1000 * 1'000'000};
+    return 0;
+}
+
+namespace {
+
+using testing::IsEmpty;
+using testing::SizeIs;
+
+constexpr char computer[] = "VESKA_ComputerSystem";
+
+void write(const std::filesystem::path& file, const std::string& text) {
+    std::filesystem::create_directories(file.parent_path());
+    std::ofstream(file) << text;
+}
+
+/// A number or flag of the one instance of a class.
+std::uint64_t numberOf(const char* className, const char* property) {
+    const std::vector<om::Instance> found = test::instancesOf(test::instances(className));
+    const om::Value* const value = found.size() == 1 ? test::find(found[0].properties, property) : nullptr;
+    if (value == nullptr) return 4711;
+    if (const bool* const flag = std::get_if<bool>(&value->data)) return *flag ? 1 : 0;
+    return std::get<std::uint64_t>(value->data);
+}
+
+std::uint64_t enabledState() {
+    return numberOf(computer, "EnabledState");
+}
+
+std::uint64_t healthState() {
+    return numberOf(computer, "HealthState");
+}
+
+std::string name() {
+    const std::vector<om::ObjectPath> found = test::paths(test::names(computer));
+    return found.size() == 1 ? test::text(*test::find(found[0].keys, "Name")) : std::to_string(found.size()) + " names";
+}
+
+/// No descriptor can be opened while it lives.
+class NoDescriptors {
+public:
+    NoDescriptors() {
+        getrlimit(RLIMIT_NOFILE, &before);
+        const rlimit none{0, before.rlim_max};
+        setrlimit(RLIMIT_NOFILE, &none);
+    }
+    ~NoDescriptors() { setrlimit(RLIMIT_NOFILE, &before); }
+    NoDescriptors(const NoDescriptors&) = delete;
+    NoDescriptors& operator=(const NoDescriptors&) = delete;
+
+private:
+    rlimit before{};
+};
+
+/// A host that runs, of which each test asks for the first time.
+class ChangingFacts : public test::NamespaceTest {
+protected:
+    void SetUp() override {
+        NamespaceTest::SetUp();
+        if (IsSkipped()) return;
+        test::provider();
+        for (const char* folder : {"/run", "/etc", "/sys/devices/system"}) covered.emplace_back(folder);
+        test::nameHost("node7");
+    }
+
+    static void scheduleShutdown() { write("/run/systemd/shutdown/scheduled", "USEC=1\nMODE=reboot\n"); }
+    static void countMemoryErrors(const char* count) { write("/sys/devices/system/edac/mc/mc0/ue_count", count); }
+
+    static void useZone(const char* zone) {
+        std::filesystem::remove("/etc/localtime");
+        std::filesystem::create_symlink(std::string("/usr/share/zoneinfo/") + zone, "/etc/localtime");
+    }
+
+    /// Runs in a process of its own, whose first request is its first; empty where nothing failed.
+    static void inOwnProcess(const std::function<void()>& run) {
+        EXPECT_EQ(support::inChild([&] {
+                      run();
+                      return std::string();
+                  }),
+                  "");
+    }
+
+private:
+    std::list<test::CoveredFolder> covered;
+};
+
+TEST_F(ChangingFacts, PowerStateAndMemoryErrorsShowWithinASecond) {
+    inOwnProcess([] {
+        countMemoryErrors("0\n");
+        EXPECT_EQ(enabledState(), 2U);
+        EXPECT_EQ(healthState(), 0U);
+        scheduleShutdown();
+        countMemoryErrors("3\n");
+        coarseMilliseconds += 999;
+        EXPECT_EQ(enabledState(), 2U) << "nothing is read within the second";
+        EXPECT_EQ(healthState(), 0U);
+        coarseMilliseconds += 1;
+        EXPECT_EQ(enabledState(), 4U);
+        EXPECT_EQ(healthState(), 10U);
+        std::filesystem::remove("/run/systemd/shutdown/scheduled");
+        countMemoryErrors("0\n");
+        coarseMilliseconds += 1000;
+        EXPECT_EQ(enabledState(), 2U);
+        EXPECT_EQ(healthState(), 0U);
+    });
+}
+
+TEST_F(ChangingFacts, NameAndZoneShowAtOnce) {
+    inOwnProcess([] {
+        EXPECT_EQ(name(), "node7");
+        test::nameHost("node8");
+        EXPECT_EQ(name(), "node8");
+        const auto daylightSaving = [] { return numberOf("VESKA_TimeService", "AutomaticDSTAdjustment"); };
+        EXPECT_EQ(daylightSaving(), 0U) << "without /etc/localtime it is UTC";
+        for (int i = 0; i < 20; ++i) {
+            useZone("Europe/Berlin");
+            EXPECT_EQ(daylightSaving(), 1U);
+            useZone("Asia/Kolkata");
+            EXPECT_EQ(daylightSaving(), 0U);
+        }
+    });
+}
+
+TEST_F(ChangingFacts, ShowInAForkAsInItsParent) {
+    inOwnProcess([] {
+        EXPECT_EQ(enabledState(), 2U);
+        scheduleShutdown();
+        coarseMilliseconds += 1000;
+        inOwnProcess([] { EXPECT_EQ(enabledState(), 4U); });
+        EXPECT_EQ(enabledState(), 4U);
+    });
+}
+
+TEST_F(ChangingFacts, StayWhereDescriptorsRunOutAndShowAfterwards) {
+    inOwnProcess([] {
+        countMemoryErrors("1\n");
+        useZone("Europe/Berlin");
+        EXPECT_EQ(healthState(), 10U);
+        EXPECT_EQ(numberOf("VESKA_TimeService", "AutomaticDSTAdjustment"), 1U);
+        countMemoryErrors("0\n");
+        useZone("Asia/Kolkata");
+        coarseMilliseconds += 1000;
+        {
+            const NoDescriptors none;
+            EXPECT_EQ(name(), "node7");
+            EXPECT_EQ(healthState(), 10U);
+            EXPECT_EQ(numberOf("VESKA_TimeService", "AutomaticDSTAdjustment"), 1U);
+        }
+        EXPECT_EQ(healthState(), 0U);
+        EXPECT_EQ(numberOf("VESKA_TimeService", "AutomaticDSTAdjustment"), 0U);
+    });
+}
+
+TEST_F(ChangingFacts, AreAllThereAfterAFirstRequestWithoutDescriptors) {
+    inOwnProcess([] {
+        write("/etc/machine-info", "PRIMARY_OWNER_NAME=Operations\n");
+        {
+            const NoDescriptors none;
+            EXPECT_THAT(test::instances(computer).results, IsEmpty());
+            EXPECT_EQ(test::instances(computer).code, CMPI_RC_OK);
+        }
+        const std::vector<om::Instance> found = test::instancesOf(test::instances(computer));
+        ASSERT_THAT(found, SizeIs(1));
+        const om::Value* const owner = test::find(found[0].properties, "PrimaryOwnerName");
+        ASSERT_NE(owner, nullptr);
+        EXPECT_EQ(test::text(*owner), "Operations");
+    });
+}
+
+} // namespace
