@@ -43,11 +43,22 @@ void Cursor::filterByPath(const std::string& path) {
     filtered = true;
 }
 
-std::optional<Value> Cursor::read(unsigned int property) const {
-    if (current == nullptr) return std::nullopt;
-    if (property != NodeLexicon::NameProperty) return host.read(*current, property);
+const Value* Cursor::find(unsigned int property, std::optional<Value>& changing) const {
+    if (current == nullptr) return nullptr;
+    if (const auto fixed = current->properties.find(property); fixed != current->properties.end())
+        return &fixed->second;
+    if (property != NodeLexicon::NameProperty) {
+        changing = host.read(*current, property);
+        return changing ? &*changing : nullptr;
+    }
     if (!knownName) knownName = host.read(*current, property);
-    return *knownName;
+    return *knownName ? &**knownName : nullptr;
+}
+
+std::optional<Value> Cursor::read(unsigned int property) const {
+    std::optional<Value> changing;
+    const Value* const found = find(property, changing);
+    return found != nullptr ? std::optional<Value>(*found) : std::nullopt;
 }
 
 bool Cursor::write(unsigned int property, const Value& value) {

@@ -31,9 +31,10 @@ public:
     /// Hands out a property that is of the kind asked for.
     template <typename T>
     bool read(unsigned int property, T& value) const {
-        std::optional<Value> found = read(property);
-        T* const content = found ? std::get_if<T>(&*found) : nullptr;
-        if (content != nullptr) value = std::move(*content);
+        std::optional<Value> changing;
+        const Value* const found = find(property, changing);
+        const T* const content = found != nullptr ? std::get_if<T>(found) : nullptr;
+        if (content != nullptr) value = *content;
         return content != nullptr;
     }
     bool write(unsigned int property, const Value& value);
@@ -42,6 +43,8 @@ public:
 
 private:
     void standOn(const Node* node);
+    /// A property, or null; `changing` holds one that may change at any time.
+    const Value* find(unsigned int property, std::optional<Value>& changing) const;
 
     NodeSource& host;
     std::shared_ptr<const NodeTree> tree;

@@ -11,6 +11,7 @@ namespace {
 
 using namespace std::string_literals;
 using testing::ElementsAre;
+using testing::IsEmpty;
 using VK::BaseServerProvider::ComputerSystem;
 using Filter = ComputerSystem::FilterType;
 using Texts = std::vector<std::string>;
@@ -220,6 +221,34 @@ TEST(ComputerSystem, LeavesTheOutputOfWhatTheHostCannotSupply) {
                               &ComputerSystem::getOtherDedicatedDescriptions})
         expectUntouched(system, getter, Texts{"before"});
     expectUntouched(system, &ComputerSystem::getAvailableRequestedStates, Numbers{77});
+}
+
+TEST(ComputerSystem, MakesNoIdentifyingTextsForAnInstanceWithoutAChassisAndHandsThemToADirectCaller) {
+    test::simulate({test::computer(0, "node7")});
+    const ComputerSystem system;
+    Texts texts = {"before"};
+    EXPECT_FALSE(system.supplyOtherIdentifyingInfo(texts));
+    EXPECT_THAT(texts, IsEmpty());
+    EXPECT_FALSE(system.supplyIdentifyingDescriptions(texts));
+    EXPECT_THAT(texts, IsEmpty());
+    EXPECT_FALSE(system.getOtherIdentifyingInfo(texts));
+    EXPECT_THAT(texts, testing::SizeIs(6 - 2)) << "all but those of a chassis";
+}
+
+TEST(ComputerSystem, IdentifiesEachComputerItStandsOnByItsOwnTexts) {
+    test::simulate({test::computer(0, "node7"), test::computer(1, "node8"), test::chassis(0, 0, "CZ1")});
+    ComputerSystem system;
+    const auto uuid = [&system] {
+        Texts texts;
+        return system.getOtherIdentifyingInfo(texts) ? texts.at(0) : "no chassis";
+    };
+    EXPECT_EQ(uuid(), "4c4c4544-0043-3010-8052-000000000000");
+    ++system;
+    EXPECT_EQ(uuid(), "4c4c4544-0043-3010-8052-000000000001");
+    system.initialize();
+    EXPECT_EQ(uuid(), "4c4c4544-0043-3010-8052-000000000000");
+    system.setFilter(Filter::Name, "node8");
+    EXPECT_EQ(uuid(), "4c4c4544-0043-3010-8052-000000000001");
 }
 
 } // namespace

@@ -101,12 +101,12 @@ TEST_F(CursorTest, SeesWhatItWroteAndGoesOnFromThere) {
     EXPECT_THAT(rest(), ElementsAre("/b", "/c"));
 }
 
-/// Tells another status at each look.
+/// Tells another status at each look, and another name of a node whose name is not in the file.
 class AgeingHost : public NodeSource {
 public:
     explicit AgeingHost(SimulatedHost& theNodes) : nodes(theNodes) {}
     std::shared_ptr<const NodeTree> tree() override { return nodes.tree(); }
-    std::optional<Value> read(const Node& node, unsigned int property) override { return nodes.read(node, property); }
+    std::optional<Value> read(const Node&, unsigned int) override { return Value("name " + std::to_string(++looks)); }
     bool write(const Node&, unsigned int, const Value&) override { return true; }
     std::optional<bool> isReadOnly(const Node&, unsigned int) override { return std::nullopt; }
     unsigned int status(const Node&) override { return ++looks; }
@@ -115,6 +115,20 @@ private:
     SimulatedHost& nodes;
     unsigned int looks = 0;
 };
+
+TEST_F(CursorTest, LooksAtAChangingNameOnceUntilItMovesOrWritesAndAtAllElseEachTime) {
+    AgeingHost ageing(host);
+    Cursor place(ageing);
+    place.selectPath("/c");
+    EXPECT_EQ(place.read(108), Value("name 1"));
+    EXPECT_EQ(place.read(108), Value("name 1"));
+    EXPECT_EQ(place.read(126), Value("name 2"));
+    EXPECT_EQ(place.read(126), Value("name 3"));
+    EXPECT_TRUE(place.write(108, Value("other")));
+    EXPECT_EQ(place.read(108), Value("name 4"));
+    place.selectPath("/c");
+    EXPECT_EQ(place.read(108), Value("name 5"));
+}
 
 TEST_F(CursorTest, LooksAtTheStatusOnceUntilItMovesOrWrites) {
     AgeingHost ageing(host);
