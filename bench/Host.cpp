@@ -44,14 +44,14 @@ Host::Host(bool isLiveHost) : live(isLiveHost) {
     setenv("NVLOG_SINK", "none", 1);
     if (live) return;
     std::string pattern = (fs::temp_directory_path() / "provider-bench-XXXXXX").string();
-    if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("cannot make a folder for the simulated host");
-    folder = pattern;
-    setenv("VK_INSTRUMENTATION_TREE", (folder / "tree.json").c_str(), 1);
+    if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("cannot make a directory for the simulated host");
+    directory = pattern;
+    setenv("VK_INSTRUMENTATION_TREE", (directory / "tree.json").c_str(), 1);
 }
 
 Host::~Host() {
     std::error_code ignored;
-    if (!live) fs::remove_all(folder, ignored);
+    if (!live) fs::remove_all(directory, ignored);
 }
 
 void Host::use(int computers) {
@@ -63,8 +63,8 @@ void Host::use(int computers) {
     }
     const nlohmann::json tree = {{"product", {{"architecture", "x86_64"}, {"uid", "uid-1"}, {"kvm", false}}},
                                  {"nodes", nodes}};
-    std::ofstream(folder / "tree.json.new") << tree.dump();
-    fs::rename(folder / "tree.json.new", folder / "tree.json");
+    std::ofstream(directory / "tree.json.new") << tree.dump();
+    fs::rename(directory / "tree.json.new", directory / "tree.json");
     present = computers;
 }
 

@@ -19,7 +19,7 @@ public:
 
 private:
     const bool live;
-    std::filesystem::path folder;
+    std::filesystem::path directory;
     int present = 0;
 };
 

@@ -1,6 +1,6 @@
 # What every target of ours is compiled with. Targets link vk_settings; the CMPI headers come from vk_cmpi.
 
-set(CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/platform/include/cmpi" CACHE PATH "Folder that holds cmpidt.h, cmpift.h and cmpimacs.h")
+set(CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/platform/include/cmpi" CACHE PATH "Directory that holds cmpidt.h, cmpift.h and cmpimacs.h")
 set(VK_SANITIZE "" CACHE STRING "Sanitizers to build with, as -fsanitize takes them")
 option(VK_FUZZ "Build the fuzz targets (clang only)" OFF)
 option(VK_COVERAGE "Build for coverage" OFF)

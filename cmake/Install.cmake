@@ -2,9 +2,9 @@
 
 set(runtime_libraries vknabaseserverprofileprovider nvlog vkcommon vkproduct vkinstrumentation vkproviderutilities)
 
-# An object manager may load the provider through a link in a folder of its own, and $ORIGIN is that folder then; so the
-# installed libraries name their own folder as well. Which one that is becomes known when installing (--prefix): room for
-# it is kept in the built libraries by a long name of the same place. In the system's own folder none is needed.
+# An object manager may load the provider through a link in a directory of its own, and $ORIGIN is that directory then; so the
+# installed libraries name their own directory as well. Which one that is becomes known when installing (--prefix): room for
+# it is kept in the built libraries by a long name of the same place. In the system's own directory none is needed.
 # It is built with the path to be installed, since CMake would end a path that it changes when installing with an empty
 # element, and that stands for the directory a process is started in.
 string(REPEAT "/." 200 room)
@@ -25,11 +25,11 @@ install(TARGETS ${runtime_libraries}
 foreach(library IN LISTS runtime_libraries)
     install(CODE "
         set(library \"\$ENV{DESTDIR}\${CMAKE_INSTALL_PREFIX}/${CMAKE_INSTALL_LIBDIR}/lib${library}.so.1\")
-        set(folder \"\${CMAKE_INSTALL_PREFIX}/${CMAKE_INSTALL_LIBDIR}\")
-        if(folder MATCHES \"^/usr/lib(64|/[^/]*-linux-[^/]*)?\$\")
+        set(directory \"\${CMAKE_INSTALL_PREFIX}/${CMAKE_INSTALL_LIBDIR}\")
+        if(directory MATCHES \"^/usr/lib(64|/[^/]*-linux-[^/]*)?\$\")
             file(RPATH_REMOVE FILE \"\${library}\")
         else()
-            file(RPATH_SET FILE \"\${library}\" NEW_RPATH \"\\\$ORIGIN:\${folder}\")
+            file(RPATH_SET FILE \"\${library}\" NEW_RPATH \"\\\$ORIGIN:\${directory}\")
         endif()" COMPONENT provider)
 endforeach()
 install(CODE "
@@ -48,7 +48,7 @@ install(DIRECTORY platform/include/cmpi
 install(FILES ${VK_SCHEMA_DIR}/vk-baseserver.mof ${VK_SCHEMA_DIR}/vk-baseserver-registration.mof
     ${VK_SCHEMA_DIR}/vk-baseserver.reg DESTINATION ${VK_SHARE_DIR} COMPONENT provider)
 
-# Programs and texts with this build's names and folders in them.
+# Programs and texts with this build's names and directories in them.
 function(vk_configured file destination component kind)
     get_filename_component(name ${file} NAME_WLE)
     configure_file(${file} ${CMAKE_BINARY_DIR}/installed/${name} @ONLY)

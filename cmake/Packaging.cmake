@@ -30,13 +30,13 @@ if(VK_PACKAGING)
     configure_file(packaging/debian/changelog.in ${CMAKE_BINARY_DIR}/packaging/changelog @ONLY)
     foreach(part IN ITEMS provider tools development)
         string(REPLACE development dev name vk-baseserver-${part})
-        set(folder ${CMAKE_INSTALL_DATADIR}/doc/${name})
-        install(FILES packaging/debian/copyright DESTINATION ${folder} COMPONENT ${part})
-        install(FILES ${CMAKE_BINARY_DIR}/packaging/changelog DESTINATION ${folder} COMPONENT ${part})
+        set(directory ${CMAKE_INSTALL_DATADIR}/doc/${name})
+        install(FILES packaging/debian/copyright DESTINATION ${directory} COMPONENT ${part})
+        install(FILES ${CMAKE_BINARY_DIR}/packaging/changelog DESTINATION ${directory} COMPONENT ${part})
         install(CODE "
             set(stage \"\$ENV{DESTDIR}\${CMAKE_INSTALL_PREFIX}\")
             file(GLOB pages \"\${stage}/${CMAKE_INSTALL_MANDIR}/man*/*.[1-8]\")
-            execute_process(COMMAND gzip -9nf \${pages} \"\${stage}/${folder}/changelog\" COMMAND_ERROR_IS_FATAL ANY)"
+            execute_process(COMMAND gzip -9nf \${pages} \"\${stage}/${directory}/changelog\" COMMAND_ERROR_IS_FATAL ANY)"
             COMPONENT ${part})
     endforeach()
 endif()

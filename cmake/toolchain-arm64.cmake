@@ -6,7 +6,7 @@ set(CMAKE_C_COMPILER aarch64-linux-gnu-gcc)
 set(CMAKE_CXX_COMPILER aarch64-linux-gnu-g++)
 set(CMAKE_LIBRARY_ARCHITECTURE aarch64-linux-gnu)
 
-set(VK_ARM64_SYSROOT "" CACHE PATH "Folder with usr/include and usr/lib/aarch64-linux-gnu of the libraries")
+set(VK_ARM64_SYSROOT "" CACHE PATH "Directory with usr/include and usr/lib/aarch64-linux-gnu of the libraries")
 list(APPEND CMAKE_TRY_COMPILE_PLATFORM_VARIABLES VK_ARM64_SYSROOT)
 set(CMAKE_FIND_ROOT_PATH ${VK_ARM64_SYSROOT} /usr/aarch64-linux-gnu)
 set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)

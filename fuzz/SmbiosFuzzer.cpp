@@ -35,7 +35,7 @@ auto allOf(const SmbiosChassis& chassis) {
 }
 
 bool isClean(const std::string& text) {
-    return text.size() <= LONGEST_TEXT && trimmed(text) == text &&
+    return text.size() <= longestText && trimmed(text) == text &&
            std::all_of(text.begin(), text.end(), [](char c) { return c >= ' ' && c <= '~'; });
 }
 

@@ -44,12 +44,12 @@ install_packages() {
 # build_tree PRESET FOLDER [TARGET...]: configures once and builds all, or the targets; the output goes to
 # FOLDER/build.log.
 build_tree() {
-    local preset=$1 folder=$2
+    local preset=$1 directory=$2
     shift 2
-    local log="$PWD/$folder/build.log"
-    mkdir -p "$folder"
-    if ! { { [ -f "$folder/build.ninja" ] || cmake --preset "$preset"; } &&
-        cmake --build "$folder" ${1:+--target "$@"}; } >"$log" 2>&1 </dev/null; then
+    local log="$PWD/$directory/build.log"
+    mkdir -p "$directory"
+    if ! { { [ -f "$directory/build.ninja" ] || cmake --preset "$preset"; } &&
+        cmake --build "$directory" ${1:+--target "$@"}; } >"$log" 2>&1 </dev/null; then
         grep -E 'error|Error|FAILED' "$log" | head -n 15 >&2
         die "building the $preset tree failed; the whole output is in $log"
     fi

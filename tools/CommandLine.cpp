@@ -21,7 +21,7 @@ std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, O
 
 int refuse(const CLI::App& app, const std::string& problem, Output output) {
     output.error << app.get_name() << ": " << problem << "\nTry '" << app.get_name() << " --help'.\n";
-    return UNUSABLE_ARGUMENTS;
+    return unusableArguments;
 }
 
 } // namespace tools

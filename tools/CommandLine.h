@@ -15,7 +15,7 @@ struct Output {
     std::ostream& error;
 };
 
-constexpr int UNUSABLE_ARGUMENTS = 2;
+constexpr int unusableArguments = 2;
 
 /// The options that every program has.
 void addCommonOptions(CLI::App& app);

@@ -58,7 +58,7 @@ public:
 
 private:
     std::string library() const {
-        return arguments.library.empty() ? defaultLibrary(programFolder()) : libraryPath(arguments.library);
+        return arguments.library.empty() ? defaultLibrary(programDirectory()) : libraryPath(arguments.library);
     }
 
     // In both, the provider has cleaned up and is unloaded before anything is printed.

@@ -68,47 +68,47 @@ int fill(int fd, const std::string& bytes, const FileOwner& owner) {
     return fsync(fd) == 0 ? 0 : errno;
 }
 
-int putInPlace(int folder, const std::string& from, const std::string& to) {
-    if (renameat(folder, from.c_str(), folder, to.c_str()) != 0) return errno;
-    // The rename is done: a folder that cannot be synchronised does not undo it.
-    fsync(folder);
+int putInPlace(int directory, const std::string& from, const std::string& to) {
+    if (renameat(directory, from.c_str(), directory, to.c_str()) != 0) return errno;
+    // The rename is done: a directory that cannot be synchronised does not undo it.
+    fsync(directory);
     return 0;
 }
 
 /// Has what replaces `name` made beside it, under a name that is handed over, and puts it in place.
 template <class Make>
-int replace(int folder, const std::string& name, const Make& make) {
+int replace(int directory, const std::string& name, const Make& make) {
     const std::string fresh = besides(name);
-    if (unlinkat(folder, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
+    if (unlinkat(directory, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
     int error = make(fresh.c_str());
-    if (error == 0) error = putInPlace(folder, fresh, name);
+    if (error == 0) error = putInPlace(directory, fresh, name);
     // It is still there after a failure, and when it was the file in place already: renaming does nothing then.
-    unlinkat(folder, fresh.c_str(), 0);
+    unlinkat(directory, fresh.c_str(), 0);
     return error;
 }
 
 } // namespace
 
-int replaceFile(int folder, const std::string& name, const std::string& bytes, const FileOwner& owner) {
-    return replace(folder, name, [&](const char* fresh) {
-        const FileDescriptor fd(openat(folder, fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
+int replaceFile(int directory, const std::string& name, const std::string& bytes, const FileOwner& owner) {
+    return replace(directory, name, [&](const char* fresh) {
+        const FileDescriptor fd(openat(directory, fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC, 0600));
         return fd ? fill(fd.get(), bytes, owner) : errno;
     });
 }
 
-int replaceLink(int folder, const std::string& name, const std::string& target) {
-    return replace(folder, name,
-                   [&](const char* fresh) { return symlinkat(target.c_str(), folder, fresh) == 0 ? 0 : errno; });
+int replaceLink(int directory, const std::string& name, const std::string& target) {
+    return replace(directory, name,
+                   [&](const char* fresh) { return symlinkat(target.c_str(), directory, fresh) == 0 ? 0 : errno; });
 }
 
-int replaceByLinking(int folder, const std::string& name, int from) {
-    return replace(folder, name,
-                   [&](const char* fresh) { return linkat(from, name.c_str(), folder, fresh, 0) == 0 ? 0 : errno; });
+int replaceByLinking(int directory, const std::string& name, int from) {
+    return replace(directory, name,
+                   [&](const char* fresh) { return linkat(from, name.c_str(), directory, fresh, 0) == 0 ? 0 : errno; });
 }
 
-int removeFile(int folder, const std::string& name) {
-    if (unlinkat(folder, name.c_str(), 0) != 0) return errno == ENOENT ? 0 : errno;
-    fsync(folder);
+int removeFile(int directory, const std::string& name) {
+    if (unlinkat(directory, name.c_str(), 0) != 0) return errno == ENOENT ? 0 : errno;
+    fsync(directory);
     return 0;
 }
 

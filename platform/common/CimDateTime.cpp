@@ -9,9 +9,9 @@ namespace VK {
 
 namespace {
 
-constexpr std::size_t LENGTH = 25;
-constexpr std::size_t FRACTION = 15;
-constexpr std::size_t SIGN = 21;
+constexpr std::size_t wholeLength = 25;
+constexpr std::size_t fractionAt = 15;
+constexpr std::size_t signAt = 21;
 
 /// Digits only, as many as asked for.
 bool number(std::string_view text, std::size_t begin, std::size_t length, int& value) {
@@ -33,19 +33,19 @@ bool fraction(std::string_view text, int& value) {
 } // namespace
 
 std::optional<Instant> parseCimDateTime(std::string_view text) {
-    if (text.size() != LENGTH || text[FRACTION - 1] != '.' || (text[SIGN] != '+' && text[SIGN] != '-'))
+    if (text.size() != wholeLength || text[fractionAt - 1] != '.' || (text[signAt] != '+' && text[signAt] != '-'))
         return std::nullopt;
     int year = 0, month = 0, day = 0, hour = 0, minute = 0, second = 0, microsecond = 0, offset = 0;
     const bool digits = number(text, 0, 4, year) && number(text, 4, 2, month) && number(text, 6, 2, day) &&
                         number(text, 8, 2, hour) && number(text, 10, 2, minute) && number(text, 12, 2, second) &&
-                        fraction(text.substr(FRACTION, 6), microsecond) && number(text, SIGN + 1, 3, offset);
+                        fraction(text.substr(fractionAt, 6), microsecond) && number(text, signAt + 1, 3, offset);
     if (!digits || hour > 23 || minute > 59 || second > 59) return std::nullopt;
     const std::chrono::year_month_day date{std::chrono::year{year}, std::chrono::month{static_cast<unsigned>(month)},
                                            std::chrono::day{static_cast<unsigned>(day)}};
     if (!date.ok()) return std::nullopt;
     const std::int64_t days = std::chrono::sys_days{date}.time_since_epoch().count();
     const std::int64_t local = days * 86400 + hour * 3600 + minute * 60 + second;
-    return Instant{local - (text[SIGN] == '-' ? -offset : offset) * 60, microsecond};
+    return Instant{local - (text[signAt] == '-' ? -offset : offset) * 60, microsecond};
 }
 
 std::string formatCimDateTime(Instant instant, int offsetMinutes) {

@@ -11,7 +11,7 @@ namespace VK {
 
 namespace {
 
-constexpr unsigned int MAX_LINKS = 40; // as the kernel has it
+constexpr unsigned int maxLinks = 40; // as the kernel has it
 
 } // namespace
 
@@ -28,7 +28,7 @@ void RootWalk::defer(const std::string& path) {
 }
 
 int RootWalk::follow(const FileDescriptor& link) {
-    if (followed.size() > MAX_LINKS) return ELOOP;
+    if (followed.size() > maxLinks) return ELOOP;
     std::array<char, PATH_MAX> target{};
     const ssize_t length = readlinkat(link.get(), "", target.data(), target.size());
     if (length < 0) return errno;

@@ -28,10 +28,10 @@ std::size_t utf8Length(std::string_view text) {
 } // namespace
 
 std::string_view trimmed(std::string_view text) {
-    constexpr std::string_view BLANKS = " \t\r\n\v\f\0"sv;
-    const std::size_t begin = text.find_first_not_of(BLANKS);
+    constexpr std::string_view blanks = " \t\r\n\v\f\0"sv;
+    const std::size_t begin = text.find_first_not_of(blanks);
     if (begin == std::string_view::npos) return {};
-    return text.substr(begin, text.find_last_not_of(BLANKS) - begin + 1);
+    return text.substr(begin, text.find_last_not_of(blanks) - begin + 1);
 }
 
 std::string printable(std::string_view text) {
@@ -42,7 +42,7 @@ std::string printable(std::string_view text) {
 }
 
 std::string cleanText(std::string_view text) {
-    return printable(trimmed(trimmed(text).substr(0, LONGEST_TEXT)));
+    return printable(trimmed(trimmed(text).substr(0, longestText)));
 }
 
 std::string cleanWrittenText(std::string_view text) {
@@ -52,7 +52,7 @@ std::string cleanWrittenText(std::string_view text) {
     while (!text.empty()) {
         const std::size_t length = utf8Length(text);
         if (length == 0) return cleanText(whole);
-        if (result.size() + length > LONGEST_TEXT) break;
+        if (result.size() + length > longestText) break;
         result += length == 1 && isControl(static_cast<unsigned char>(text.front())) ? "."sv : text.substr(0, length);
         text.remove_prefix(length);
     }
@@ -78,9 +78,9 @@ std::string_view takeLine(std::string_view& text) {
 }
 
 std::string inQuotes(const std::string& text) {
-    constexpr std::size_t LONGEST = 64;
-    const bool cut = text.size() > LONGEST;
-    return "\"" + printable(text.substr(0, LONGEST)) + (cut ? "…\"" : "\"");
+    constexpr std::size_t longest = 64;
+    const bool cut = text.size() > longest;
+    return "\"" + printable(text.substr(0, longest)) + (cut ? "…\"" : "\"");
 }
 
 } // namespace VK

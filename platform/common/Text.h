@@ -7,7 +7,7 @@
 namespace VK {
 
 /// The longest text that a property carries, in bytes.
-constexpr std::size_t LONGEST_TEXT = 256;
+constexpr std::size_t longestText = 256;
 
 /// Without blanks, tabs, line ends and NULs at both ends.
 std::string_view trimmed(std::string_view text);

@@ -4,7 +4,7 @@ namespace VK::Host {
 
 namespace {
 
-constexpr const char* NAMES[] = {
+constexpr const char* names[] = {
     nullptr,
     "Other",
     "Unknown",
@@ -44,7 +44,7 @@ constexpr const char* NAMES[] = {
     "Stick PC",
 };
 
-static_assert(sizeof NAMES / sizeof *NAMES == LAST_CHASSIS_TYPE + 1);
+static_assert(sizeof names / sizeof *names == lastChassisType + 1);
 
 bool isBetween(ChassisType type, ChassisType first, ChassisType last) {
     return first <= type && type <= last;
@@ -53,11 +53,11 @@ bool isBetween(ChassisType type, ChassisType first, ChassisType last) {
 } // namespace
 
 std::string chassisTypeName(ChassisType type) {
-    return NAMES[isBetween(type, 1, LAST_CHASSIS_TYPE) ? type : UNKNOWN_CHASSIS];
+    return names[isBetween(type, 1, lastChassisType) ? type : unknownChassis];
 }
 
 unsigned int packageType(ChassisType type) {
-    if (!isBetween(type, 1, LAST_CHASSIS_TYPE) || type == UNKNOWN_CHASSIS) return 0;
+    if (!isBetween(type, 1, lastChassisType) || type == unknownChassis) return 0;
     if (type == 23) return 2;
     if (type == 28) return 3;
     return isBetween(type, 3, 7) || isBetween(type, 17, 22) || isBetween(type, 24, 27) || type == 29 ? 1 : 4;
@@ -68,11 +68,11 @@ ChassisType chassisTypeFromWord(std::string_view word) {
         std::string_view word;
         ChassisType type;
     };
-    static constexpr Known KNOWN[] = {
+    static constexpr Known descriptions[] = {
         {"desktop", 3}, {"laptop", 9},       {"handset", 11},  {"watch", 11}, {"server", 17},
         {"tablet", 30}, {"convertible", 31}, {"embedded", 34}, {"vm", 1},     {"container", 1},
     };
-    for (const Known& known : KNOWN)
+    for (const Known& known : descriptions)
         if (known.word == word) return known.type;
     return 0;
 }

@@ -8,8 +8,8 @@ namespace VK::Host {
 /// A chassis' type as SMBIOS numbers it: 1 other, 2 unknown, 3 desktop, … ; 0 and numbers above 36 stand for
 /// nothing.
 using ChassisType = unsigned int;
-constexpr ChassisType UNKNOWN_CHASSIS = 2;
-constexpr ChassisType LAST_CHASSIS_TYPE = 36;
+constexpr ChassisType unknownChassis = 2;
+constexpr ChassisType lastChassisType = 36;
 
 /// The type's name in SMBIOS's words, `Rack Mount Chassis`; `Unknown` for numbers that stand for nothing.
 std::string chassisTypeName(ChassisType type);

@@ -10,7 +10,7 @@ namespace VK::Host {
 
 namespace {
 
-const std::string MACHINE_INFO = "/etc/machine-info";
+const std::string machineInfo = "/etc/machine-info";
 
 Fact damaged(const std::string& file, const std::string& problem) {
     Fact fact = missing(file, EBADMSG);
@@ -20,7 +20,7 @@ Fact damaged(const std::string& file, const std::string& problem) {
 
 /// Only the directory's absence says that the firmware provides no tables.
 Fact unreadable(const Root& root, const std::string& file, int error) {
-    if (error == ENOENT && !root.exists(TABLES)) return missing(TABLES, ENOENT);
+    if (error == ENOENT && !root.exists(tablesDirectory)) return missing(tablesDirectory, ENOENT);
     Fact fact = missing(file, error);
     if (error == ENOENT) fact.problem = "is missing";
     return fact;
@@ -29,56 +29,56 @@ Fact unreadable(const Root& root, const std::string& file, int error) {
 } // namespace
 
 MachineInfo::MachineInfo(const Root& root) {
-    const Root::Contents contents = root.read(MACHINE_INFO);
+    const Root::Contents contents = root.read(machineInfo);
     error = contents.error;
     values = parseAssignments(contents.text);
 }
 
 Fact MachineInfo::operator[](const char* key) const {
     const auto found = values.find(key);
-    if (found == values.end()) return missing(MACHINE_INFO, error != 0 ? error : ENOENT);
-    Fact fact = missing(MACHINE_INFO, ENOENT);
+    if (found == values.end()) return missing(machineInfo, error != 0 ? error : ENOENT);
+    Fact fact = missing(machineInfo, ENOENT);
     fact.text = cleanWrittenText(found->second);
     return fact;
 }
 
 Tables::Tables(const Root& root) {
     // Both at once: a root that keeps a record is to know both.
-    const Root::Contents entryPoint = root.read(ENTRY_POINT);
-    const Root::Contents table = root.read(TABLE);
+    const Root::Contents entryPoint = root.read(entryPointFile);
+    const Root::Contents table = root.read(tableFile);
     if (!entryPoint) {
-        none = unreadable(root, ENTRY_POINT, entryPoint.error);
+        none = unreadable(root, entryPointFile, entryPoint.error);
         return;
     }
     if (!table) {
-        none = unreadable(root, TABLE, table.error);
+        none = unreadable(root, tableFile, table.error);
         return;
     }
     smbios = parseSmbios(entryPoint.text, table.text);
-    if (!smbios.entryPointProblem.empty()) none = damaged(ENTRY_POINT, smbios.entryPointProblem);
+    if (!smbios.entryPointProblem.empty()) none = damaged(entryPointFile, smbios.entryPointProblem);
 }
 
 Fact Tables::withoutStructure() const {
     if (none.error != 0) return none;
-    return smbios.breakOff.empty() ? missing(TABLE, ENOENT) : damaged(TABLE, smbios.breakOff);
+    return smbios.breakOff.empty() ? missing(tableFile, ENOENT) : damaged(tableFile, smbios.breakOff);
 }
 
 Fact Tables::system(std::string SmbiosSystem::*text, FirmwareText kind) const {
-    return smbios.system ? told(TABLE, (*smbios.system).*text, kind) : withoutStructure();
+    return smbios.system ? told(tableFile, (*smbios.system).*text, kind) : withoutStructure();
 }
 
 Fact Tables::baseBoard(std::string SmbiosBaseBoard::*text, FirmwareText kind) const {
-    return smbios.baseBoard ? told(TABLE, (*smbios.baseBoard).*text, kind) : withoutStructure();
+    return smbios.baseBoard ? told(tableFile, (*smbios.baseBoard).*text, kind) : withoutStructure();
 }
 
 Fact Tables::chassis(const std::string& text, FirmwareText kind) {
-    return told(TABLE, text, kind);
+    return told(tableFile, text, kind);
 }
 
 std::vector<std::string> Tables::problems() const {
-    if (!smbios.entryPointProblem.empty()) return {ENTRY_POINT + ": " + smbios.entryPointProblem};
+    if (!smbios.entryPointProblem.empty()) return {entryPointFile + ": " + smbios.entryPointProblem};
     std::vector<std::string> problems;
-    for (const std::string& problem : smbios.problems) problems.push_back(TABLE + ": " + problem);
+    for (const std::string& problem : smbios.problems) problems.push_back(tableFile + ": " + problem);
     return problems;
 }
 
@@ -105,10 +105,10 @@ Fact fromXen(const Root& root) {
     return contents ? told(file, cleanText(contents.text)) : missing(file, contents.error);
 }
 
-Sysinfo::Sysinfo(const Root& root) : contents(root.read(SYSINFO)) {}
+Sysinfo::Sysinfo(const Root& root) : contents(root.read(sysinfoFile)) {}
 
 Fact Sysinfo::value(const char* key, FirmwareText kind) const {
-    return contents ? told(SYSINFO, sysinfoValue(contents.text, key), kind) : missing(SYSINFO, contents.error);
+    return contents ? told(sysinfoFile, sysinfoValue(contents.text, key), kind) : missing(sysinfoFile, contents.error);
 }
 
 Fact Sysinfo::operator[](const char* key) const {

@@ -9,10 +9,10 @@
 
 namespace VK::Host {
 
-inline const std::string TABLES = "/sys/firmware/dmi/tables";
-inline const std::string ENTRY_POINT = TABLES + "/smbios_entry_point";
-inline const std::string TABLE = TABLES + "/DMI";
-inline const std::string SYSINFO = "/proc/sysinfo";
+inline const std::string tablesDirectory = "/sys/firmware/dmi/tables";
+inline const std::string entryPointFile = tablesDirectory + "/smbios_entry_point";
+inline const std::string tableFile = tablesDirectory + "/DMI";
+inline const std::string sysinfoFile = "/proc/sysinfo";
 
 /// What an administrator wrote into /etc/machine-info; nothing of it is a placeholder.
 class MachineInfo {

@@ -20,13 +20,13 @@ bool VK::Host::isKvmGuest(const Root& root, const HardwareFacts& facts) {
 namespace VK::Host {
 
 bool processorSaysKvm() {
-    constexpr unsigned int UNDER_HYPERVISOR = 1U << 31;
-    constexpr unsigned int HYPERVISOR_LEAF = 0x40000000;
+    constexpr unsigned int underHypervisor = 1U << 31;
+    constexpr unsigned int hypervisorLeaf = 0x40000000;
     unsigned int a = 0, b = 0, c = 0, d = 0;
     // Processors without hypervisor answer for that leaf too, with something else.
-    if (__get_cpuid(1, &a, &b, &c, &d) == 0 || (c & UNDER_HYPERVISOR) == 0) return false;
+    if (__get_cpuid(1, &a, &b, &c, &d) == 0 || (c & underHypervisor) == 0) return false;
     char signature[12];
-    __cpuid(HYPERVISOR_LEAF, a, b, c, d);
+    __cpuid(hypervisorLeaf, a, b, c, d);
     std::memcpy(signature, &b, 4);
     std::memcpy(signature + 4, &c, 4);
     std::memcpy(signature + 8, &d, 4);

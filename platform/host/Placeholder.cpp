@@ -10,14 +10,14 @@ namespace VK::Host {
 
 namespace {
 
-constexpr unsigned int NOT_COUNTED = 0;
+constexpr unsigned int notCounted = 0;
 
-constexpr PlaceholderRule RULES[] = {
+constexpr PlaceholderRule rules[] = {
 #define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) {PlaceholderRule::MATCH, MACHINES, REASON, TEXTS},
 #include "host/Placeholders.inc"
 };
 
-#define FIELD_WORDS(ROLE, WORDS) constexpr std::string_view FIELD_WORDS_##ROLE = WORDS;
+#define FIELD_WORDS(role, WORDS) constexpr std::string_view FIELD_WORDS_##role = WORDS;
 #include "host/Placeholders.inc"
 
 /// A text as the rules compare it.
@@ -41,10 +41,10 @@ std::string lettersOf(std::string_view text) {
 }
 
 Compared compared(std::string_view text) {
-    constexpr std::string_view AROUND = " \t.";
+    constexpr std::string_view around = " \t.";
     const std::string_view whole = trimmed(text);
-    const std::size_t begin = std::min(whole.find_first_not_of(AROUND), whole.size());
-    const std::string_view inner = whole.substr(begin, whole.find_last_not_of(AROUND) + 1 - begin);
+    const std::size_t begin = std::min(whole.find_first_not_of(around), whole.size());
+    const std::string_view inner = whole.substr(begin, whole.find_last_not_of(around) + 1 - begin);
     std::string plain = lowerCase(inner);
     std::string letters = lettersOf(plain);
     return {std::move(plain), std::move(letters)};
@@ -90,11 +90,11 @@ bool beginsWithOneOf(std::string_view texts, std::string_view letters) {
 /// Without a number that stands directly behind a letter (SKU0). A longer one may be somebody's, and so may one that
 /// stands apart (SKU-27).
 std::string_view withoutNumber(std::string_view plain) {
-    constexpr std::size_t LONGEST = 3;
+    constexpr std::size_t longest = 3;
     while (!plain.empty() && !isLetterOrDigit(plain.back())) plain.remove_suffix(1);
     std::string_view word = plain;
     while (!word.empty() && isDigit(word.back())) word.remove_suffix(1);
-    const bool numbered = !word.empty() && isLetterOrDigit(word.back()) && plain.size() - word.size() <= LONGEST;
+    const bool numbered = !word.empty() && isLetterOrDigit(word.back()) && plain.size() - word.size() <= longest;
     return numbered ? word : plain;
 }
 
@@ -116,20 +116,20 @@ bool isCounting(std::string_view plain) {
         if (step(i) != step(1)) return false;
     if (digits == plain.size()) return true;
     // As hexadecimal digits do: 0123456789ABCDEF.
-    constexpr std::string_view LETTERS = "abcdefghijklmnopqrstuvwxyz";
+    constexpr std::string_view alphabet = "abcdefghijklmnopqrstuvwxyz";
     const char last = plain[digits - 1];
     return step(1) == 1 && (last == '9' || last == '0') &&
-           plain.substr(digits) == LETTERS.substr(0, plain.size() - digits);
+           plain.substr(digits) == alphabet.substr(0, plain.size() - digits);
 }
 
 bool isChassisTypeName(std::string_view letters) {
-    for (ChassisType type = 1; type <= LAST_CHASSIS_TYPE; ++type)
+    for (ChassisType type = 1; type <= lastChassisType; ++type)
         if (lettersOf(lowerCase(chassisTypeName(type))) == letters) return true;
     return false;
 }
 
 bool matches(const PlaceholderRule& rule, const Compared& text, FirmwareText kind) {
-    constexpr std::size_t SHORTEST_COUNTING_MODEL = 8;
+    constexpr std::size_t shortestCountingModel = 8;
     switch (rule.match) {
     case PlaceholderRule::Whole:
         return isOneOf(rule.texts, text.letters);
@@ -138,7 +138,7 @@ bool matches(const PlaceholderRule& rule, const Compared& text, FirmwareText kin
     case PlaceholderRule::FieldName:
         return isFieldName(rule.texts, lettersOf(withoutNumber(text.plain)));
     case PlaceholderRule::Counting:
-        return isCounting(text.plain) && (kind != FirmwareText::Model || text.plain.size() >= SHORTEST_COUNTING_MODEL);
+        return isCounting(text.plain) && (kind != FirmwareText::Model || text.plain.size() >= shortestCountingModel);
     case PlaceholderRule::OneCharacter:
         return text.plain.size() > 1 && text.plain.find_first_not_of(text.plain.front()) == std::string::npos;
     case PlaceholderRule::NoLetter:
@@ -153,9 +153,9 @@ bool matches(const PlaceholderRule& rule, const Compared& text, FirmwareText kin
 
 const PlaceholderRule* placeholderRule(std::string_view text, FirmwareText kind) {
     const Compared each = compared(text);
-    const auto* const rule = std::find_if(std::begin(RULES), std::end(RULES),
+    const auto* const rule = std::find_if(std::begin(rules), std::end(rules),
                                           [&](const PlaceholderRule& one) { return matches(one, each, kind); });
-    return rule != std::end(RULES) ? rule : nullptr;
+    return rule != std::end(rules) ? rule : nullptr;
 }
 
 } // namespace VK::Host

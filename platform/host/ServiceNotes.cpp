@@ -33,12 +33,12 @@ bool isNtpDaemonRunning(const Root& root) {
     });
 }
 
-std::string commandFolder(const std::string& rootDirectory, bool isKvm) {
+std::string commandDirectory(const std::string& rootDirectory, bool isKvm) {
     return isKvm ? "/usr/sbin/" : rootDirectory.substr(0, rootDirectory.find("platform")) + "vcm/bin/";
 }
 
-std::string commandNote(const std::string& folder) {
-    const std::string command = folder + "cimconfig";
+std::string commandNote(const std::string& directory) {
+    const std::string command = directory + "cimconfig";
     if (access(command.c_str(), X_OK) == 0) return {};
     return "no " + command + ": the delivery settings of the CIM server read as 0, which then means nothing";
 }

@@ -22,10 +22,10 @@ std::string timeNote(const TimeFacts& facts);
 /// question that the time service asks of `ps`.
 bool isNtpDaemonRunning(const Root& root);
 
-/// The folder of the CIM server's commands for that root directory of the product, on a KVM guest or not.
-std::string commandFolder(const std::string& rootDirectory, bool isKvm);
+/// The directory of the CIM server's commands for that root directory of the product, on a KVM guest or not.
+std::string commandDirectory(const std::string& rootDirectory, bool isKvm);
 
-/// That the folder lacks `cimconfig`, and what that means; empty when it is there.
-std::string commandNote(const std::string& folder);
+/// That the directory lacks `cimconfig`, and what that means; empty when it is there.
+std::string commandNote(const std::string& directory);
 
 } // namespace VK::Host

@@ -8,9 +8,9 @@ namespace VK::Host {
 
 namespace {
 
-constexpr unsigned int SYSTEM = 1;
-constexpr unsigned int BASE_BOARD = 2;
-constexpr unsigned int CHASSIS = 3;
+constexpr unsigned int systemType = 1;
+constexpr unsigned int baseBoardType = 2;
+constexpr unsigned int chassisStructureType = 3;
 
 /// Reads fields of one structure.
 struct Fields {
@@ -64,9 +64,9 @@ Smbios parseSmbios(std::string_view entryPoint, std::string_view table) {
     SmbiosTable structures(table.substr(0, entry.tableLength));
     while (const auto structure = structures.next()) {
         const Fields fields{*structure, badIndexes};
-        if (structure->type() == SYSTEM && !result.system) result.system = readSystem(fields, entry.version);
-        if (structure->type() == BASE_BOARD && !result.baseBoard) result.baseBoard = readBaseBoard(fields);
-        if (structure->type() == CHASSIS && seen.insert(structure->contents()).second)
+        if (structure->type() == systemType && !result.system) result.system = readSystem(fields, entry.version);
+        if (structure->type() == baseBoardType && !result.baseBoard) result.baseBoard = readBaseBoard(fields);
+        if (structure->type() == chassisStructureType && seen.insert(structure->contents()).second)
             result.chassis.push_back(readChassis(fields));
     }
     // An empty file is no table of a machine that lacks everything: some firmware fails to hand it over.

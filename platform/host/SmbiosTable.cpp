@@ -8,8 +8,8 @@ using namespace std::literals;
 
 namespace {
 
-constexpr unsigned int END_OF_TABLE = 127;
-constexpr std::size_t SHORTEST_STRUCTURE = 4;
+constexpr unsigned int endOfTable = 127;
+constexpr std::size_t shortestStructure = 4;
 
 unsigned int byteOf(std::string_view bytes, std::size_t offset) {
     return static_cast<unsigned char>(bytes[offset]);
@@ -41,27 +41,27 @@ SmbiosEntryPoint unusable(const char* why) {
 }
 
 SmbiosEntryPoint parseEntryPoint3(std::string_view bytes) {
-    constexpr std::size_t SHORTEST = 24;
-    if (bytes.size() < SHORTEST) return unusable("entry point too short");
+    constexpr std::size_t shortest = 24;
+    if (bytes.size() < shortest) return unusable("entry point too short");
     const std::size_t length = byteOf(bytes, 6);
-    if (length < SHORTEST || length > bytes.size()) return unusable("entry point states a wrong length");
+    if (length < shortest || length > bytes.size()) return unusable("entry point states a wrong length");
     if (!sumsUpToZero(bytes.substr(0, length))) return unusable("entry point's checksum is wrong");
     return {mended(byteOf(bytes, 7), byteOf(bytes, 8)), littleEndian(bytes, 12, 4), {}};
 }
 
 SmbiosEntryPoint parseLegacyEntryPoint(std::string_view bytes) {
-    constexpr std::size_t LENGTH = 15;
-    if (bytes.size() < LENGTH) return unusable("entry point too short");
-    if (!sumsUpToZero(bytes.substr(0, LENGTH))) return unusable("entry point's checksum is wrong");
+    constexpr std::size_t checkedLength = 15;
+    if (bytes.size() < checkedLength) return unusable("entry point too short");
+    if (!sumsUpToZero(bytes.substr(0, checkedLength))) return unusable("entry point's checksum is wrong");
     const unsigned int version = byteOf(bytes, 14); // a digit in each half
     return {mended(version >> 4, version & 15), littleEndian(bytes, 6, 2), {}};
 }
 
 SmbiosEntryPoint parseEntryPoint2(std::string_view bytes) {
-    constexpr std::size_t SHORTEST = 30; // some firmware counts 30, and so do kernels that show it
-    if (bytes.size() < SHORTEST) return unusable("entry point too short");
+    constexpr std::size_t shortest = 30; // some firmware counts 30, and so do kernels that show it
+    if (bytes.size() < shortest) return unusable("entry point too short");
     const std::size_t length = byteOf(bytes, 5);
-    if (length < SHORTEST || length > bytes.size()) return unusable("entry point states a wrong length");
+    if (length < shortest || length > bytes.size()) return unusable("entry point states a wrong length");
     if (!sumsUpToZero(bytes.substr(0, length))) return unusable("entry point's checksum is wrong");
     const std::string_view inner = bytes.substr(16);
     if (inner.substr(0, 5) != "_DMI_"sv) return unusable("entry point without its inner part");
@@ -109,14 +109,14 @@ std::nullopt_t SmbiosTable::stop(const char* why) {
 
 std::optional<SmbiosStructure> SmbiosTable::next() {
     if (rest.find_first_not_of('\0') == std::string_view::npos) return std::nullopt;
-    if (rest.size() < SHORTEST_STRUCTURE) return stop("structure cut off");
+    if (rest.size() < shortestStructure) return stop("structure cut off");
     const unsigned int type = byteOf(rest, 0);
     const std::size_t length = byteOf(rest, 1);
-    if (type == END_OF_TABLE) {
+    if (type == endOfTable) {
         rest = {};
         return std::nullopt;
     }
-    if (length < SHORTEST_STRUCTURE) return stop("structure shorter than 4 bytes");
+    if (length < shortestStructure) return stop("structure shorter than 4 bytes");
     if (length > rest.size()) return stop("structure cut off");
     const std::size_t end = rest.find("\0\0"sv, length);
     if (end == std::string_view::npos) return stop("structure whose strings do not end");

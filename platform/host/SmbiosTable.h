@@ -34,14 +34,14 @@ public:
 
     /// All but type and handle: what stands behind the header, and the strings.
     using Contents = std::pair<std::string_view, std::string_view>;
-    Contents contents() const { return {formatted.substr(HEADER), strings}; }
+    Contents contents() const { return {formatted.substr(header), strings}; }
 
     /// The string whose index stands at the offset, as it is there. Empty where there is no such field, its index
     /// is 0 ("not specified") or there are fewer strings; `badIndexes` counts the last kind.
     std::string_view stringAt(std::size_t offset, std::size_t& badIndexes) const;
 
 private:
-    static constexpr std::size_t HEADER = 4; ///< type, length and handle
+    static constexpr std::size_t header = 4; ///< type, length and handle
 
     std::string_view formatted;
     std::string_view strings; ///< each with its NUL

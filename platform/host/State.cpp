@@ -11,7 +11,7 @@ namespace VK::Host {
 namespace {
 
 /// The most that a host name may take; longer ones are cut here, and so is one that has no end.
-constexpr std::size_t LONGEST_NAME = 128;
+constexpr std::size_t longestName = 128;
 
 std::optional<std::string> unlessEmpty(std::string text) {
     return text.empty() ? std::nullopt : std::optional<std::string>(std::move(text));
@@ -27,8 +27,8 @@ std::uint64_t microsecondsNow() {
 
 std::optional<std::string> hostName(const Root& root) {
     if (!root.isLive()) return unlessEmpty(hostNameFromFile(root.read(hostNameFile).text));
-    std::array<char, LONGEST_NAME + 1> name{}; // the last byte stays zero, whatever is written before it
-    if (gethostname(name.data(), LONGEST_NAME) != 0) return std::nullopt;
+    std::array<char, longestName + 1> name{}; // the last byte stays zero, whatever is written before it
+    if (gethostname(name.data(), longestName) != 0) return std::nullopt;
     return unlessEmpty(name.data());
 }
 

@@ -54,7 +54,7 @@ void Line::append(int number) noexcept {
 }
 
 void Line::appendEscaped(std::string_view text) noexcept {
-    constexpr std::string_view HEX = "0123456789abcdef";
+    constexpr std::string_view hex = "0123456789abcdef";
     const auto plain = [](char c) { return static_cast<unsigned char>(c) >= 0x20 && c != '\\'; };
     while (!text.empty()) {
         const auto end = std::find_if_not(text.begin(), text.end(), plain);
@@ -72,7 +72,7 @@ void Line::appendEscaped(std::string_view text) noexcept {
         else if (c == '\\')
             append('\\');
         else
-            for (const char e : {'x', HEX[c >> 4], HEX[c & 0xF]}) append(e);
+            for (const char e : {'x', hex[c >> 4], hex[c & 0xF]}) append(e);
     }
 }
 

@@ -7,9 +7,9 @@
 
 namespace VK {
 
-constexpr int NOTICE = 3000; ///< something of the host was changed, or is kept from us
-constexpr int DETAIL = 4000; ///< the host lacks something that hosts may lack
-constexpr int FAILURE = 6000;
+constexpr int notice = 3000; ///< something of the host was changed, or is kept from us
+constexpr int detail = 4000; ///< the host lacks something that hosts may lack
+constexpr int failure = 6000;
 
 /// Writes one line under the libraries' category. Never throws, whatever logger stands behind it.
 inline void logLine(int level, const char* function, int line, const std::string& text) noexcept {

@@ -78,8 +78,8 @@ public:
 
     /// Makes it as new but for the memory it has, unless that is more than is worth keeping.
     void reset() noexcept {
-        constexpr std::size_t KEPT_CAPACITY = 16 * 1024;
-        if (collected.capacity() > KEPT_CAPACITY) std::string().swap(collected);
+        constexpr std::size_t keptCapacity = 16 * 1024;
+        if (collected.capacity() > keptCapacity) std::string().swap(collected);
         collected.clear();
         handedOut = false;
         if (streamIsUsed) stream->reset(); // costs as much as a line does without it

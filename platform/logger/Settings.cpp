@@ -30,18 +30,18 @@ void forEachEntry(std::string_view list, Use use) noexcept {
 }
 
 void setSink(Settings& settings, std::string_view text) noexcept {
-    constexpr std::string_view FILE_PREFIX = "file:";
+    constexpr std::string_view filePrefix = "file:";
     if (text == "stderr") settings.sink = Settings::Stderr;
     if (text == "none") settings.sink = Settings::None;
-    if (text.substr(0, FILE_PREFIX.size()) != FILE_PREFIX) return;
-    text.remove_prefix(FILE_PREFIX.size());
+    if (text.substr(0, filePrefix.size()) != filePrefix) return;
+    text.remove_prefix(filePrefix.size());
     if (text.empty() || text.size() >= settings.path.size()) return;
     settings.sink = Settings::File;
     std::copy(text.begin(), text.end(), settings.path.begin());
 }
 
 void addLevel(Settings& settings, int level) noexcept {
-    if (settings.levelCount == Settings::MAX_LEVELS) {
+    if (settings.levelCount == Settings::maxLevels) {
         settings.allLevels = true;
         return;
     }

@@ -12,7 +12,7 @@ enum class Channel { Log, Trace };
 /// What is logged and where to. Trivially destructible, so that threads may log while the process ends.
 struct Settings {
     enum Sink { Syslog, Stderr, File, None };
-    static constexpr std::size_t MAX_LEVELS = 64;
+    static constexpr std::size_t maxLevels = 64;
 
     Sink sink = Syslog;
     bool log = true;
@@ -20,7 +20,7 @@ struct Settings {
     bool traceInSyslog = false; ///< whether trace lines go there when the chosen sink cannot take them
     bool allLevels = false;
     std::size_t levelCount = 0;
-    std::array<int, MAX_LEVELS> levels{};
+    std::array<int, maxLevels> levels{};
     std::array<char, PATH_MAX> path{}; ///< of the File sink; behind what is looked at for every line
 
     bool keeps(Channel channel, int level) const noexcept {
@@ -35,7 +35,7 @@ struct Settings {
 
 /// Reads the three variables' texts; null and empty ones mean the defaults. Entries of a list that cannot be used
 /// are passed over, and a list without any usable entry means the default: a typing error must not hide failures.
-/// More than MAX_LEVELS levels keep all.
+/// More than maxLevels levels keep all.
 Settings parseSettings(const char* sink, const char* levels, const char* channels) noexcept;
 
 /// This process's settings, once they are read.

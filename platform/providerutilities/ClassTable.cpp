@@ -13,7 +13,7 @@ struct Row {
     const char* name;
 };
 
-constexpr Row CLASSES[] = {
+constexpr Row classes[] = {
     {ClassId::ComputerSystem, "VESKA_ComputerSystem"},
     {ClassId::PhysicalPackage, "VESKA_PhysicalPackage"},
     {ClassId::EnabledLogicalElementCapabilities, "VESKA_EnabledLogicalElementCapabilities"},
@@ -28,7 +28,7 @@ constexpr Row CLASSES[] = {
 
 unsigned short findClassId(const char* className) {
     if (className == nullptr) return ProviderUtilities::CLASS_ID_UNKNOWN;
-    for (const Row& row : CLASSES) {
+    for (const Row& row : classes) {
         if (strcasecmp(row.name, className) == 0) return static_cast<unsigned short>(row.id);
     }
     return ProviderUtilities::CLASS_ID_UNKNOWN;

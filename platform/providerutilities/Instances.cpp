@@ -6,14 +6,14 @@ namespace VK {
 
 namespace {
 
-constexpr CMPIStatus UNUSABLE{CMPI_RC_ERR_INVALID_PARAMETER, nullptr};
+constexpr CMPIStatus unusable{CMPI_RC_ERR_INVALID_PARAMETER, nullptr};
 
 bool refusedProperty(const char* name, const CMPIStatus& status) {
     return Cmpi::refused("setProperty", __LINE__, "the property", name, status);
 }
 
 bool set(CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
-    CMPIStatus status = UNUSABLE;
+    CMPIStatus status = unusable;
     if (name != nullptr && Cmpi::hasSlot(instance, &CMPIInstanceFT::setProperty))
         status = instance->ft->setProperty(instance, name, value, type);
     return Cmpi::succeeded(status) || refusedProperty(name, status);
@@ -21,7 +21,7 @@ bool set(CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIT
 
 /// One element of an array; null where the broker makes none.
 CMPIString* makeString(const CMPIBroker* broker, const std::string& text, CMPIStatus& status) {
-    status = UNUSABLE;
+    status = unusable;
     if (!Cmpi::hasService(broker, &CMPIBrokerEncFT::newString)) return nullptr;
     status = Cmpi::freshStatus();
     CMPIString* const string = broker->eft->newString(broker, text.c_str(), &status);
@@ -29,7 +29,7 @@ CMPIString* makeString(const CMPIBroker* broker, const std::string& text, CMPISt
 }
 
 CMPIArray* makeArray(const CMPIBroker* broker, std::size_t size, CMPIType elementType, CMPIStatus& status) {
-    status = UNUSABLE;
+    status = unusable;
     if (!Cmpi::hasService(broker, &CMPIBrokerEncFT::newArray)) return nullptr;
     status = Cmpi::freshStatus();
     CMPIArray* const array = broker->eft->newArray(broker, static_cast<CMPICount>(size), elementType, &status);
@@ -48,7 +48,7 @@ bool setArray(const CMPIBroker* broker, CMPIInstance* instance, const char* name
         if (Cmpi::succeeded(status))
             status = Cmpi::hasSlot(array, &CMPIArrayFT::setElementAt)
                          ? array->ft->setElementAt(array, static_cast<CMPICount>(i), &value, elementType)
-                         : UNUSABLE;
+                         : unusable;
         if (!Cmpi::succeeded(status)) return refusedProperty(name, status);
     }
     CMPIValue value{};
@@ -65,7 +65,7 @@ const char* classOf(const CMPIObjectPath* path) {
 }
 
 bool setDateTime(const CMPIBroker* broker, CMPIInstance* instance, const char* name, const std::string& text) {
-    CMPIStatus status = UNUSABLE;
+    CMPIStatus status = unusable;
     CMPIValue value{};
     if (Cmpi::hasService(broker, &CMPIBrokerEncFT::newDateTimeFromChars)) {
         status = Cmpi::freshStatus();
@@ -117,7 +117,7 @@ bool ProviderUtilities::setProperty(CMPIInstance* instance, const char* name, un
 bool ProviderUtilities::setProperty(CMPIInstance* instance, const char* name, CMPIObjectPath* value) {
     CMPIValue cmpi{};
     cmpi.ref = value;
-    return value != nullptr ? set(instance, name, &cmpi, CMPI_ref) : refusedProperty(name, UNUSABLE);
+    return value != nullptr ? set(instance, name, &cmpi, CMPI_ref) : refusedProperty(name, unusable);
 }
 
 bool ProviderUtilities::setProperty(const CMPIBroker* broker, CMPIInstance* instance, const char* name,

@@ -56,7 +56,8 @@ std::string timeServiceNote() {
     computer.read(NodeLexicon::SystemTimeProperty, facts.time);
     if (unsigned int automatic = 0; computer.read(NodeLexicon::AutomaticDSTAdjustmentProperty, automatic))
         facts.automaticDst = automatic;
-    if (Tree::simulatedHost() == nullptr) facts.zone = Zone::zoneNameOf(Root::host().readLink(Zone::LOCAL_TIME).text);
+    if (Tree::simulatedHost() == nullptr)
+        facts.zone = Zone::zoneNameOf(Root::host().readLink(Zone::localTimeFile).text);
     facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, whatever is described
     return Host::timeNote(facts);
 }
@@ -67,7 +68,7 @@ std::vector<std::string> hostNotes() {
     std::vector<std::string> notes = missingFacts();
     notes.push_back(timeServiceNote());
     const std::string root = productOverrides().rootDirectory.value_or(VK_ROOT_DIRECTORY);
-    const std::string command = Host::commandNote(Host::commandFolder(root, hostIsKVM()));
+    const std::string command = Host::commandNote(Host::commandDirectory(root, hostIsKVM()));
     if (!command.empty()) notes.push_back(command);
     return notes;
 }

@@ -40,7 +40,7 @@ struct ChassisRow {
     Told (*tell)(const ChassisView& view);
 };
 
-constexpr ComputerRow COMPUTER[] = {
+constexpr ComputerRow computerRows[] = {
     {Lexicon::UUIDProperty, [](const Host::HardwareFacts& host) { return text(host.uuid); }},
     {Lexicon::SerialNumberProperty, [](const Host::HardwareFacts& host) { return text(host.serial); }},
     {Lexicon::ModelProperty, [](const Host::HardwareFacts& host) { return text(host.model); }},
@@ -56,7 +56,7 @@ std::optional<bool> withNumber(const Value& value, unsigned int largest, Change 
     return change(*number);
 }
 
-constexpr ChangingProperty COMPUTER_NOW[] = {
+constexpr ChangingProperty computerNow[] = {
     {.number = Lexicon::NameProperty,
      .read =
          [](HostNow& host) {
@@ -90,7 +90,7 @@ constexpr ChangingProperty COMPUTER_NOW[] = {
          }},
 };
 
-constexpr ChassisRow CHASSIS[] = {
+constexpr ChassisRow chassisRows[] = {
     {Lexicon::ManufacturerProperty,
      [](const ChassisView& view) { return text(view.chassis.manufacturer, view.host.manufacturer); }},
     {Lexicon::ModelProperty,
@@ -137,7 +137,7 @@ std::vector<Node> hostNodes(const Host::HardwareFacts& facts) {
     computer.path = "/computer/0";
     computer.description = describe(facts);
     computer.status = facts.chassis.empty() ? 0 : facts.chassis.front().status;
-    fill(computer, COMPUTER, facts);
+    fill(computer, computerRows, facts);
     for (std::size_t i = 0; i < facts.chassis.size(); ++i) {
         Node& node = nodes[1 + i];
         node.type = Lexicon::SystemChassisNode;
@@ -145,29 +145,29 @@ std::vector<Node> hostNodes(const Host::HardwareFacts& facts) {
         node.parent = computer.path;
         node.description = Host::chassisTypeName(facts.chassis[i].type);
         node.status = facts.chassis[i].status;
-        fill(node, CHASSIS, ChassisView{facts, facts.chassis[i], i == 0});
+        fill(node, chassisRows, ChassisView{facts, facts.chassis[i], i == 0});
     }
     return nodes;
 }
 
 const ChangingProperty* changingProperty(const Node& node, unsigned int number) {
     if (node.type != Lexicon::ComputerSystemNode) return nullptr;
-    for (const ChangingProperty& row : COMPUTER_NOW)
+    for (const ChangingProperty& row : computerNow)
         if (row.number == number) return &row;
     return nullptr;
 }
 
 unsigned int statusOf(HostNow& host, const Node& node) {
-    constexpr unsigned int UNCORRECTABLE_ERRORS = 22;
+    constexpr unsigned int uncorrectableErrors = 22;
     if (node.type == Lexicon::ComputerSystemNode && host.hasUncorrectableMemoryErrors())
-        return std::max(node.status, UNCORRECTABLE_ERRORS); // the worse, the larger
+        return std::max(node.status, uncorrectableErrors); // the worse, the larger
     return node.status;
 }
 
 void readEverything(const Root& root) {
     HostNow now(root);
     for (const Node& node : hostNodes(Host::readHardware(root))) statusOf(now, node);
-    for (const ChangingProperty& row : COMPUTER_NOW) row.read(now);
+    for (const ChangingProperty& row : computerNow) row.read(now);
 }
 
 } // namespace VK::Tree

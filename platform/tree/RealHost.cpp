@@ -24,10 +24,10 @@ RealHost::Reading readOnce(const Root& root) {
 
 void logProblems(const RealHost::Reading& reading) {
     const Host::HardwareFacts& facts = reading.facts;
-    if (!reading.problem.empty()) logLine(FAILURE, "readOnce", __LINE__, reading.problem);
-    for (const std::string& problem : facts.problems) logLine(FAILURE, "readOnce", __LINE__, problem);
+    if (!reading.problem.empty()) logLine(failure, "readOnce", __LINE__, reading.problem);
+    for (const std::string& problem : facts.problems) logLine(failure, "readOnce", __LINE__, problem);
     if (const Host::Fact& none = facts.noTables; none.error != 0 && facts.problems.empty()) // damage is logged above
-        logLine(none.error == ENOENT ? DETAIL : NOTICE, "readOnce", __LINE__,
+        logLine(none.error == ENOENT ? detail : notice, "readOnce", __LINE__,
                 "no SMBIOS tables: " + none.source + ": " + errorText(none.error));
 }
 
@@ -55,7 +55,7 @@ bool RealHost::write(const Node& node, unsigned int property, const Value& value
             now.forget();
             return *changed;
         }
-    logLine(FAILURE, "setProperty", __LINE__,
+    logLine(failure, "setProperty", __LINE__,
             "property " + std::to_string(property) + " of " + node.path + " cannot be written so");
     return false;
 }

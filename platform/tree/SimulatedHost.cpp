@@ -50,13 +50,13 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
         if (changed.empty()) problem = "the text is not UTF-8, or has a zero byte";
         return changed;
     };
-    const std::string problem = replaceTreeFile(file, LARGEST_FILE, change);
+    const std::string problem = replaceTreeFile(file, largestFile, change);
     {
         const std::lock_guard<std::mutex> lock(mutex);
         lookAt = 0; // what we wrote shows at once
     }
     if (problem.empty()) return true;
-    logLine(FAILURE, "setProperty", __LINE__,
+    logLine(failure, "setProperty", __LINE__,
             file + ": property " + std::to_string(property) + " of " + inQuotes(node.path) +
                 " not written: " + problem);
     return false;
@@ -82,7 +82,7 @@ std::shared_ptr<const SimulatedHost::State> SimulatedHost::state() {
 void SimulatedHost::readAnew() {
     const std::string before = known ? known->problem : std::string();
     const std::int64_t begin = FileStamp::now();
-    const TreeFileContents contents = readTreeFile(file, LARGEST_FILE);
+    const TreeFileContents contents = readTreeFile(file, largestFile);
     auto fresh = std::make_shared<State>();
     TreeText text;
     text.problem = contents.problem;
@@ -91,7 +91,7 @@ void SimulatedHost::readAnew() {
     fresh->product = std::move(text.product);
     fresh->problem = std::move(text.problem);
     if (!fresh->problem.empty() && fresh->problem != before)
-        logLine(FAILURE, "readAnew", __LINE__, file + ": " + fresh->problem);
+        logLine(failure, "readAnew", __LINE__, file + ": " + fresh->problem);
     stamp = contents.error != 0 ? FileStamp() : FileStamp(contents.status);
     stamp.error = contents.error;
     settled = stamp.tellsChangesFrom(begin);

@@ -14,7 +14,7 @@ namespace VK::Tree {
 class SimulatedHost final : public NodeSource {
 public:
     /// The largest file that is read at all.
-    static constexpr std::size_t LARGEST_FILE = std::size_t{16} << 20;
+    static constexpr std::size_t largestFile = std::size_t{16} << 20;
 
     /// What a file was like when it was read.
     struct State {

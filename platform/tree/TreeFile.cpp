@@ -69,11 +69,11 @@ std::string replaceTreeFile(const std::string& file, std::size_t limit, const Tr
     if (text == now.text) return {};
     if (text.size() > limit) return "it would be larger than " + std::to_string(limit) + " bytes";
     const std::size_t slash = real.rfind('/') + 1;
-    const FileDescriptor folder(
+    const FileDescriptor directory(
         ::open(slash == 0 ? "." : real.substr(0, slash).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (!folder) return errorText(errno);
+    if (!directory) return errorText(errno);
     const FileOwner owner{now.status.st_mode & 07777, now.status.st_uid, now.status.st_gid};
-    const int error = replaceFile(folder.get(), real.substr(slash), text, owner);
+    const int error = replaceFile(directory.get(), real.substr(slash), text, owner);
     return error == 0 ? std::string() : "cannot replace it: " + errorText(error);
 }
 

@@ -99,7 +99,7 @@ struct Key {
 
 using At = const std::string&;
 
-constexpr Key<ProductOverrides> PRODUCT[] = {
+constexpr Key<ProductOverrides> productKeys[] = {
     {"architecture", [](ProductOverrides& to, At at, const Json& value) { to.architecture = textOf(at, value); }},
     {"uid", [](ProductOverrides& to, At at, const Json& value) { to.uid = textOf(at, value); }},
     {"rootDirectory", [](ProductOverrides& to, At at, const Json& value) { to.rootDirectory = textOf(at, value); }},
@@ -110,7 +110,7 @@ constexpr Key<ProductOverrides> PRODUCT[] = {
      }},
 };
 
-constexpr Key<Node> NODE[] = {
+constexpr Key<Node> nodeKeys[] = {
     {"type", [](Node& to, At at, const Json& value) { to.type = wholeNumber(at, value); }},
     {"path",
      [](Node& to, At at, const Json& value) {
@@ -141,7 +141,7 @@ void takeNodes(TreeText& tree, const std::string& where, const Json& value) {
     for (std::size_t i = 0; i < array(where, value).size(); ++i) {
         const std::string at = element(where, i);
         Node node;
-        takeKeys(node, NODE, at, value[i]);
+        takeKeys(node, nodeKeys, at, value[i]);
         for (const char* required : {"type", "path"})
             if (!value[i].contains(required)) refuse(at, "no \"" + std::string(required) + "\"");
         if (!paths.insert(node.path).second) refuse(at + ".path", "path " + inQuotes(node.path) + " is given twice");
@@ -149,8 +149,8 @@ void takeNodes(TreeText& tree, const std::string& where, const Json& value) {
     }
 }
 
-constexpr Key<TreeText> DOCUMENT[] = {
-    {"product", [](TreeText& to, At at, const Json& value) { takeKeys(to.product, PRODUCT, at, value); }},
+constexpr Key<TreeText> documentKeys[] = {
+    {"product", [](TreeText& to, At at, const Json& value) { takeKeys(to.product, productKeys, at, value); }},
     {"nodes", takeNodes},
 };
 
@@ -206,7 +206,7 @@ private:
 TreeText read(std::string_view text) {
     TreeText tree;
     const Json document = Json::parse(text, GivenTwice());
-    takeKeys(tree, DOCUMENT, "", document);
+    takeKeys(tree, documentKeys, "", document);
     if (!document.contains("nodes")) refuse("", "no \"nodes\"");
     return tree;
 }

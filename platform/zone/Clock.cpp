@@ -15,10 +15,10 @@ namespace VK::Zone {
 
 namespace {
 
-constexpr std::int64_t EARLIEST = 946684800; // 2000-01-01
+constexpr std::int64_t earliest = 946684800; // 2000-01-01
 
 bool refuse(const std::string& why) {
-    logLine(FAILURE, "setProperty", __LINE__, "clock not set: " + why);
+    logLine(failure, "setProperty", __LINE__, "clock not set: " + why);
     return false;
 }
 
@@ -42,7 +42,7 @@ void setHardwareClock(const Root& root, Instant instant) {
     const bool local = adjtimeSaysLocal(root.read("/etc/adjtime").text);
     const int offset = local ? zoneInForce(root).at(instant.seconds).offset : 0;
     const int error = fd ? writeHardwareClock(fd.get(), hardwareClockTime(instant, offset)) : -opened;
-    if (error != 0) logLine(FAILURE, "setProperty", __LINE__, "/dev/rtc0 not set: " + errorText(error));
+    if (error != 0) logLine(failure, "setProperty", __LINE__, "/dev/rtc0 not set: " + errorText(error));
 }
 
 std::string inUtc(const timespec& time) {
@@ -54,7 +54,7 @@ std::string inUtc(const timespec& time) {
 std::string checkClockText(const std::string& text, Instant& instant) {
     const std::optional<Instant> read = parseCimDateTime(text);
     if (!read) return inQuotes(text) + " is no date-time";
-    if (read->seconds < EARLIEST) return inQuotes(text) + " lies before 2000";
+    if (read->seconds < earliest) return inQuotes(text) + " lies before 2000";
     instant = *read;
     return {};
 }
@@ -85,7 +85,7 @@ bool changeClock(const Root& root, const std::string& text) {
         return refuse(errorText(error) + (error == EPERM ? "; this takes the privilege CAP_SYS_TIME" : ""));
     }
     setHardwareClock(root, instant);
-    logLine(NOTICE, "setProperty", __LINE__,
+    logLine(notice, "setProperty", __LINE__,
             "clock set from " + inUtc(before) + " to " + inUtc(wanted) + " by uid " + std::to_string(getuid()));
     return true;
 }

@@ -10,12 +10,12 @@ namespace {
 using std::chrono::sys_days;
 using std::chrono::year;
 
-constexpr std::int64_t LONGEST_TIME = 167; // hours; what RFC 8536 allows beyond POSIX
+constexpr std::int64_t longestTime = 167; // hours; what RFC 8536 allows beyond POSIX
 
 /// The year that an instant lies in, in UTC; kept within what a rule can be asked of.
 year yearOf(std::int64_t instant) {
-    constexpr std::int64_t LAST = 253402300799; // 9999-12-31
-    const std::chrono::sys_seconds kept{std::chrono::seconds{std::clamp<std::int64_t>(instant, 0, LAST)}};
+    constexpr std::int64_t latest = 253402300799; // 9999-12-31
+    const std::chrono::sys_seconds kept{std::chrono::seconds{std::clamp<std::int64_t>(instant, 0, latest)}};
     return std::chrono::year_month_day{std::chrono::floor<std::chrono::days>(kept)}.year();
 }
 
@@ -92,7 +92,7 @@ public:
         rule.month = static_cast<int>(month);
         rule.week = static_cast<int>(week);
         rule.day = static_cast<int>(day);
-        return !take('/') || time(LONGEST_TIME, rule.second);
+        return !take('/') || time(longestTime, rule.second);
     }
 
 private:
@@ -130,18 +130,18 @@ bool PosixRule::isDaylightAt(std::int64_t instant) const {
 }
 
 std::optional<PosixRule> parsePosixRule(std::string_view text) {
-    constexpr std::int64_t LONGEST_OFFSET = 24;
+    constexpr std::int64_t longestOffset = 24;
     PosixRule rule;
     RuleParser parser(text);
     std::int64_t west = 0;
-    if (!parser.name() || !parser.time(LONGEST_OFFSET, west)) return std::nullopt;
+    if (!parser.name() || !parser.time(longestOffset, west)) return std::nullopt;
     rule.standardOffset = static_cast<std::int32_t>(-west);
     if (parser.atEnd()) return rule;
     rule.hasDaylightSaving = true;
     if (!parser.name()) return std::nullopt;
     std::int64_t daylightWest = west - 3600;
     RuleParser ahead = parser;
-    if (ahead.time(LONGEST_OFFSET, daylightWest))
+    if (ahead.time(longestOffset, daylightWest))
         parser = ahead;
     else
         daylightWest = west - 3600;

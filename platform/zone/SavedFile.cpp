@@ -9,8 +9,8 @@ namespace VK::Zone {
 
 namespace {
 
-constexpr std::string_view HEADER = "vk-zone 1\n";
-constexpr std::string_view KINDS[] = {"absent", "link", "file"};
+constexpr std::string_view header = "vk-zone 1\n";
+constexpr std::string_view kinds[] = {"absent", "link", "file"};
 
 /// Takes one of the two off the front.
 bool take(std::string_view& bytes, SavedFile& file) {
@@ -20,7 +20,7 @@ bool take(std::string_view& bytes, SavedFile& file) {
     const std::string_view digits = bytes.substr(blank + 1, end - blank - 1);
     const bool number = !digits.empty() && digits.size() < 9 && digits.find_first_not_of("0123456789") == digits.npos;
     for (const auto kind : {SavedFile::Absent, SavedFile::Link, SavedFile::File}) {
-        if (!number || bytes.substr(0, blank) != KINDS[kind]) continue;
+        if (!number || bytes.substr(0, blank) != kinds[kind]) continue;
         const std::size_t length = std::stoul(std::string(digits));
         bytes.remove_prefix(end + 1);
         if (bytes.size() <= length || bytes[length] != '\n') return false;
@@ -52,16 +52,16 @@ int lookAt(const Root& root, const std::string& path, SavedFile& found) {
     return 0;
 }
 
-int putBack(int folder, const std::string& name, const SavedFile& saved, int from) {
-    if (saved.kind == SavedFile::Absent) return removeFile(folder, name);
-    if (from >= 0 && replaceByLinking(folder, name, from) == 0) return 0;
-    if (saved.kind == SavedFile::Link) return replaceLink(folder, name, saved.content);
-    return replaceFile(folder, name, saved.content, FileOwner{0644, geteuid(), getegid()});
+int putBack(int directory, const std::string& name, const SavedFile& saved, int from) {
+    if (saved.kind == SavedFile::Absent) return removeFile(directory, name);
+    if (from >= 0 && replaceByLinking(directory, name, from) == 0) return 0;
+    if (saved.kind == SavedFile::Link) return replaceLink(directory, name, saved.content);
+    return replaceFile(directory, name, saved.content, FileOwner{0644, geteuid(), getegid()});
 }
 
 std::optional<SavedZone> readSavedZone(std::string_view bytes) {
-    if (bytes.substr(0, HEADER.size()) != HEADER) return std::nullopt;
-    bytes.remove_prefix(HEADER.size());
+    if (bytes.substr(0, header.size()) != header) return std::nullopt;
+    bytes.remove_prefix(header.size());
     SavedZone zone;
     if (!take(bytes, zone.localTime) || !take(bytes, zone.zoneName) || !bytes.empty()) return std::nullopt;
     return zone;

@@ -23,7 +23,7 @@ int lookAt(const Root& root, const std::string& path, SavedFile& found);
 
 /// Puts at the name in a directory what was saved, at one stroke: 0, or the errno value. Where `from` is a directory
 /// that has it under the same name, it becomes the very file with owner, mode and label; between file systems a copy.
-int putBack(int folder, const std::string& name, const SavedFile& saved, int from = -1);
+int putBack(int directory, const std::string& name, const SavedFile& saved, int from = -1);
 
 /// What a change of zone replaced.
 struct SavedZone {

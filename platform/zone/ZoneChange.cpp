@@ -12,10 +12,10 @@ namespace VK::Zone {
 
 namespace {
 
-constexpr int FARTHEST = 14 * 60;
+constexpr int farthest = 14 * 60;
 
 bool refuse(const std::string& why) {
-    logLine(FAILURE, "setProperty", __LINE__, why);
+    logLine(failure, "setProperty", __LINE__, why);
     return false;
 }
 
@@ -32,7 +32,7 @@ bool refuse(const std::string& what, const ZoneFiles& files) {
 bool finish(const Root& root, const std::string& what, const ZoneFiles& files) {
     if (!files.changed()) return true;
     if (root.isLive()) tzset();
-    logLine(NOTICE, "setProperty", __LINE__,
+    logLine(notice, "setProperty", __LINE__,
             what + " (" + files.before().name + " became " + files.after().name + ") by uid " +
                 std::to_string(getuid()));
     return true;
@@ -41,7 +41,7 @@ bool finish(const Root& root, const std::string& what, const ZoneFiles& files) {
 } // namespace
 
 bool changeOffset(const Root& root, int minutes) {
-    if (minutes < -FARTHEST || minutes > FARTHEST)
+    if (minutes < -farthest || minutes > farthest)
         return refuse("offset from UTC of " + std::to_string(minutes) + " minutes is not between -840 and +840");
     if (minutes == offsetInForce(root)) return true;
     ZoneFiles files(root);

@@ -10,8 +10,8 @@ using namespace std::literals;
 
 namespace {
 
-constexpr std::size_t HEADER = 44;
-constexpr std::size_t LOCAL_TIME_SIZE = 6;
+constexpr std::size_t headerSize = 44;
+constexpr std::size_t localTimeSize = 6;
 
 /// How many of each kind of record a block holds, in the order of the header.
 struct Counts {
@@ -26,7 +26,7 @@ std::int64_t bigEndian(std::string_view bytes, std::size_t offset, std::size_t l
 }
 
 std::optional<Counts> readHeader(std::string_view bytes) {
-    if (bytes.size() < HEADER || bytes.substr(0, 4) != "TZif"sv) return std::nullopt;
+    if (bytes.size() < headerSize || bytes.substr(0, 4) != "TZif"sv) return std::nullopt;
     std::size_t counts[6];
     for (std::size_t i = 0; i < 6; ++i) {
         const std::int64_t count = bigEndian(bytes, 20 + 4 * i, 4);
@@ -37,17 +37,17 @@ std::optional<Counts> readHeader(std::string_view bytes) {
 }
 
 std::size_t blockSize(const Counts& counts, std::size_t timeSize) {
-    return counts.transitions * (timeSize + 1) + counts.localTimes * LOCAL_TIME_SIZE + counts.nameBytes +
+    return counts.transitions * (timeSize + 1) + counts.localTimes * localTimeSize + counts.nameBytes +
            counts.leapSeconds * (timeSize + 4) + counts.standardIndicators + counts.utIndicators;
 }
 
 std::optional<std::vector<TimeZone::LocalTime>> readLocalTimes(std::string_view bytes, std::size_t count) {
     std::vector<TimeZone::LocalTime> result;
     for (std::size_t i = 0; i < count; ++i) {
-        const std::int64_t offset = bigEndian(bytes, LOCAL_TIME_SIZE * i, 4);
-        constexpr std::int64_t LONGEST = 26 * 3600; // as zone files may have it
-        if (offset < -LONGEST || offset > LONGEST) return std::nullopt;
-        result.push_back({static_cast<std::int32_t>(offset), bytes[LOCAL_TIME_SIZE * i + 4] != 0});
+        const std::int64_t offset = bigEndian(bytes, localTimeSize * i, 4);
+        constexpr std::int64_t longest = 26 * 3600; // as zone files may have it
+        if (offset < -longest || offset > longest) return std::nullopt;
+        result.push_back({static_cast<std::int32_t>(offset), bytes[localTimeSize * i + 4] != 0});
     }
     return result;
 }
@@ -118,12 +118,12 @@ std::optional<TimeZone> parseZoneFile(std::string_view bytes) {
     const std::optional<Counts> first = readHeader(bytes);
     if (!first) return std::nullopt;
     const std::size_t firstSize = blockSize(*first, 4);
-    if (firstSize > bytes.size() - HEADER) return std::nullopt;
-    if (bytes[4] == '\0') return readBlock(bytes.substr(HEADER), *first, 4, false);
+    if (firstSize > bytes.size() - headerSize) return std::nullopt;
+    if (bytes[4] == '\0') return readBlock(bytes.substr(headerSize), *first, 4, false);
     // From version 2 on a second block with 64-bit instants follows, and the rule.
-    const std::string_view second = bytes.substr(HEADER + firstSize);
+    const std::string_view second = bytes.substr(headerSize + firstSize);
     const std::optional<Counts> counts = readHeader(second);
-    return counts ? readBlock(second.substr(HEADER), *counts, 8, true) : std::nullopt;
+    return counts ? readBlock(second.substr(headerSize), *counts, 8, true) : std::nullopt;
 }
 
 std::string makeZoneFile(std::int32_t offsetMinutes) {

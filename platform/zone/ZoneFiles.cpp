@@ -18,14 +18,14 @@ namespace VK::Zone {
 
 namespace {
 
-const std::string ZONE_NAME = "/etc/timezone";
+const std::string zoneNameFile = "/etc/timezone";
 
-/// Opens a folder, made with those above it where they are missing: a descriptor or a negative errno value.
-int openFolder(const Root& root, const std::string& path) {
+/// Opens a directory, made with those above it where they are missing: a descriptor or a negative errno value.
+int openDirectory(const Root& root, const std::string& path) {
     const int fd = root.open(path, O_RDONLY | O_DIRECTORY);
     if (fd != -ENOENT || path == "/") return fd;
     const std::size_t slash = path.rfind('/');
-    const int above = openFolder(root, slash == 0 ? "/" : path.substr(0, slash));
+    const int above = openDirectory(root, slash == 0 ? "/" : path.substr(0, slash));
     const FileDescriptor parent(above);
     if (above < 0) return above;
     if (mkdirat(parent.get(), path.c_str() + slash + 1, 0755) != 0 && errno != EEXIST) return -errno;
@@ -47,12 +47,12 @@ std::string describe(const SavedFile& localTime) {
     return name.empty() ? localTime.content : name;
 }
 
-/// The zone folder's name of a zone that is that offset for ever. Its signs are those of POSIX: west is positive.
+/// The zone directory's name of a zone that is that offset for ever. Its signs are those of POSIX: west is positive.
 std::string nameOfOffset(const Root& root, int minutes) {
     if (minutes % 60 != 0) return {};
     std::string name = "Etc/GMT";
     if (minutes != 0) name += (minutes > 0 ? "-" : "+") + std::to_string(std::abs(minutes) / 60);
-    const std::optional<TimeZone> zone = zoneOfFile(root, ZONE_DIRECTORY + name);
+    const std::optional<TimeZone> zone = zoneOfFile(root, zoneDirectory + name);
     const bool right = zone && zone->at(0).offset == minutes * 60 && !zone->hasDaylightSavingFrom(0);
     return right ? name : std::string();
 }
@@ -73,8 +73,8 @@ bool makesZone(const Root& root, const SavedFile& localTime) {
 /// Whether /etc/localtime is that and puts a zone into force.
 bool isInForce(const Root& root, const SavedFile& wanted) {
     SavedFile found;
-    return lookAt(root, LOCAL_TIME, found) == 0 && found == wanted &&
-           (wanted.kind == SavedFile::Absent || zoneOfFile(root, LOCAL_TIME).has_value());
+    return lookAt(root, localTimeFile, found) == 0 && found == wanted &&
+           (wanted.kind == SavedFile::Absent || zoneOfFile(root, localTimeFile).has_value());
 }
 
 /// What /etc/localtime and /etc/timezone are to be for a zone of that offset.
@@ -82,9 +82,9 @@ SavedZone zoneOfOffset(const Root& root, int minutes) {
     SavedZone zone;
     zone.zoneName.kind = SavedFile::File;
     if (const std::string name = nameOfOffset(root, minutes); !name.empty()) {
-        zone.localTime = {SavedFile::Link, ".." + ZONE_DIRECTORY + name};
+        zone.localTime = {SavedFile::Link, ".." + zoneDirectory + name};
         // Where /etc is itself a link, the directory above it is not the root.
-        if (!makesZone(root, zone.localTime)) zone.localTime.content = ZONE_DIRECTORY + name;
+        if (!makesZone(root, zone.localTime)) zone.localTime.content = zoneDirectory + name;
         zone.zoneName.content = name + "\n";
     } else {
         zone.localTime = {SavedFile::File, makeZoneFile(minutes)};
@@ -94,7 +94,7 @@ SavedZone zoneOfOffset(const Root& root, int minutes) {
 }
 
 void logDamage(const ZoneMemory& memory) {
-    if (!memory.damage().empty()) logLine(FAILURE, "replace", __LINE__, memory.damage());
+    if (!memory.damage().empty()) logLine(failure, "replace", __LINE__, memory.damage());
 }
 
 ZoneFiles::State stateOf(const Root& root, const SavedFile& localTime) {
@@ -121,17 +121,17 @@ bool ZoneFiles::fail(const std::string& what, int error) {
 }
 
 bool ZoneFiles::begin(Session& session) {
-    const int state = openFolder(root, ZoneMemory::FOLDER);
+    const int state = openDirectory(root, ZoneMemory::stateDirectory);
     session.state = FileDescriptor(state);
-    if (state < 0) return fail(ZoneMemory::FOLDER, -state);
+    if (state < 0) return fail(ZoneMemory::stateDirectory, -state);
     const int etc = root.open("/etc", O_RDONLY | O_DIRECTORY);
     session.etc = FileDescriptor(etc);
     if (etc < 0) return fail("/etc", -etc);
     session.lock.emplace(state, "lock");
-    if (const int error = session.lock->error(); error != 0) return fail(ZoneMemory::FOLDER + "/lock", error);
-    if (const int error = lookAt(root, LOCAL_TIME, session.present.localTime); error != 0)
-        return fail(LOCAL_TIME, error);
-    session.zoneNameError = lookAt(root, ZONE_NAME, session.present.zoneName);
+    if (const int error = session.lock->error(); error != 0) return fail(ZoneMemory::stateDirectory + "/lock", error);
+    if (const int error = lookAt(root, localTimeFile, session.present.localTime); error != 0)
+        return fail(localTimeFile, error);
+    session.zoneNameError = lookAt(root, zoneNameFile, session.present.zoneName);
     session.memory.emplace(root, state);
     old = stateOf(root, session.present.localTime);
     return true;
@@ -144,16 +144,16 @@ void ZoneFiles::putName(const Session& session, const SavedFile& wanted, int fro
     if (error == 0 && session.present.zoneName.kind == SavedFile::Absent) return;
     // One that cannot be read could not be brought back.
     if (error == 0) error = putBack(session.etc.get(), "timezone", wanted, from);
-    if (error != 0) logLine(FAILURE, "put", __LINE__, ZONE_NAME + " does not follow: " + errorText(error));
+    if (error != 0) logLine(failure, "put", __LINE__, zoneNameFile + " does not follow: " + errorText(error));
 }
 
 /// `from` is a descriptor of the directory that holds what is wanted, or -1.
 bool ZoneFiles::put(const Session& session, const SavedZone& wanted, int from) {
     if (const int error = putBack(session.etc.get(), "localtime", wanted.localTime, from); error != 0)
-        return fail(LOCAL_TIME, error);
+        return fail(localTimeFile, error);
     if (!isInForce(root, wanted.localTime)) {
         const int error = putBack(session.etc.get(), "localtime", session.present.localTime);
-        return fail(LOCAL_TIME + ": another zone was put into force" + (error == 0 ? "" : " and stays"), error);
+        return fail(localTimeFile + ": another zone was put into force" + (error == 0 ? "" : " and stays"), error);
     }
     putName(session, wanted.zoneName, from);
     now = stateOf(root, wanted.localTime);
@@ -165,14 +165,14 @@ bool ZoneFiles::replace(Session& session, int minutes, bool keepsOlder) {
     ZoneMemory& memory = *session.memory;
     memory.recover(session.present.localTime);
     std::optional<SavedZone> older;
-    if (const int error = memory.read(older); error != 0) return fail(ZoneMemory::FOLDER, error);
+    if (const int error = memory.read(older); error != 0) return fail(ZoneMemory::stateDirectory, error);
     logDamage(memory);
     if (older && keepsOlder) return put(session, zoneOfOffset(root, minutes), -1);
     // Remembered before the zone changes: at no time is there a change that cannot be taken back.
     if (const int error = memory.keep(session.etc.get(), session.present); error != 0)
-        return fail(ZoneMemory::FOLDER, error);
+        return fail(ZoneMemory::stateDirectory, error);
     const bool isPut = put(session, zoneOfOffset(root, minutes), -1);
-    if (SavedFile found; lookAt(root, LOCAL_TIME, found) == 0 && found == session.present.localTime)
+    if (SavedFile found; lookAt(root, localTimeFile, found) == 0 && found == session.present.localTime)
         memory.revert();
     else
         memory.commit();
@@ -199,7 +199,7 @@ bool ZoneFiles::bringBack() {
     ZoneMemory& memory = *session.memory;
     memory.recover(session.present.localTime);
     std::optional<SavedZone> zone;
-    if (const int error = memory.read(zone); error != 0) return fail(ZoneMemory::FOLDER, error);
+    if (const int error = memory.read(zone); error != 0) return fail(ZoneMemory::stateDirectory, error);
     if (!zone) return fail(memory.damage().empty() ? nothing : memory.damage());
     logDamage(memory);
     if (!makesZone(root, zone->localTime))

@@ -8,10 +8,10 @@ namespace VK::Zone {
 
 namespace {
 
-/// Whether the path that /etc/localtime leads to is that file itself or one of the zone folder.
+/// Whether the path that /etc/localtime leads to is that file itself or one of the zone directory.
 bool isTrusted(const Root& root, const std::string& path) {
-    const Root::Contents folder = root.resolve(ZONE_DIRECTORY);
-    if (folder && path.rfind(folder.text + "/", 0) == 0) return true;
+    const Root::Contents directory = root.resolve(zoneDirectory);
+    if (directory && path.rfind(directory.text + "/", 0) == 0) return true;
     const Root::Contents parent = root.resolve("/etc");
     return parent && path == parent.text + "/localtime";
 }
@@ -31,12 +31,12 @@ std::optional<TimeZone> zoneOfFile(const Root& root, const std::string& path) {
 }
 
 TimeZone zoneInForce(const Root& root) {
-    return zoneOfFile(root, LOCAL_TIME).value_or(TimeZone());
+    return zoneOfFile(root, localTimeFile).value_or(TimeZone());
 }
 
 void addZoneFiles(SeenFiles& files) {
-    files.add(LOCAL_TIME);
-    files.addLinks(ZONE_DIRECTORY); // both decide whether the file is trusted
+    files.add(localTimeFile);
+    files.addLinks(zoneDirectory); // both decide whether the file is trusted
     files.addLinks("/etc");
 }
 

@@ -9,8 +9,8 @@
 
 namespace VK::Zone {
 
-inline const std::string LOCAL_TIME = "/etc/localtime";
-inline const std::string ZONE_DIRECTORY = "/usr/share/zoneinfo/";
+inline const std::string localTimeFile = "/etc/localtime";
+inline const std::string zoneDirectory = "/usr/share/zoneinfo/";
 
 /// The zone that a link like `../usr/share/zoneinfo/Europe/Berlin` names; empty for any other text.
 std::string zoneNameOf(const std::string& link);

@@ -18,13 +18,13 @@ namespace VK::Zone {
 class ZoneMemory {
 public:
     /// The state directory.
-    static const std::string FOLDER;
+    static const std::string stateDirectory;
 
     /// Whether there is a memory, damaged or not.
     static bool exists(const Root& root);
 
-    /// `stateFolder` is a descriptor of the state directory.
-    ZoneMemory(const Root& hostRoot, int stateFolder) : root(hostRoot), state(stateFolder) {}
+    /// `descriptor` is the state directory's.
+    ZoneMemory(const Root& hostRoot, int descriptor) : root(hostRoot), state(descriptor) {}
 
     /// Ends a change that was interrupted: as its own end would have done if /etc/localtime is no longer what was
     /// remembered, else as its failure would have.

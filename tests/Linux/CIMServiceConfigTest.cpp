@@ -22,8 +22,8 @@ using VK::BaseServerProvider::CIMServiceConfig;
 const std::string intervalProperty = "minIndicationDeliveryRetryInterval";
 const std::string attemptsProperty = "maxIndicationDeliveryRetryAttempts";
 
-/// A host whose product's root directory is `product/platform/` in a folder of the test's own. Each test that asks for
-/// the command runs in a process of its own, since the libraries read the product's facts once.
+/// A host whose product's root directory is `product/platform/` in a directory of the test's own. Each test that asks
+/// for the command runs in a process of its own, since the libraries read the product's facts once.
 class CIMServiceConfigTest : public testing::Test {
 protected:
     CIMServiceConfigTest() { host(commands.path("product/platform/").string(), false); }

@@ -33,8 +33,8 @@ bool reachTheLimitOfProcesses() {
 void simulateForAnybody() {
     test::simulate({test::computer(0, "node7")});
     namespace fs = std::filesystem;
-    fs::permissions(test::processFolder(), fs::perms::all);
-    fs::permissions(test::processFolder() / "tree.json", fs::perms::all);
+    fs::permissions(test::processDirectory(), fs::perms::all);
+    fs::permissions(test::processDirectory() / "tree.json", fs::perms::all);
 }
 
 TEST(CommandsAtTheLimitOfProcesses, AreFailures) {

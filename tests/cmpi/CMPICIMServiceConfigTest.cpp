@@ -39,7 +39,7 @@ om::Answer configure(const std::vector<om::NamedValue>& in, const std::string& m
     return test::invoke(test::path(className), method, in);
 }
 
-/// A host whose product's root directory is `product/platform/` in a folder of the test's own.
+/// A host whose product's root directory is `product/platform/` in a directory of the test's own.
 class CMPICIMServiceConfigTest : public testing::Test {
 protected:
     CMPICIMServiceConfigTest() {

@@ -24,9 +24,9 @@ class Names(unittest.TestCase):
             r"build/tests/([\w-]+)(?: --gtest_filter='\*(\w+)\*')?", document.read_text(encoding="utf-8"))]
         self.assertTrue(any(test for _, _, test in found))
         for document, program, test in found:
-            folders = [where for where, text in lists.items() if re.search(rf"(?<![\w-]){program}(?![\w-])", text)]
-            self.assertTrue(folders, f"{document}: {program}")
-            sources = "".join(path.read_text(encoding="utf-8") for where in folders for path in where.glob("*.cpp"))
+            directories = [where for where, text in lists.items() if re.search(rf"(?<![\w-]){program}(?![\w-])", text)]
+            self.assertTrue(directories, f"{document}: {program}")
+            sources = "".join(path.read_text(encoding="utf-8") for where in directories for path in where.glob("*.cpp"))
             self.assertIn(test, sources, f"{document}: {program}")
 
 

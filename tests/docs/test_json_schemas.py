@@ -177,8 +177,8 @@ class Check(unittest.TestCase):
     VALIDATOR = jsonschema.Draft202012Validator(schema(SOURCE / "docs/json/vk-provider-check.schema.json"))
 
     def test_what_it_prints(self):
-        for folder in ("/", str(SOURCE)):
-            code, output, error = run(str(CHECK), "--root", folder, "--format", "json")
+        for directory in ("/", str(SOURCE)):
+            code, output, error = run(str(CHECK), "--root", directory, "--format", "json")
             document = json.loads(output)
             self.VALIDATOR.validate(document)
             self.assertEqual(code, 1 if document["missing"] else 0, error)

@@ -112,12 +112,12 @@ void addServiceConfig(Collection& collection) {
 } // namespace
 
 void makeHost(const std::string& sink) {
-    const fs::path folder = test::processFolder();
-    addCommand(folder / "bin/ps", "");
-    addCommand(folder / "bin/ntpd", "echo 'ntpd: time set +0.1s'");
-    addCommand(folder / "vcm/bin/cimconfig", "[ \"$1\" = -s ] || echo 'Current value: 20'");
+    const fs::path directory = test::processDirectory();
+    addCommand(directory / "bin/ps", "");
+    addCommand(directory / "bin/ntpd", "echo 'ntpd: time set +0.1s'");
+    addCommand(directory / "vcm/bin/cimconfig", "[ \"$1\" = -s ] || echo 'Current value: 20'");
     const char* const path = std::getenv("PATH");
-    setenv("PATH", ((folder / "bin").string() + ":" + (path != nullptr ? path : "/usr/bin:/bin")).c_str(), 1);
+    setenv("PATH", ((directory / "bin").string() + ":" + (path != nullptr ? path : "/usr/bin:/bin")).c_str(), 1);
     setenv("NVLOG_SINK", sink.c_str(), 1);
 
     test::Node first = test::computer(0, hostName());
@@ -125,7 +125,7 @@ void makeHost(const std::string& sink) {
     test::simulate({first, test::computer(1, "second"), test::chassis(0, 0, "CHASSIS-A"),
                     test::chassis(0, 1, "CHASSIS-B"), test::chassis(1, 0, "CHASSIS-C")});
     nlohmann::json host = test::simulatedFile();
-    host["product"]["rootDirectory"] = (folder / "platform/").string();
+    host["product"]["rootDirectory"] = (directory / "platform/").string();
     test::simulateText(host.dump());
 }
 

@@ -21,19 +21,19 @@ class Failure(Exception):
 
 
 class Workspace:
-    def __init__(self, root, folder, jobs):
+    def __init__(self, root, directory, jobs):
         self.root = root
-        self.tree = folder / "tree"
-        self.log = folder / "log"
+        self.tree = directory / "tree"
+        self.log = directory / "log"
         self.reached = root / BUILD / "reached"  # in the sandbox
         self.jobs = jobs
         self.tree.mkdir(parents=True, exist_ok=True)
-        self.lock = open(folder / "lock", "w", encoding="ascii")
+        self.lock = open(directory / "lock", "w", encoding="ascii")
         try:
             fcntl.flock(self.lock, fcntl.LOCK_EX | fcntl.LOCK_NB)
         except OSError as error:
             self.lock.close()
-            raise Failure(f"another run uses {folder}") from error
+            raise Failure(f"another run uses {directory}") from error
 
     def take_over(self):
         """Makes the copy's sources equal to the checkout's; what is equal already keeps its time."""

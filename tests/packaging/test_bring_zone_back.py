@@ -22,8 +22,8 @@ class BringZoneBack(unittest.TestCase):
         holder = tempfile.TemporaryDirectory()
         self.addCleanup(holder.cleanup)
         self.root = Path(holder.name)
-        for folder in ("etc", "usr/share/zoneinfo/Europe", "usr/share/zoneinfo/Etc", "var/lib/vk/instrumentation"):
-            (self.root / folder).mkdir(parents=True)
+        for directory in ("etc", "usr/share/zoneinfo/Europe", "usr/share/zoneinfo/Etc", "var/lib/vk/instrumentation"):
+            (self.root / directory).mkdir(parents=True)
         (self.root / "usr/share/zoneinfo/Europe/Berlin").write_bytes(BERLIN)
         (self.root / "usr/share/zoneinfo/Etc/GMT-1").write_bytes(b"TZif2 other")
         os.symlink("../usr/share/zoneinfo/Etc/GMT-1", self.root / "etc/localtime")

@@ -165,7 +165,7 @@ TEST(Cleanup, AnswersOkWhetherTerminatingOrNotAndTracesNothing) {
 TEST(Library, GoesWhenItIsUnloadedAndServesAgainWhenItIsLoadedAnew) {
     test::simulate({test::computer(0, "node7")});
     test::provider(); // keeps the product's libraries, so that a copy elsewhere finds them
-    const std::string copy = (test::processFolder() / "copied-provider.so").string();
+    const std::string copy = (test::processDirectory() / "copied-provider.so").string();
     std::filesystem::copy_file(VK_PROVIDER_LIBRARY, copy, std::filesystem::copy_options::overwrite_existing);
     for (int round = 0; round < 3; ++round) {
         {

@@ -170,8 +170,8 @@ Arguments linesOf(const std::filesystem::path& path) {
 }
 
 TEST_F(ReplacedLibraries, HandEachEventOverAloneAlsoWhereTheBufferNeverStartsAnew) {
-    const std::filesystem::path starting = test::processFolder() / "starting";
-    const std::filesystem::path keeping = test::processFolder() / "keeping";
+    const std::filesystem::path starting = test::processDirectory() / "starting";
+    const std::filesystem::path keeping = test::processDirectory() / "keeping";
     expectIntact(ask(getOne, preloading(REPLACED_LOGGER) + Environment{{"REPLACEMENT_LOG", starting.string()}}),
                  "a buffer that starts anew");
     expectIntact(ask(getOne, preloading(REPLACED_LOGGER) +

@@ -22,7 +22,7 @@ using Lines = std::vector<std::string>;
 /// A host that the traces are of. Its first computer is named like this host, so that it has the time service.
 struct TracedHost {
     const char* name;
-    const char* folder;
+    const char* directory;
     std::vector<test::Node> (*nodes)();
 };
 
@@ -261,7 +261,7 @@ TEST_P(Traces, AreWhatTheyHaveAlwaysBeen) {
     test::instances(className); // a first request may report what the host lacks
     Lines lines;
     for (const auto& [title, request] : requestsOf(className)) append(lines, title, request);
-    EXPECT_EQ(test::differenceFrom(std::string(TRACES) + host.folder + "/" + className, lines), "");
+    EXPECT_EQ(test::differenceFrom(std::string(TRACES) + host.directory + "/" + className, lines), "");
 }
 
 INSTANTIATE_TEST_SUITE_P(

@@ -214,13 +214,13 @@ class Command(unittest.TestCase):
         self.assertEqual((done.returncode, done.stdout, done.stderr), (0, "", ""))
 
     def test_writes_nothing_after_a_complaint(self):
-        with tempfile.TemporaryDirectory() as folder:
-            bad = Path(folder) / "bad.mof"
+        with tempfile.TemporaryDirectory() as directory:
+            bad = Path(directory) / "bad.mof"
             bad.write_text(thing('[Colour, Description("d")] string A;', above=" : CIM_System"), encoding="utf-8")
-            done = self.run_it("--json", Path(folder) / "out.json", bad)
+            done = self.run_it("--json", Path(directory) / "out.json", bad)
             self.assertEqual(done.returncode, 1)
             self.assertEqual(done.stderr, f"{bad}:3: unknown qualifier Colour on VESKA_Thing.A\n")
-            self.assertFalse((Path(folder) / "out.json").exists())
+            self.assertFalse((Path(directory) / "out.json").exists())
 
 
 class Descriptions(unittest.TestCase):

@@ -9,7 +9,7 @@
 namespace test {
 
 /// Shell commands of the test's own that record how they were called. While one of these lives, the process's PATH is
-/// its folder `bin` and then the system's; afterwards PATH is what it was.
+/// its directory `bin` and then the system's; afterwards PATH is what it was.
 class FakeCommands {
 public:
     FakeCommands();
@@ -17,7 +17,7 @@ public:
     FakeCommands(const FakeCommands&) = delete;
     FakeCommands& operator=(const FakeCommands&) = delete;
 
-    /// The folder of the commands that PATH finds, and the folder that everything is in, with a final slash.
+    /// The directory of the commands that PATH finds, and the directory that everything is in, with a final slash.
     std::filesystem::path bin() const { return path("bin"); }
     std::filesystem::path path(const std::string& name) const { return directory.path(name); }
 
@@ -25,7 +25,8 @@ public:
     void add(const std::filesystem::path& command, const std::string& script = "");
 
     /// The calls since it was last asked, in order: the command, then each argument in brackets, as
-    /// `ntpd [-xgq]`. Commands in `bin` show their bare name, others their path below the folder, or their whole path.
+    /// `ntpd [-xgq]`. Commands in `bin` show their bare name, others their path below the directory, or their whole
+    /// path.
     std::vector<std::string> take();
 
 private:

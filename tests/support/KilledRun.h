@@ -43,24 +43,24 @@ inline Outcome runKilledAt(const std::function<void()>& run, int n) {
     return Killed;
 }
 
-/// A folder in memory, where there is a place for it: hundreds of synchronised files take long on a disk.
-template <class Folder>
+/// A directory in memory, where there is a place for it: hundreds of synchronised files take long on a disk.
+template <class Directory>
 class InMemory {
 public:
     InMemory() {
         const char* const found = getenv("TMPDIR");
         const std::optional<std::string> before = found != nullptr ? std::optional<std::string>(found) : std::nullopt;
         if (access("/dev/shm", W_OK) == 0) setenv("TMPDIR", "/dev/shm", 1);
-        folder.emplace();
+        directory.emplace();
         if (before)
             setenv("TMPDIR", before->c_str(), 1);
         else
             unsetenv("TMPDIR");
     }
-    const Folder& operator*() const { return *folder; }
+    const Directory& operator*() const { return *directory; }
 
 private:
-    std::optional<Folder> folder;
+    std::optional<Directory> directory;
 };
 
 } // namespace support

@@ -12,19 +12,19 @@ namespace {
 
 namespace fs = std::filesystem;
 
-class ProcessFolder {
+class ProcessDirectory {
 public:
-    ProcessFolder() {
+    ProcessDirectory() {
         std::string pattern = (fs::temp_directory_path() / "vk-test-XXXXXX").string();
-        if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("cannot make a temporary folder");
+        if (mkdtemp(pattern.data()) == nullptr) throw std::runtime_error("cannot make a temporary directory");
         path = pattern;
         setenv("VK_INSTRUMENTATION_TREE", (path / "tree.json").c_str(), 0);
         setenv("NVLOG_SINK", ("file:" + (path / "log").string()).c_str(), 0);
         setenv("NVLOG_LEVELS", "all", 0);
         setenv("NVLOG_CHANNELS", "log,trace", 0);
     }
-    ~ProcessFolder() {
-        if (getpid() != owner) return; // a child of the test, which has no folder of its own
+    ~ProcessDirectory() {
+        if (getpid() != owner) return; // a child of the test, which has no directory of its own
         std::error_code ignored;
         fs::remove_all(path, ignored);
     }
@@ -35,10 +35,10 @@ private:
     const pid_t owner = getpid();
 };
 
-const ProcessFolder folder;
+const ProcessDirectory directory;
 
 fs::path treeFile() {
-    return folder.path / "tree.json";
+    return directory.path / "tree.json";
 }
 
 nlohmann::json asJson(const Node& node) {
@@ -57,8 +57,8 @@ nlohmann::json asJson(const Node& node) {
 
 } // namespace
 
-const fs::path& processFolder() {
-    return folder.path;
+const fs::path& processDirectory() {
+    return directory.path;
 }
 
 Node computer(unsigned index, const std::string& name) {
@@ -106,7 +106,7 @@ void simulate(const std::vector<Node>& nodes, const nlohmann::json& product) {
 }
 
 void simulateText(const std::string& text) {
-    const fs::path temporary = folder.path / "tree.json.new";
+    const fs::path temporary = directory.path / "tree.json.new";
     std::ofstream(temporary) << text;
     fs::rename(temporary, treeFile());
 }
@@ -127,7 +127,7 @@ nlohmann::json simulatedProperty(const std::string& path, unsigned property) {
 }
 
 std::vector<std::string> takeLog() {
-    const fs::path path = folder.path / "log";
+    const fs::path path = directory.path / "log";
     std::ifstream file(path);
     std::vector<std::string> lines;
     for (std::string line; std::getline(file, line);) lines.push_back(line);

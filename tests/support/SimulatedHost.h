@@ -10,10 +10,10 @@
 
 namespace test {
 
-/// The process's own folder, removed at its end. Made before main, which also points the libraries at it: the simulated
-/// host's file is `tree.json` in it, the log goes to `log` with all levels and both channels. A variable that is set
-/// already stays.
-const std::filesystem::path& processFolder();
+/// The process's own directory, removed at its end. Made before main, which also points the libraries at it: the
+/// simulated host's file is `tree.json` in it, the log goes to `log` with all levels and both channels. A variable that
+/// is set already stays.
+const std::filesystem::path& processDirectory();
 
 /// One node of a simulated host.
 struct Node {

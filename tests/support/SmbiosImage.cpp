@@ -96,9 +96,9 @@ std::string SmbiosImage::entryPoint() const {
     return outer;
 }
 
-void SmbiosImage::writeTo(const TemporaryDirectory& folder) const {
-    folder.write("sys/firmware/dmi/tables/smbios_entry_point", entryPoint());
-    folder.write("sys/firmware/dmi/tables/DMI", bytes);
+void SmbiosImage::writeTo(const TemporaryDirectory& directory) const {
+    directory.write("sys/firmware/dmi/tables/smbios_entry_point", entryPoint());
+    directory.write("sys/firmware/dmi/tables/DMI", bytes);
 }
 
 } // namespace support

@@ -61,8 +61,8 @@ public:
     const std::string& table() const { return bytes; }
     SmbiosImage& end() { return add(SmbiosStructureImage(127, 4)); }
 
-    /// Lays the files out below a folder, as VK_INSTRUMENTATION_ROOT takes it.
-    void writeTo(const TemporaryDirectory& folder) const;
+    /// Lays the files out below a directory, as VK_INSTRUMENTATION_ROOT takes it.
+    void writeTo(const TemporaryDirectory& directory) const;
 
 private:
     unsigned int major;

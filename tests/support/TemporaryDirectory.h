@@ -26,7 +26,7 @@ public:
     std::string path() const { return directory.string(); }
     std::string path(const std::string& name) const { return (directory / name).string(); }
 
-    /// Writes a file, with the folders on its way.
+    /// Writes a file, with the directories on its way.
     void write(const std::string& name, const std::string& bytes) const {
         std::filesystem::create_directories((directory / name).parent_path());
         std::ofstream file(directory / name, std::ios::binary);
@@ -34,7 +34,7 @@ public:
         if (!file.flush()) throw std::runtime_error("cannot write " + name);
     }
 
-    /// Makes a symbolic link, with the folders on its way.
+    /// Makes a symbolic link, with the directories on its way.
     void link(const std::string& target, const std::string& name) const {
         std::filesystem::create_directories((directory / name).parent_path());
         std::filesystem::create_symlink(target, directory / name);

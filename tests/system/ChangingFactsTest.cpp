@@ -87,7 +87,7 @@ protected:
         NamespaceTest::SetUp();
         if (IsSkipped()) return;
         test::provider();
-        for (const char* folder : {"/run", "/etc", "/sys/devices/system"}) covered.emplace_back(folder);
+        for (const char* directory : {"/run", "/etc", "/sys/devices/system"}) covered.emplace_back(directory);
         test::nameHost("node7");
     }
 
@@ -109,7 +109,7 @@ protected:
     }
 
 private:
-    std::list<test::CoveredFolder> covered;
+    std::list<test::CoveredDirectory> covered;
 };
 
 TEST_F(ChangingFacts, PowerStateAndMemoryErrorsShowWithinASecond) {

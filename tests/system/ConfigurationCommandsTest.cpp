@@ -33,14 +33,14 @@ protected:
             commands.add(command, "echo 'Current value: 20'");
     }
 
-    std::optional<test::CoveredFolder> systemCommands;
+    std::optional<test::CoveredDirectory> systemCommands;
     test::FakeCommands commands;
 };
 
 TEST_F(ConfigurationCommands, LieWhereTheKindOfHostSays) {
     const struct {
         bool kvm;
-        const char* root; ///< below the test's folder
+        const char* root; ///< below the test's directory
         std::string command;
     } table[] = {
         {true, "product/platform/", "/usr/sbin/cimconfig"},
@@ -101,7 +101,7 @@ protected:
         EXPECT_EQ(answer.code, CMPI_RC_OK);
     }
 
-    std::optional<test::CoveredFolder> run;
+    std::optional<test::CoveredDirectory> run;
 };
 
 TEST_F(ConfigurationLock, LetsOneProcessSetAtATime) {

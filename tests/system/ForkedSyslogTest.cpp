@@ -50,7 +50,7 @@ public:
 private:
     const support::TemporaryDirectory directory;
     const fs::path kept = directory.path("dev");
-    std::optional<test::CoveredFolder> covered;
+    std::optional<test::CoveredDirectory> covered;
 };
 
 /// A syslog daemon's socket at /dev/log.

@@ -83,12 +83,13 @@ void NamespaceTest::SetUp() {
     if (!reason.empty()) GTEST_SKIP() << reason;
 }
 
-CoveredFolder::CoveredFolder(const std::filesystem::path& theFolder) : folder(theFolder) {
-    checked(mount("tmpfs", folder.c_str(), "tmpfs", MS_NOSUID | MS_NODEV, "mode=755"), "covering " + folder.string());
+CoveredDirectory::CoveredDirectory(const std::filesystem::path& theDirectory) : directory(theDirectory) {
+    checked(mount("tmpfs", directory.c_str(), "tmpfs", MS_NOSUID | MS_NODEV, "mode=755"),
+            "covering " + directory.string());
 }
 
-CoveredFolder::~CoveredFolder() {
-    umount2(folder.c_str(), MNT_DETACH);
+CoveredDirectory::~CoveredDirectory() {
+    umount2(directory.c_str(), MNT_DETACH);
 }
 
 void nameHost(const std::string& name) {

@@ -15,17 +15,17 @@ protected:
     void SetUp() override;
 };
 
-/// A file system that lies over a folder of the host for as long as this lives; empty at first, and gone afterwards
+/// A file system that lies over a directory of the host for as long as this lives; empty at first, and gone afterwards
 /// with everything in it.
-class CoveredFolder {
+class CoveredDirectory {
 public:
-    explicit CoveredFolder(const std::filesystem::path& folder);
-    ~CoveredFolder();
-    CoveredFolder(const CoveredFolder&) = delete;
-    CoveredFolder& operator=(const CoveredFolder&) = delete;
+    explicit CoveredDirectory(const std::filesystem::path& directory);
+    ~CoveredDirectory();
+    CoveredDirectory(const CoveredDirectory&) = delete;
+    CoveredDirectory& operator=(const CoveredDirectory&) = delete;
 
 private:
-    const std::filesystem::path folder;
+    const std::filesystem::path directory;
 };
 
 /// Gives the namespaces' host a name.

@@ -5,7 +5,7 @@
 #include <cstdlib>
 #include <filesystem>
 
-// What the tables of real machines come to. The folder of their snapshots is named by VK_TEST_HOSTS.
+// What the tables of real machines come to. The directory of their snapshots is named by VK_TEST_HOSTS.
 
 namespace {
 
@@ -17,7 +17,7 @@ using testing::Not;
 using testing::StartsWith;
 
 struct Machine {
-    const char* folder;
+    const char* directory;
     const char* name;
     const char* uuid; ///< empty: none, or one that many machines share
     const char* tag;  ///< empty: no serial number, or a placeholder
@@ -30,7 +30,7 @@ struct Machine {
 };
 
 void PrintTo(const Machine& machine, std::ostream* stream) {
-    *stream << machine.folder;
+    *stream << machine.directory;
 }
 
 constexpr Machine machines[] = {
@@ -50,10 +50,10 @@ class RealMachines : public testing::TestWithParam<Machine> {
 protected:
     void SetUp() override {
         const char* const hosts = std::getenv("VK_TEST_HOSTS");
-        if (hosts == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name the folder of the machines' snapshots";
-        const std::filesystem::path folder = std::filesystem::path(hosts) / GetParam().folder;
-        ASSERT_TRUE(std::filesystem::is_directory(folder)) << folder;
-        environment = "NVLOG_SINK=none VK_INSTRUMENTATION_ROOT=" + test::quoted(folder.string());
+        if (hosts == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name the directory of the machines' snapshots";
+        const std::filesystem::path directory = std::filesystem::path(hosts) / GetParam().directory;
+        ASSERT_TRUE(std::filesystem::is_directory(directory)) << directory;
+        environment = "NVLOG_SINK=none VK_INSTRUMENTATION_ROOT=" + test::quoted(directory.string());
     }
 
     json results(const std::vector<std::string>& arguments) const {
@@ -135,7 +135,7 @@ TEST_P(RealMachines, LeadFromTheCapabilitiesToTheComputerAndBack) {
 }
 
 std::string testName(const testing::TestParamInfo<Machine>& info) {
-    std::string name = info.param.folder;
+    std::string name = info.param.directory;
     for (char& character : name)
         if (std::isalnum(static_cast<unsigned char>(character)) == 0) character = '_';
     return name;

@@ -14,7 +14,7 @@
 
 namespace {
 
-constexpr const char* UUID = "4c4c4544-0042-4a10-8053-b4c04f4d3132";
+constexpr const char* uuid = "4c4c4544-0042-4a10-8053-b4c04f4d3132";
 
 void write(const std::filesystem::path& file, const std::string& text) {
     std::filesystem::create_directories(file.parent_path());
@@ -23,30 +23,30 @@ void write(const std::filesystem::path& file, const std::string& text) {
 
 class SimulatedProduct : public test::NamespaceTest {
 protected:
-    /// The identifier on a host that a file describes, which holds a computer with a UUID of its own.
+    /// The identifier on a host that a file describes, which holds a computer with a uuid of its own.
     std::string identifier() const {
-        support::TemporaryDirectory folder;
-        folder.write("tree.json", R"({"nodes":[{"type":40,"path":"/c",)"
-                                  R"("properties":{"64":"00112233-4455-6677-8899-aabbccddeeff"}}]})");
+        support::TemporaryDirectory directory;
+        directory.write("tree.json", R"({"nodes":[{"type":40,"path":"/c",)"
+                                     R"("properties":{"64":"00112233-4455-6677-8899-aabbccddeeff"}}]})");
         return support::inChild([&] {
             unsetenv("VK_INSTRUMENTATION_ROOT");
-            setenv("VK_INSTRUMENTATION_TREE", folder.path("tree.json").c_str(), 1);
+            setenv("VK_INSTRUMENTATION_TREE", directory.path("tree.json").c_str(), 1);
             return VK::make_string(VK::Product::getUid());
         });
     }
 };
 
 TEST_F(SimulatedProduct, IsIdentifiedByThisHostsMachineId) {
-    const test::CoveredFolder etc("/etc"), sys("/sys");
+    const test::CoveredDirectory etc("/etc"), sys("/sys");
     write("/etc/machine-id", "0123456789abcdef0123456789abcdef\n");
-    write("/sys/class/dmi/id/product_uuid", UUID);
+    write("/sys/class/dmi/id/product_uuid", uuid);
     EXPECT_EQ(identifier(), VK::uniqueIdentifier("0123456789abcdef0123456789abcdef"));
 }
 
 TEST_F(SimulatedProduct, IsIdentifiedByThisHostsUuidWithoutAMachineId) {
-    const test::CoveredFolder etc("/etc"), sys("/sys");
-    write("/sys/class/dmi/id/product_uuid", UUID);
-    EXPECT_EQ(identifier(), VK::uniqueIdentifier(UUID));
+    const test::CoveredDirectory etc("/etc"), sys("/sys");
+    write("/sys/class/dmi/id/product_uuid", uuid);
+    EXPECT_EQ(identifier(), VK::uniqueIdentifier(uuid));
 }
 
 } // namespace

@@ -76,7 +76,7 @@ protected:
 
     /// The calls of one process that puts the request so many times. Its coarse clock stands still.
     Calls callsOf(const std::string& environment, std::vector<std::string> request, int times) const {
-        const std::string trace = folder.path("trace");
+        const std::string trace = directory.path("trace");
         std::string command = environment +
                               // A leak check at the end, where one is built in, fails under a tracer.
                               " strace -E ASAN_OPTIONS=detect_leaks=0:verify_asan_link_order=0 -E LD_PRELOAD=" +
@@ -107,7 +107,7 @@ protected:
         EXPECT_GT(few["openat"], 1) << "the host was not read at all";
     }
 
-    const support::TemporaryDirectory folder;
+    const support::TemporaryDirectory directory;
 };
 
 TEST_P(SystemCallsPerRequest, AreTheseOfALiveHost) {
@@ -123,21 +123,21 @@ TEST_P(SystemCallsPerRequest, AreTheseOfASnapshot) {
         .add(support::SmbiosSystemImage{"Example", "Rack Server 7", {}, "SYS7", {}, std::string(16, 'u')})
         .add(support::SmbiosChassisImage{23, "Example", {}, "CZ7", {}})
         .end()
-        .writeTo(folder);
-    folder.write("etc/hostname", "node7\n");
-    folder.write("run/utmp", "");
-    folder.write("etc/machine-id", "0123456789abcdef0123456789abcdef\n");
-    std::filesystem::create_directories(folder.path("usr/share/zoneinfo/Europe"));
-    std::filesystem::copy_file("/usr/share/zoneinfo/Europe/Berlin", folder.path("usr/share/zoneinfo/Europe/Berlin"));
-    folder.link("/usr/share/zoneinfo/Europe/Berlin", "etc/localtime");
-    expectEach(GetParam().snapshot, "VK_INSTRUMENTATION_ROOT=" + test::quoted(folder.path()), "node7");
+        .writeTo(directory);
+    directory.write("etc/hostname", "node7\n");
+    directory.write("run/utmp", "");
+    directory.write("etc/machine-id", "0123456789abcdef0123456789abcdef\n");
+    std::filesystem::create_directories(directory.path("usr/share/zoneinfo/Europe"));
+    std::filesystem::copy_file("/usr/share/zoneinfo/Europe/Berlin", directory.path("usr/share/zoneinfo/Europe/Berlin"));
+    directory.link("/usr/share/zoneinfo/Europe/Berlin", "etc/localtime");
+    expectEach(GetParam().snapshot, "VK_INSTRUMENTATION_ROOT=" + test::quoted(directory.path()), "node7");
 }
 
 TEST_P(SystemCallsPerRequest, AreTheseOfASimulatedHost) {
-    folder.write("tree.json", R"({"nodes":[
+    directory.write("tree.json", R"({"nodes":[
         {"type":40,"path":"/c","status":1,"properties":{"108":"node7","64":"u","39":"m","50":"s","123":1,"200":0}},
         {"type":1,"path":"/c/x","parent":"/c","status":1,"properties":{"50":"CZ7"}}]})");
-    expectEach(GetParam().simulated, "VK_INSTRUMENTATION_TREE=" + test::quoted(folder.path("tree.json")), "node7");
+    expectEach(GetParam().simulated, "VK_INSTRUMENTATION_TREE=" + test::quoted(directory.path("tree.json")), "node7");
 }
 
 INSTANTIATE_TEST_SUITE_P(, SystemCallsPerRequest, testing::ValuesIn(cases),

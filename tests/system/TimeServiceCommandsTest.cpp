@@ -47,7 +47,7 @@ protected:
         if (running) std::ofstream(daemon()) << "runs";
     }
 
-    std::optional<test::CoveredFolder> initScripts;
+    std::optional<test::CoveredDirectory> initScripts;
     test::FakeCommands commands;
 };
 

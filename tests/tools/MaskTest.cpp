@@ -18,7 +18,7 @@ struct Row {
     bool saysSomething;
 };
 
-constexpr Row ROWS[] = {
+constexpr Row rows[] = {
 #define SAYS_NOTHING(KIND, TEXT) {FirmwareText::KIND, TEXT, false},
 #define SAYS_SOMETHING(KIND, TEXT) {FirmwareText::KIND, TEXT, true},
 #include "support/FirmwareTexts.inc"
@@ -39,7 +39,7 @@ TEST_F(MaskTest, KeepsTheShapeOfAName) {
 }
 
 TEST_F(MaskTest, LeavesPlaceholdersAndOnlyThem) {
-    for (const Row& row : ROWS) {
+    for (const Row& row : rows) {
         if (row.kind != FirmwareText::Other) continue; // serial numbers, which alone are masked, are no other kind
         const std::string masked = mask.name(row.text);
         EXPECT_EQ(VK::Host::isPlaceholder(VK::cleanText(masked)), !row.saysSomething) << row.text;

@@ -9,7 +9,7 @@ import sys
 from pathlib import Path
 
 here = Path(sys.argv[0]).absolute()
-root = next(folder for folder in here.parents if (folder / "state").is_dir())
+root = next(directory for directory in here.parents if (directory / "state").is_dir())
 state, (name, *words) = root / "state", [here.name, *sys.argv[1:]]
 MODULES = root / "var/lib/Pegasus/repository/root#PG_InterOp/instances/PG_ProviderModule.instances"
 SFCB = root / (state / "sfcb-home").read_text().strip() if (state / "sfcb-home").exists() else root
@@ -115,7 +115,7 @@ def cimcli():
         end(0, file.read_text(encoding="utf-8"))
     looks_in = root / get("home", "x") / "lib" if provider_dir() == "lib" else Path(str(root) + provider_dir())
     link = looks_in / "libvknabaseserverprofileprovider.so"
-    serves = not get("mute") and link.exists() or (state / "any-folder").exists()
+    serves = not get("mute") and link.exists() or (state / "any-directory").exists()
     if not get("module").endswith(" OK") or not serves:
         end(1, error=f"CIM_ERR_FAILED: cannot load library, error: {link}: cannot open shared object file")
     end(0, f'{asked}.CreationClassName="{asked}",Name="vm"')

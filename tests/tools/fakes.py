@@ -15,10 +15,10 @@ _SCHEMA = " ".join(re.findall(r"^CIM_\w+", _FACTS.read_text(encoding="utf-8"), r
 
 
 class Fake:
-    def __init__(self, root: Path, programs, without, folders):
+    def __init__(self, root: Path, programs, without, directories):
         self.root = root
-        for folder in ("state", "usr/sbin", "usr/local/lib", "var/lib", *folders):
-            (root / folder).mkdir(parents=True, exist_ok=True)
+        for directory in ("state", "usr/sbin", "usr/local/lib", "var/lib", *directories):
+            (root / directory).mkdir(parents=True, exist_ok=True)
         self.set("schema", _SCHEMA)
         for name in programs:
             if name not in without:
@@ -73,8 +73,8 @@ class Sfcb(Fake):
         return "(sfcbd)" in (self.root / "proc/42/stat").read_text(encoding="ascii")
 
     def run_server(self, up: bool) -> None:
-        for folder in ("proc/42", "proc/net"):
-            (self.root / folder).mkdir(parents=True, exist_ok=True)
+        for directory in ("proc/42", "proc/net"):
+            (self.root / directory).mkdir(parents=True, exist_ok=True)
         (self.root / "proc/42/stat").write_text(f"42 ({'sfcbd' if up else 'other'}) S 1 42 42", encoding="ascii")
         (self.root / "proc/net/tcp").write_text("   0: 0100007F:1764 00000000:0000 0A \n" if up else "", encoding="ascii")
 

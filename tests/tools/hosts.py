@@ -1,11 +1,11 @@
-"""Folders that hold the files of a host, for the tests of vk-host-snapshot."""
+"""Directories that hold the files of a host, for the tests of vk-host-snapshot."""
 
 import json
 import os
 import struct
 import uuid
 
-from support import BUILD, folder, run
+from support import BUILD, directory, run
 
 SNAPSHOT = BUILD / "installed/vk-host-snapshot"
 VKCIM = BUILD / "bin/vkcim"
@@ -38,7 +38,7 @@ def entry_point(length, version=(2, 7)):
 
 
 def make_host(data=None, version=(2, 7), **files):
-    root = folder()
+    root = directory()
     data = table() if data is None else data
     contents = {"sys/firmware/dmi/tables/DMI": data,
                 "sys/firmware/dmi/tables/smbios_entry_point": entry_point(len(data), version),
@@ -55,7 +55,7 @@ def make_host(data=None, version=(2, 7), **files):
 
 
 def take(root, *words):
-    target = folder() / "copy"
+    target = directory() / "copy"
     return target, run(SNAPSHOT, "--root", root, *words, target)
 
 

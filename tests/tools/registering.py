@@ -4,9 +4,9 @@ import os
 import re
 import unittest
 
-from support import folder, install, run
+from support import directory, install, run
 
-PREFIX = folder() / "installed"
+PREFIX = directory() / "installed"
 install(PREFIX, component="provider")
 SHARE = PREFIX / "share/vk-baseserver"
 MODULE = "VKBaseServerModule"
@@ -15,7 +15,7 @@ CLASSES = re.findall(r"^class (\w+)", (SHARE / "vk-baseserver.mof").read_text(en
 
 class Register(unittest.TestCase):
     def setUp(self):
-        self.root = folder()
+        self.root = directory()
 
     def register(self, *words, prefix=PREFIX, status=0, **more):
         env = {"PATH": "/usr/sbin:/usr/bin:/sbin:/bin", "VK_REGISTER_PAUSE": "0", "VK_REGISTER_ROOT": str(self.root), **more}

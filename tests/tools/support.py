@@ -16,8 +16,8 @@ def run(*command, **options):
     return subprocess.run([str(word) for word in command], **options)
 
 
-def folder() -> Path:
-    """A new folder, removed at the end."""
+def directory() -> Path:
+    """A new directory, removed at the end."""
     made = Path(tempfile.mkdtemp(prefix="vk-tools-"))
     atexit.register(shutil.rmtree, made, ignore_errors=True)
     return made
@@ -38,6 +38,6 @@ def files_below(where: Path):
 
 
 def snapshot_of(where: Path):
-    """Every file, link and folder below a folder with what it holds, to see whether anything changed."""
+    """Every file, link and directory below a directory with what it holds, to see whether anything changed."""
     return {str(p.relative_to(where)): (os.readlink(p) if p.is_symlink() else p.read_bytes() if p.is_file() else None)
             for p in where.rglob("*")}

@@ -5,7 +5,7 @@ import os
 import unittest
 from pathlib import Path
 
-from support import BUILD, folder, run
+from support import BUILD, directory, run
 
 CHECK = BUILD / "installed/vk-provider-check"
 NOBODY = 65534
@@ -13,7 +13,7 @@ NOBODY = 65534
 
 def make_host(without=()):
     """A host on which everything is there, but for what is named."""
-    root = folder()
+    root = directory()
     files = {"sys/firmware/dmi/tables/smbios_entry_point": b"_SM_", "sys/firmware/dmi/tables/DMI": b"\x7f\x04",
              "etc/machine-id": b"0123456789abcdef0123456789abcdef\n", "etc/localtime": b"TZif2",
              "usr/share/zoneinfo/Etc/GMT": b"TZif2", "bin/ps": b"", "bin/ntpd": b"", "etc/init.d/ntp": b"",
@@ -124,7 +124,7 @@ class Check(unittest.TestCase):
         os.chown(root / "var/lib/vk/instrumentation", NOBODY, NOBODY)
         self.assertNotIn(zone, self.missing_for_nobody(root))
 
-    def test_takes_a_file_for_no_folder_to_write_in(self):
+    def test_takes_a_file_for_no_directory_to_write_in(self):
         root = make_host()
         (root / "var/lib").mkdir(parents=True)
         (root / "var/lib/vk").write_bytes(b"")

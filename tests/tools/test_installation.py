@@ -7,10 +7,10 @@ import sys
 import unittest
 from pathlib import Path
 
-from support import BUILD, LIBRARY, files_below, folder, install, run
+from support import BUILD, LIBRARY, files_below, directory, install, run
 
 SOURCE = Path(__file__).resolve().parents[2]
-PREFIX = folder() / "installed"
+PREFIX = directory() / "installed"
 install(PREFIX)
 LIBRARIES = ["nvlog", "vkcommon", "vkproduct", "vkinstrumentation", "vkproviderutilities",
              "vknabaseserverprofileprovider"]
@@ -23,7 +23,7 @@ def simulated(**more):
 
 
 class Contents(unittest.TestCase):
-    def test_holds_everything_in_its_folder(self):
+    def test_holds_everything_in_its_directory(self):
         expected = [f"lib/lib{name}.so.1" for name in LIBRARIES] + [f"lib/lib{name}.so" for name in LIBRARIES]
         expected += ["bin/vkcim", "sbin/vk-provider-register", "sbin/vk-provider-check", "sbin/vk-host-snapshot",
                      "share/man/man1/vkcim.1", "share/man/man7/libvknabaseserverprofileprovider.7",
@@ -42,7 +42,7 @@ class Contents(unittest.TestCase):
     def test_each_component_alone_holds_its_part_and_all_three_everything(self):
         parts = []
         for component in ("provider", "tools", "development"):
-            where = folder() / "p"
+            where = directory() / "p"
             install(where, component=component)
             parts += [str(p.relative_to(where)) for p in files_below(where)]
         self.assertEqual(sorted(parts), [str(p.relative_to(PREFIX)) for p in files_below(PREFIX)])
@@ -63,26 +63,26 @@ class Libraries(unittest.TestCase):
     def open_in_a_clean_process(self, path):
         return run(sys.executable, "-c", OPEN, path, cwd="/", env={"PATH": "/usr/bin:/bin"})
 
-    def test_load_from_their_folder(self):
+    def test_load_from_their_directory(self):
         done = self.open_in_a_clean_process(PREFIX / "lib" / f"{LIBRARY}.1")
         self.assertEqual(done.returncode, 0, done.stderr)
 
-    def test_load_through_a_link_in_another_folder(self):
-        link = folder() / LIBRARY
+    def test_load_through_a_link_in_another_directory(self):
+        link = directory() / LIBRARY
         link.symlink_to(PREFIX / "lib" / f"{LIBRARY}.1")
         done = self.open_in_a_clean_process(link)
         self.assertEqual(done.returncode, 0, done.stderr)
 
     def test_load_through_the_link_that_the_registration_puts(self):
-        root, where = folder(), folder()
+        root, where = directory(), directory()
         import fakes
-        fakes.pegasus(root, up=True).set("any-folder", "yes")
+        fakes.pegasus(root, up=True).set("any-directory", "yes")
         done = run(PREFIX / "sbin/vk-provider-register", "--root", root, "--provider-dir", where, "install")
         self.assertEqual(done.returncode, 0, done.stderr)
         self.assertEqual(self.open_in_a_clean_process(where / LIBRARY).returncode, 0)
 
     def test_take_each_other_from_the_same_installation(self):
-        link = folder() / LIBRARY
+        link = directory() / LIBRARY
         link.symlink_to(PREFIX / "lib" / f"{LIBRARY}.1")
         script = OPEN + "; print(open('/proc/self/maps').read())"
         maps = run(sys.executable, "-c", script, link, cwd="/").stdout
@@ -90,13 +90,13 @@ class Libraries(unittest.TestCase):
         self.assertEqual({p.name for p in loaded}, {f"lib{name}.so.1" for name in LIBRARIES})
         self.assertEqual({p.parent for p in loaded}, {PREFIX / "lib"})
 
-    def test_have_no_run_path_in_a_folder_of_the_system(self):
-        stage = folder()
+    def test_have_no_run_path_in_a_directory_of_the_system(self):
+        stage = directory()
         install(Path("/usr"), destdir=stage, component="provider")
         for path in (stage / "usr").rglob(f"{LIBRARY}.1"):
             found = re.search(r"RUNPATH.*\[(.*)\]", run("readelf", "-d", path).stdout)
-            in_system_folder = re.fullmatch(r"/usr/lib(64|/[^/]*-linux-[^/]*)?", f"/{path.parent.relative_to(stage)}")
-            self.assertEqual(found is None, in_system_folder is not None, path)
+            in_system_directory = re.fullmatch(r"/usr/lib(64|/[^/]*-linux-[^/]*)?", f"/{path.parent.relative_to(stage)}")
+            self.assertEqual(found is None, in_system_directory is not None, path)
 
 
 class Programs(unittest.TestCase):
@@ -108,7 +108,7 @@ class Programs(unittest.TestCase):
         self.assertEqual(package["PackageType"]["value"], 2)
 
     def test_run_from_a_staged_installation(self):
-        stage = folder()
+        stage = directory()
         install(Path("/opt/vk"), destdir=stage)
         self.assertEqual([p.name for p in stage.iterdir()], ["opt"])
         there = stage / "opt/vk"
@@ -116,7 +116,7 @@ class Programs(unittest.TestCase):
         self.assertEqual(run_path.group(1), "$ORIGIN:/opt/vk/lib")
         done = run(there / "bin/vkcim", "names", "VESKA_ComputerSystem", cwd="/", env=simulated())
         self.assertIn('Name="node7"', done.stdout, done.stderr)
-        done = run(there / "sbin/vk-provider-register", "--root", folder(), "install")
+        done = run(there / "sbin/vk-provider-register", "--root", directory(), "install")
         self.assertEqual(done.returncode, 0, done.stderr)
 
     def test_the_example_answers_every_class(self):

@@ -7,7 +7,7 @@ import unittest
 
 import fakes
 from registering import CLASSES, MODULE, PREFIX, SHARE, Register
-from support import LIBRARY, folder, snapshot_of
+from support import LIBRARY, directory, snapshot_of
 
 
 class WithoutObjectManager(Register):
@@ -61,7 +61,7 @@ class OpenPegasus(Register):
         self.assertEqual(snapshot_of(self.root), before)
 
     def test_a_new_library_is_taken_into_use(self):
-        prefix = folder() / "p"
+        prefix = directory() / "p"
         shutil.copytree(PREFIX, prefix, symlinks=True)
         manager = fakes.pegasus(self.root, up=True)
         self.register("install", prefix=prefix)
@@ -73,7 +73,7 @@ class OpenPegasus(Register):
         self.assertEqual(manager.calls(), [f"cimprovider -d -m {MODULE}", f"cimprovider -e -m {MODULE}"])
 
     def copy_of_the_prefix(self):
-        prefix = folder() / "p"
+        prefix = directory() / "p"
         shutil.copytree(PREFIX, prefix, symlinks=True)
         return prefix
 
@@ -130,7 +130,7 @@ class OpenPegasus(Register):
     def test_a_first_install_that_fails_takes_back_what_it_declared(self):
         for harm, said in [("schema", "CIM_ERR_INVALID_SUPERCLASS"), ("fail", "it cannot be done"), ("mute", "does not answer")]:
             with self.subTest(harm):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.pegasus(self.root, up=True)
                 manager.set(harm, {"schema": manager.get("schema").replace("CIM_ElementCapabilities ", ""),
                                    "fail": "cimmof -n root/PG_InterOp", "mute": "yes"}[harm])
@@ -142,7 +142,7 @@ class OpenPegasus(Register):
     def test_what_an_install_left_that_was_killed_goes_with_the_next_one_or_with_remove(self):
         for action in ("install", "remove"):
             with self.subTest(action):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.pegasus(self.root, up=True)
                 self.register("install")
                 shutil.rmtree(self.root / "state/instances")
@@ -156,7 +156,7 @@ class OpenPegasus(Register):
     def test_an_install_that_is_ended_by_a_signal_takes_back_what_it_declared(self):
         for number in (signal.SIGHUP, signal.SIGINT, signal.SIGTERM):
             with self.subTest(number.name):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.pegasus(self.root, up=True)
                 manager.set("signal", int(number))
                 said = self.register("install", status=1).stderr
@@ -175,9 +175,9 @@ class OpenPegasus(Register):
                 self.assertEqual(manager.calls(), [])
 
     def test_notes_hold_paths_of_any_bytes(self):
-        odd = os.fsdecode(os.fsencode(folder()) + b"/\xff")
+        odd = os.fsdecode(os.fsencode(directory()) + b"/\xff")
         os.mkdir(odd)
-        fakes.pegasus(self.root, up=True).set("any-folder", "yes")
+        fakes.pegasus(self.root, up=True).set("any-directory", "yes")
         self.register("--provider-dir", odd, "install")
         self.assertTrue(os.path.islink(f"{odd}/{LIBRARY}"))
         self.register("status")
@@ -204,7 +204,7 @@ class OpenPegasus(Register):
     def test_an_older_cim_schema_is_named_before_anything_is_changed(self):
         for harm in ("schema", "version"):
             with self.subTest(harm):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.pegasus(self.root, up=True)
                 manager.set(harm, "CIM_ManagedElement" if harm == "schema" else "2.21.0")
                 before = snapshot_of(self.root)
@@ -241,7 +241,7 @@ class OpenPegasus(Register):
         self.assertIn("had the new library taken into use", self.register("install", prefix=prefix).stdout)
         self.assertEqual(manager.calls(), [f"cimprovider -d -m {MODULE}", f"cimprovider -e -m {MODULE}"])
 
-    def test_the_folder_is_where_the_server_will_look(self):
+    def test_the_directory_is_where_the_server_will_look(self):
         manager = fakes.pegasus(self.root, up=False)
         (self.root / "opt/planned").mkdir(parents=True)
         manager.set("providerDir", "/opt/planned")
@@ -249,7 +249,7 @@ class OpenPegasus(Register):
         self.assertTrue((self.root / "opt/planned" / LIBRARY).is_symlink())
         self.assertFalse((self.root / self.link).is_symlink())
 
-    def test_no_folder_is_guessed(self):
+    def test_no_directory_is_guessed(self):
         fakes.pegasus(self.root, up=True, without=["cimconfig"])
         self.assertIn("name it with --provider-dir", self.register("install", status=1).stderr)
         self.assertFalse((self.root / self.link).is_symlink())
@@ -271,7 +271,7 @@ class OpenPegasus(Register):
         manager.set("home", home)
         return manager
 
-    def test_a_relative_folder_is_below_the_servers_own_home(self):
+    def test_a_relative_directory_is_below_the_servers_own_home(self):
         self.elsewhere(home="opt/tog-pegasus")
         self.register("install")
         self.assertTrue((self.root / "opt/tog-pegasus/lib" / LIBRARY).is_symlink())
@@ -281,7 +281,7 @@ class OpenPegasus(Register):
         self.register("install", PEGASUS_HOME="/opt/wbem")
         notes = (self.root / "var/lib/vk/registration/openpegasus").read_text(encoding="utf-8").splitlines()
         self.assertIn(f"home: {self.root}/opt/wbem", notes)
-        self.assertIn(f"folders: {self.root}/opt/wbem/bin", notes)
+        self.assertIn(f"directories: {self.root}/opt/wbem/bin", notes)
         self.assertIn("registered", self.register("status").stdout)
         self.assertIn("registered already", self.register("install").stdout)
         self.register("remove")
@@ -296,10 +296,10 @@ class OpenPegasus(Register):
         self.register("remove")
         self.assertEqual((manager.module, manager.classes), ("", []))
 
-    def test_a_named_folder_is_remembered(self):
+    def test_a_named_directory_is_remembered(self):
         manager = fakes.pegasus(self.root, up=True)
-        where = folder()
-        manager.set("any-folder", "yes")
+        where = directory()
+        manager.set("any-directory", "yes")
         self.register("--provider-dir", where, "install")
         self.register("install")
         self.assertTrue((where / LIBRARY).is_symlink())
@@ -364,7 +364,7 @@ class OpenPegasus(Register):
 
     def test_dry_run_changes_nothing(self):
         for up in (True, False):
-            self.root = folder()
+            self.root = directory()
             manager = fakes.pegasus(self.root, up=up)
             manager.calls()
             before = snapshot_of(self.root)
@@ -375,7 +375,7 @@ class OpenPegasus(Register):
 
     def test_dry_run_of_remove_says_what_it_would_do_and_changes_nothing(self):
         for up in (True, False):
-            self.root = folder()
+            self.root = directory()
             manager = fakes.pegasus(self.root, up=up)
             self.register("install")
             manager.calls()
@@ -395,7 +395,7 @@ class OpenPegasus(Register):
     def test_a_server_that_never_answers_is_stopped_again(self):
         for action in ("install", "remove"):
             with self.subTest(action):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.pegasus(self.root, up=False)
                 if action == "remove":
                     self.register("install")
@@ -415,7 +415,7 @@ class OpenPegasus(Register):
         self.assertFalse((self.root / "var/lib/vk").exists())
 
     def test_status_notices_what_keeps_a_registration_from_serving(self):
-        prefix = folder() / "p"
+        prefix = directory() / "p"
         shutil.copytree(PREFIX, prefix, symlinks=True)
         fakes.pegasus(self.root, up=True)
         mof = prefix / "share/vk-baseserver/vk-baseserver.mof"

@@ -7,7 +7,7 @@ import unittest
 
 import fakes
 from registering import PREFIX, Register
-from support import BUILD, LIBRARY, folder, run
+from support import BUILD, LIBRARY, directory, run
 
 
 class Library(Register):
@@ -64,23 +64,23 @@ class Library(Register):
         self.register("remove")
         self.assertFalse((self.root / "var/lib/vk").exists())
 
-    def test_a_named_provider_folder_wins(self):
-        fakes.pegasus(self.root, up=True).set("any-folder", "yes")
-        where = folder()
+    def test_a_named_provider_directory_wins(self):
+        fakes.pegasus(self.root, up=True).set("any-directory", "yes")
+        where = directory()
         self.register("--provider-dir", where, "install")
         self.assertTrue((where / LIBRARY).is_symlink())
         self.assertFalse((self.root / self.link).is_symlink())
         self.register("remove")
         self.assertFalse((where / LIBRARY).is_symlink())
 
-    def test_remove_takes_back_the_links_in_every_folder_that_was_named(self):
-        fakes.pegasus(self.root, up=True).set("any-folder", "yes")
+    def test_remove_takes_back_the_links_in_every_directory_that_was_named(self):
+        fakes.pegasus(self.root, up=True).set("any-directory", "yes")
         self.register("install")
-        where = folder()
+        where = directory()
         self.register("--provider-dir", where, "install")
         self.assertTrue((where / LIBRARY).is_symlink())
         (self.root / self.link).unlink()
-        self.register("status")  # the last folder counts
+        self.register("status")  # the last directory counts
         self.register("--provider-dir", self.root / "usr/lib64/Pegasus/providers", "install")
         self.register("remove")
         self.assertFalse((where / LIBRARY).is_symlink())
@@ -185,11 +185,11 @@ class Cimconfig(Register):
         self.assertTrue((self.root / "usr/sbin").is_dir())
 
     def test_never_leads_to_itself(self):
-        # As where / is the root: the link can be followed, and is found by both names of its folder.
+        # As where / is the root: the link can be followed, and is found by both names of its directory.
         self.make_kvm_guest()
         self.move_command_to_opt()
         (self.root / "sbin").symlink_to("usr/sbin")
-        home = folder()
+        home = directory()
         for where in (home / "bin", self.root / str(home / "bin").lstrip("/")):
             where.mkdir(parents=True)
             shutil.copy(self.root / "opt/tog-pegasus/bin/cimconfig", where)
@@ -205,7 +205,7 @@ class Cimconfig(Register):
                            ("sys/class/dmi/id/sys_vendor", "Example\n"), ("sys/class/dmi/id/product_name", "KVM\n"),
                            ("sys/class/dmi/id/product_name", "Not KVM\n")]:
             with self.subTest(text):
-                self.root = folder()
+                self.root = directory()
                 fakes.pegasus(self.root, up=True)
                 self.make_kvm_guest(file, text)
                 self.move_command_to_opt()

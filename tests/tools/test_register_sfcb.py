@@ -8,7 +8,7 @@ import unittest
 
 import fakes
 from registering import PREFIX, SHARE, Register
-from support import LIBRARY, folder, snapshot_of
+from support import LIBRARY, directory, snapshot_of
 
 BUILDING = [f"sfcbstage -n root/cimv2 -r {SHARE}/vk-baseserver.reg {SHARE}/vk-baseserver.mof", "sfcbrepos -f"]
 TAKING = ["sfcbunstage -n root/cimv2 -r vk-baseserver.reg vk-baseserver.mof", "sfcbrepos -f"]
@@ -36,7 +36,7 @@ class Sfcb(Register):
     def test_remove_takes_everything_back(self):
         for up in (True, False):
             with self.subTest(up):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.sfcb(self.root, up)
                 (self.root / "var/lib/sfcb/stage/regs").mkdir()
                 (self.root / "var/lib/sfcb/stage/mofs/root/cimv2").mkdir(parents=True)
@@ -56,7 +56,7 @@ class Sfcb(Register):
         self.register("remove")
         self.assertEqual(manager.staged, [])
 
-    def test_status_looks_into_the_servers_own_folders(self):
+    def test_status_looks_into_the_servers_own_directories(self):
         fakes.sfcb(self.root, up=True)
         self.register("install")
         shutil.rmtree(self.root / "var/lib/vk")
@@ -73,9 +73,9 @@ class Sfcb(Register):
         (registration / "providerRegister").write_text("", encoding="ascii")
         self.assertIn("is not registered", self.register("status", status=1).stdout)
 
-    def test_remove_takes_back_the_links_in_every_folder_that_was_named(self):
+    def test_remove_takes_back_the_links_in_every_directory_that_was_named(self):
         fakes.sfcb(self.root, up=True)
-        where = folder()
+        where = directory()
         self.register("install")
         self.register("--provider-dir", where, "install")
         self.register("install")
@@ -99,7 +99,7 @@ class Sfcb(Register):
         said = self.register("--dry-run", "install").stdout
         manager.calls()
         before, room = snapshot_of(self.root), said.index("sfcbstage")
-        with open(folder() / "output", "wb") as output:
+        with open(directory() / "output", "wb") as output:
             done = subprocess.run([PREFIX / "sbin/vk-provider-register", "--root", self.root, "--dry-run", "install"],
                                   stdout=output, stderr=subprocess.PIPE, check=False,
                                   preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (room, room)))
@@ -110,7 +110,7 @@ class Sfcb(Register):
     def test_a_failed_install_leaves_nothing_staged_and_the_repository_as_it_was(self):
         for harm in ("schema", "sfcbmofpp"):
             with self.subTest(harm):
-                self.root = folder()
+                self.root = directory()
                 manager = fakes.sfcb(self.root, up=True, without=[harm])
                 (self.root / "var/lib/sfcb/registration/providerRegister").write_text("[CIM_Default]\n", encoding="ascii")
                 manager.set("schema", "CIM_ManagedElement" if harm == "schema" else manager.get("schema"))
@@ -124,7 +124,7 @@ class Sfcb(Register):
         self.register("install")
         (self.root / "var/lib/sfcb/registration/repository/root/cimv2/an_instance").touch()
         before, register = snapshot_of(self.root / "var/lib/sfcb"), manager.register
-        prefix = folder() / "p"
+        prefix = directory() / "p"
         shutil.copytree(PREFIX, prefix, symlinks=True)
         mof = prefix / "share/vk-baseserver/vk-baseserver.mof"
         mof.write_text(mof.read_text(encoding="utf-8").replace(": CIM_ManagedElement", ": CIM_Gone"), encoding="utf-8")
@@ -180,7 +180,7 @@ class Sfcb(Register):
                       self.register("remove", status=1).stderr)
         self.assertEqual(len(manager.staged), 2)
 
-    def test_another_prefix_serves_with_its_own_commands_and_folders(self):
+    def test_another_prefix_serves_with_its_own_commands_and_directories(self):
         manager = fakes.sfcb(self.root, up=False)
         manager.move(["sfcbd"], "opt/sfcb/sbin")
         manager.move([name for name in manager.commands if name.startswith("sfcb") and name != "sfcbd"], "opt/sfcb/bin")

@@ -5,7 +5,7 @@ import re
 import unittest
 from pathlib import Path
 
-from support import BUILD, folder, install, run
+from support import BUILD, directory, install, run
 
 LIBRARIES = ["nvlog", "vkcommon", "vkproduct", "vkinstrumentation", "vkproviderutilities",
              "vknabaseserverprofileprovider"]
@@ -59,14 +59,14 @@ class SearchPath(unittest.TestCase):
         self.check(BUILD, self.names("lib"))
 
     def test_of_what_is_installed(self):
-        prefix = folder() / "installed"
+        prefix = directory() / "installed"
         install(prefix)
         self.check(prefix, self.names("lib"))
         for name in LIBRARIES:
             self.assertEqual(search_path(prefix / f"lib/lib{name}.so.1"), ["$ORIGIN", f"{prefix}/lib"])
 
     def test_of_what_is_installed_for_the_whole_system(self):
-        stage = folder()
+        stage = directory()
         install(Path("/usr"), destdir=stage)
         self.check(stage / "usr", self.names("lib"))
         for name in LIBRARIES:

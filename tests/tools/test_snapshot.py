@@ -6,7 +6,7 @@ import shutil
 import unittest
 
 from hosts import SNAPSHOT, make_host, properties, take
-from support import folder, run, snapshot_of
+from support import directory, run, snapshot_of
 
 
 class Plain(unittest.TestCase):
@@ -32,7 +32,7 @@ class Plain(unittest.TestCase):
         target, _ = take(make_host(**{"proc/sys/kernel/arch": b"s390x\n"}))
         self.assertEqual((target / "proc/sys/kernel/arch").read_bytes(), b"s390x\n")
 
-    def test_a_folder_that_holds_something_is_refused(self):
+    def test_a_directory_that_holds_something_is_refused(self):
         root = make_host()
         self.assertEqual(run(SNAPSHOT, "--root", root, root).returncode, 2)
         self.assertEqual(run(SNAPSHOT).returncode, 2)
@@ -41,7 +41,7 @@ class Plain(unittest.TestCase):
     def test_what_cannot_be_read_is_named(self):
         root = make_host()
         root.chmod(0o755)
-        target = folder()
+        target = directory()
         os.chown(target, 65534, 65534)
         (root / "sys/firmware/dmi/tables/DMI").chmod(0o400)
         done = run("setpriv", "--reuid=65534", "--regid=65534", "--clear-groups", SNAPSHOT, "--root", root, target)
@@ -51,7 +51,7 @@ class Plain(unittest.TestCase):
         self.assertIn("/sys/firmware/dmi/tables/DMI: Permission denied", done.stderr)
 
 
-class Folder(unittest.TestCase):
+class Directory(unittest.TestCase):
     """Where a snapshot is written to, and who can read it."""
 
     def refused(self, target, *said):
@@ -60,22 +60,22 @@ class Folder(unittest.TestCase):
         for text in said:
             self.assertIn(text, done.stderr)
 
-    @unittest.skipIf(os.geteuid() != 0, "takes root to give a folder to somebody else")
+    @unittest.skipIf(os.geteuid() != 0, "takes root to give a directory to somebody else")
     def test_somebody_elses_is_refused(self):
-        target = folder()
+        target = directory()
         os.chown(target, 65534, 65534)
         self.refused(target, f"{target} belongs to somebody else")
         self.assertEqual(list(target.iterdir()), [])
 
     def test_one_open_to_others_is_refused(self):
         for mode in (0o755, 0o750, 0o701, 0o733):
-            target = folder()
+            target = directory()
             target.chmod(mode)
             self.refused(target, f"{target} is open to others", "chmod 700")
             self.assertEqual((list(target.iterdir()), target.stat().st_mode & 0o777), ([], mode))
 
     def test_a_link_is_refused(self):
-        elsewhere, link = folder(), folder() / "link"
+        elsewhere, link = directory(), directory() / "link"
         link.symlink_to(elsewhere)
         self.refused(link, "link: Not a directory")
         self.refused(f"{link}/", "link: Not a directory")
@@ -84,7 +84,7 @@ class Folder(unittest.TestCase):
     def test_all_in_it_is_closed_to_others(self):
         root = make_host(**{"sys/class/dmi/id/product_name": b"RX200\n"})
         for parents, empty in [("copy", False), ("deep/copy", False), ("copy", True)]:
-            target = folder() / parents
+            target = directory() / parents
             if empty:
                 target.mkdir(mode=0o700)
             done = run("sh", "-c", 'umask 0; exec "$@"', "sh", SNAPSHOT, "--root", root, target)
@@ -101,8 +101,8 @@ class Folder(unittest.TestCase):
 
 
 class Failure(unittest.TestCase):
-    def test_a_root_that_is_no_folder_is_refused(self):
-        target = folder() / "copy"
+    def test_a_root_that_is_no_directory_is_refused(self):
+        target = directory() / "copy"
         for root in ("/nonexistent", SNAPSHOT):
             done = run(SNAPSHOT, "--root", root, target)
             self.assertEqual(done.returncode, 2)
@@ -112,7 +112,7 @@ class Failure(unittest.TestCase):
     def test_a_write_error_names_the_file_and_leaves_nothing(self):
         root = make_host(**{"etc/timezone": b"x" * 5000})
         for limit, name in [(0, "sys/firmware/dmi/tables/smbios_entry_point"), (4096, "etc/timezone")]:
-            for parent in (folder(), folder() / "deep"):
+            for parent in (directory(), directory() / "deep"):
                 before = snapshot_of(parent.parent if parent.name == "deep" else parent)
                 target = parent / "copy"
                 done = run(SNAPSHOT, "--root", root, target,
@@ -122,8 +122,8 @@ class Failure(unittest.TestCase):
                                               "nothing is left of the snapshot\n")
                 self.assertEqual(snapshot_of(parent.parent if parent.name == "deep" else parent), before)
 
-    def test_a_write_error_leaves_a_folder_that_was_there(self):
-        target = folder()
+    def test_a_write_error_leaves_a_directory_that_was_there(self):
+        target = directory()
         done = run(SNAPSHOT, "--root", make_host(), target,
                    preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (0, 0)))
         self.assertEqual((done.returncode, list(target.iterdir())), (1, []))
@@ -131,7 +131,7 @@ class Failure(unittest.TestCase):
     @unittest.skipUnless(shutil.which("strace"), "strace is not installed")
     def test_one_that_is_interrupted_leaves_nothing(self):
         for name in ("SIGHUP", "SIGINT", "SIGTERM"):
-            target = folder() / "copy"
+            target = directory() / "copy"
             done = run("strace", "-qq", "-o", "/dev/null", "-e", "trace=symlinkat", "-e", f"inject=symlinkat:signal={name}",
                        SNAPSHOT, "--root", make_host(), target)
             self.assertEqual((done.returncode, done.stderr),

@@ -22,10 +22,10 @@ class Masked(unittest.TestCase):
     def test_keeps_lengths_shapes_and_checksums(self):
         root = make_host()
         target, _ = take(root, "--mask")
-        folder_of_tables = "sys/firmware/dmi/tables"
-        before, after = ((r / folder_of_tables / "DMI").read_bytes() for r in (root, target))
+        directory_of_tables = "sys/firmware/dmi/tables"
+        before, after = ((r / directory_of_tables / "DMI").read_bytes() for r in (root, target))
         self.assertEqual(len(before), len(after))
-        point = (target / folder_of_tables / "smbios_entry_point").read_bytes()
+        point = (target / directory_of_tables / "smbios_entry_point").read_bytes()
         self.assertEqual(sum(point[:31]) & 0xFF, 0)
         self.assertEqual(sum(point[16:31]) & 0xFF, 0)
         self.assertRegex(properties(target, "VESKA_PhysicalPackage")["SerialNumber"], r"^[A-Z]{4}\d{4}$")

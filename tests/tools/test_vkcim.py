@@ -10,7 +10,7 @@ import time
 import unittest
 from pathlib import Path
 
-from support import BUILD, folder, run
+from support import BUILD, directory, run
 
 SOURCE = Path(__file__).resolve().parents[2]
 VKCIM = BUILD / "bin/vkcim"
@@ -69,7 +69,7 @@ class Completion(unittest.TestCase):
     """In bash itself, which splits the line its own way."""
 
     def complete(self, typed):
-        rc = folder() / "rc"
+        rc = directory() / "rc"
         rc.write_text(f". '{BUILD}/schema/vkcim.bash-completion'\nPS1='$ '\nbind 'set enable-bracketed-paste off'\n"
                       "bind 'set bell-style none'\n"
                       "vkcim() { printf '<%s>' \"$@\"; echo; }\n", encoding="utf-8")
@@ -103,7 +103,7 @@ class Help(unittest.TestCase):
             help_text = run(VKCIM, command, "--help").stdout
             example = re.search(r"^Example:\n  (vkcim .*)$", help_text, re.M).group(1)
             self.assertRegex(example, rf"\b{command}\b")
-            tree = folder() / "tree.json"
+            tree = directory() / "tree.json"
             tree.write_bytes((SOURCE / "docs/examples/rack-server.json").read_bytes())
             done = run("sh", "-c", example, env={**HOST, "VK_INSTRUMENTATION_TREE": str(tree)})
             with self.subTest(example):

@@ -20,13 +20,13 @@ std::string withProblem(const std::string& file, const Problem& problem) {
 }
 
 Finding hardware(const Root& root) {
-    Finding finding{"hardware tables", true, VK::Host::TABLES,
+    Finding finding{"hardware tables", true, VK::Host::tablesDirectory,
                     "VESKA_PhysicalPackage and the computer's UUID, model and serial number come from elsewhere, are "
                     "incomplete, or are missing"};
-    for (const std::string& table : {VK::Host::ENTRY_POINT, VK::Host::TABLE}) {
+    for (const std::string& table : {VK::Host::entryPointFile, VK::Host::tableFile}) {
         const Problem problem = problemOf(root, table);
         if (!problem) continue;
-        for (const std::string& other : {std::string("/proc/device-tree/model"), VK::Host::SYSINFO}) {
+        for (const std::string& other : {std::string("/proc/device-tree/model"), VK::Host::sysinfoFile}) {
             if (*problem != "not there" || isEmpty(root, other)) continue;
             finding.detail = other + ", in place of SMBIOS tables";
             return finding;
@@ -45,9 +45,9 @@ Finding readable(const Root& root, const std::string& name, const std::string& f
 }
 
 Finding timeZone(const Root& root) {
-    Problem problem = problemOf(root, VK::Zone::LOCAL_TIME);
-    if (!problem && !root.read(VK::Zone::LOCAL_TIME).text.starts_with("TZif")) problem = "no time zone file";
-    return {"time zone", !problem, withProblem(VK::Zone::LOCAL_TIME, problem), "the host's zone counts as UTC"};
+    Problem problem = problemOf(root, VK::Zone::localTimeFile);
+    if (!problem && !root.read(VK::Zone::localTimeFile).text.starts_with("TZif")) problem = "no time zone file";
+    return {"time zone", !problem, withProblem(VK::Zone::localTimeFile, problem), "the host's zone counts as UTC"};
 }
 
 Finding command(const Root& root, const std::string& name, const std::string& without) {
@@ -64,7 +64,7 @@ Finding ntpService(const Root& root) {
 
 Finding cimconfig(const Root& root) {
     const bool kvm = VK::Host::isKvmGuest(root, VK::Host::readHardware(root));
-    const std::string file = VK::Host::commandFolder(VK_ROOT_DIRECTORY, kvm) + "cimconfig";
+    const std::string file = VK::Host::commandDirectory(VK_ROOT_DIRECTORY, kvm) + "cimconfig";
     const bool found = isProgram(root, file);
     return {"cimconfig", found,
             file + (kvm ? " (a KVM guest's place)" : "") +
@@ -80,10 +80,10 @@ Finding rightToSetClock() {
 
 /// What was there before is kept in the other directory, which the provider makes when it is needed.
 Finding rightToChangeZone(const Root& root) {
-    const std::string both = "/etc and " + VK::Zone::ZoneMemory::FOLDER;
+    const std::string both = "/etc and " + VK::Zone::ZoneMemory::stateDirectory;
     const bool etc = mayWriteIn(root, "/etc");
-    const bool memory = mayWriteIn(root, VK::Zone::ZoneMemory::FOLDER);
-    const std::string closed = etc == memory ? both : etc ? VK::Zone::ZoneMemory::FOLDER : "/etc";
+    const bool memory = mayWriteIn(root, VK::Zone::ZoneMemory::stateDirectory);
+    const std::string closed = etc == memory ? both : etc ? VK::Zone::ZoneMemory::stateDirectory : "/etc";
     return {"right to change the zone", etc && memory, closed + (etc && memory ? " can" : " cannot") + " be written",
             "ManageTime cannot set the time, and AutomaticDSTAdjustment cannot be changed"};
 }
@@ -95,7 +95,7 @@ std::vector<Finding> findings(const Root& root) {
         hardware(root),
         readable(root, "machine id", "/etc/machine-id", "the host's unique identifier is made of its UUID, or missing"),
         timeZone(root),
-        readable(root, "time zones", VK::Zone::ZONE_DIRECTORY + "Etc/GMT",
+        readable(root, "time zones", VK::Zone::zoneDirectory + "Etc/GMT",
                  "an offset set by ManageTime becomes a file of its own, not a link to a zone that has a name"),
         command(root, "ps", "the NTP daemon always counts as not running"),
         command(root, "ntpd", "ManageTime sets the time and then fails, since the clock cannot be synchronised"),

@@ -51,10 +51,10 @@ bool isProgram(const Root& root, const std::string& path) {
 
 std::optional<std::string> findCommand(const Root& root, const std::string& name) {
     const char* const found = std::getenv("PATH");
-    std::string folders = found != nullptr ? found : "/usr/sbin:/usr/bin:/sbin:/bin";
-    for (folders += ':'; !folders.empty(); folders.erase(0, folders.find(':') + 1)) {
-        const std::string folder = folders.substr(0, folders.find(':'));
-        if (!folder.empty() && isProgram(root, folder + "/" + name)) return folder + "/" + name;
+    std::string directories = found != nullptr ? found : "/usr/sbin:/usr/bin:/sbin:/bin";
+    for (directories += ':'; !directories.empty(); directories.erase(0, directories.find(':') + 1)) {
+        const std::string directory = directories.substr(0, directories.find(':'));
+        if (!directory.empty() && isProgram(root, directory + "/" + name)) return directory + "/" + name;
     }
     return std::nullopt;
 }

@@ -23,9 +23,9 @@ class Cimconfig(Owner):
                 path = self.root + there if there.startswith("/") else os.path.join(os.path.dirname(path), there)
         return os.path.isfile(path) and os.access(path, os.X_OK)
 
-    def install(self, folders):
-        folder = f"{self.root}{'/usr/sbin' if self.is_kvm() else self.product.command_folder}"
-        place, found = f"{folder}/cimconfig", self.locate("cimconfig", folders, but_not=os.path.realpath(folder))
+    def install(self, directories):
+        directory = f"{self.root}{'/usr/sbin' if self.is_kvm() else self.product.command_directory}"
+        place, found = f"{directory}/cimconfig", self.locate("cimconfig", directories, but_not=os.path.realpath(directory))
         if not self.is_ours(place) and self.can_run(place):
             self.say(f"{place} is there already")
         elif found:
@@ -36,10 +36,10 @@ class Cimconfig(Owner):
             self.say("not found; VESKA_CIMServiceConfig will show 0 for its settings")
 
     def remove(self):
-        folder = f"{self.root}{self.product.command_folder}"
-        made = any(line.startswith(f"{folder}/cimconfig -> ") for line in self.read(".links"))
-        self.forget(f"{folder}/cimconfig")
+        directory = f"{self.root}{self.product.command_directory}"
+        made = any(line.startswith(f"{directory}/cimconfig -> ") for line in self.read(".links"))
+        self.forget(f"{directory}/cimconfig")
         if made and not self.options.dry_run:
             with contextlib.suppress(OSError):
                 for way in (".", "..", "../.."):
-                    os.rmdir(os.path.normpath(f"{folder}/{way}"))
+                    os.rmdir(os.path.normpath(f"{directory}/{way}"))

@@ -42,8 +42,8 @@ class CimServer(Manager):
     def find(self):
         given = os.environ.get("PEGASUS_HOME")
         home = self.root + os.path.abspath(given) if given else self.noted.get("home")
-        self.folders[:0] = [f"{home}/bin"] if given else []
-        self.folders += [f"{self.root}/opt/tog-pegasus/{kind}" for kind in ("bin", "sbin")]
+        self.directories[:0] = [f"{home}/bin"] if given else []
+        self.directories += [f"{self.root}/opt/tog-pegasus/{kind}" for kind in ("bin", "sbin")]
         if not super().find():
             return False
         self.home = home or os.path.dirname(os.path.dirname(os.path.realpath(self.command["cimserver"])))
@@ -56,8 +56,8 @@ class CimServer(Manager):
         """Never a guessed directory: only the server says where it looks."""
         answers = (self.ask("cimconfig", "-g", "providerDir", *planned)[1] for planned in ((), ("-p",)))
         said = next(filter(None, (match(r"^\w+ value: *(.+)", text) for text in answers)), "").split(":")
-        folders = filter(None, said)
-        return [self.root + folder if folder.startswith("/") else f"{self.home}/{folder}" for folder in folders]
+        directories = filter(None, said)
+        return [self.root + directory if directory.startswith("/") else f"{self.home}/{directory}" for directory in directories]
 
     def modules(self):
         """Each module's state by its name; none where the server does not run."""
@@ -66,9 +66,9 @@ class CimServer(Manager):
 
     def on_disk(self):
         """Whether a server that is down has the module in its repository; none where that is not seen."""
-        for folder in (f"{self.home}/repository", f"{self.root}/var/lib/Pegasus/repository"):
+        for directory in (f"{self.home}/repository", f"{self.root}/var/lib/Pegasus/repository"):
             with contextlib.suppress(OSError):
-                modules = Path(f"{folder}/root#PG_InterOp/instances/PG_ProviderModule.instances")
+                modules = Path(f"{directory}/root#PG_InterOp/instances/PG_ProviderModule.instances")
                 return self.product.module.encode() in modules.read_bytes()
         return None
 

@@ -27,11 +27,11 @@ class Manager(Owner):
         self.checksum, self.noted = digest(mof, self.registration), self.notes()
         self.ours = {name: text for text, name in re.findall(r"^(\[.*?^class (\w+).*?^\};)", mof, re.M | re.S)}
         home = os.path.dirname(os.path.dirname(self.noted.get("library-link", "")))  # an older version noted no more
-        self.folders = self.noted.get("folders", f"{home}/sbin:{home}/bin" if home else "").split(":")
+        self.directories = self.noted.get("directories", f"{home}/sbin:{home}/bin" if home else "").split(":")
 
     def find(self):
         """Whether it is there, with every command that makes it one."""
-        self.command = {name: self.locate(name, filter(None, self.folders)) for name in self.programs}
+        self.command = {name: self.locate(name, filter(None, self.directories)) for name in self.programs}
         return all(self.command[name] for name in self.programs[:3])
 
     def ask(self, program, *words):
@@ -50,8 +50,8 @@ class Manager(Owner):
     def link(self):
         """Where the server looks for the library: in the named directory, one that was named before, or its own."""
         named = self.options.provider_dir or self.noted.get("provider-dir")
-        folder = named or next(filter(os.path.isdir, self.looks_in()), None)
-        return f"{folder}/{self.product.link_name}" if folder else None
+        directory = named or next(filter(os.path.isdir, self.looks_in()), None)
+        return f"{directory}/{self.product.link_name}" if directory else None
 
     def require(self, link, newest, said=""):
         """What has to be there before anything is changed. NEWEST: the newest class as the server's schema has it."""
@@ -80,8 +80,8 @@ class Manager(Owner):
             link, replaced = self.link(), None
             self.prepare(link)
             before = self.is_registered()
-            folders = ":".join(dict.fromkeys(os.path.dirname(file) for file in self.command.values() if file))
-            self.note(home=self.home, folders=folders, provider_dir=self.options.provider_dir, library_link=link)
+            directories = ":".join(dict.fromkeys(os.path.dirname(file) for file in self.command.values() if file))
+            self.note(home=self.home, directories=directories, provider_dir=self.options.provider_dir, library_link=link)
             try:
                 if link:
                     replaced = self.put_link(link, self.product.library)

@@ -53,10 +53,10 @@ class OpenPegasus(CimServer):
         if known.classes and not self.options.dry_run:
             self.say(f"removed the classes from {self.product.namespace}")
 
-    def declare(self, folder):
+    def declare(self, directory):
         namespace = self.product.namespace
-        self.run("cimmof", "-n", namespace, f"{folder}/vk-baseserver.mof", done=f"declared the classes in {namespace}")
-        self.run("cimmof", "-n", INTEROP, f"{folder}/vk-baseserver-registration.mof", done=f"registered {self.what}")
+        self.run("cimmof", "-n", namespace, f"{directory}/vk-baseserver.mof", done=f"declared the classes in {namespace}")
+        self.run("cimmof", "-n", INTEROP, f"{directory}/vk-baseserver-registration.mof", done=f"registered {self.what}")
 
     def settle(self, state):
         """A module that the administrator stopped stays so. Any other has to answer a request now."""
@@ -107,10 +107,10 @@ class OpenPegasus(CimServer):
             self.clear(self.known())
             if not older.state:
                 return
-            with tempfile.TemporaryDirectory() as folder:
+            with tempfile.TemporaryDirectory() as directory:
                 for kind, texts in ("", older.classes.values()), ("-registration", map(without_state, older.instances)):
-                    Path(f"{folder}/vk-baseserver{kind}.mof").write_text("\n\n".join(texts), encoding="utf-8")
-                self.declare(folder)
+                    Path(f"{directory}/vk-baseserver{kind}.mof").write_text("\n\n".join(texts), encoding="utf-8")
+                self.declare(directory)
             if older.state == STOPPED:
                 self.disable()
             self.say("the older registration is back in force")

@@ -42,10 +42,10 @@ class Owner:
 
     # Commands.
 
-    def locate(self, name, folders=(), but_not=None):
+    def locate(self, name, directories=(), but_not=None):
         """The first command of that name in FOLDERS, where commands usually are, or on this host in PATH."""
-        folders = [folder for folder in [*folders, *self.usual] if os.path.realpath(folder) != but_not]
-        found = (os.path.abspath(f"{folder}/{name}") for folder in folders)
+        directories = [directory for directory in [*directories, *self.usual] if os.path.realpath(directory) != but_not]
+        found = (os.path.abspath(f"{directory}/{name}") for directory in directories)
         return next((file for file in found if os.path.isfile(file) and os.access(file, os.X_OK)), None)
 
     def call(self, *command):
@@ -109,7 +109,7 @@ class Owner:
 
     def put_link(self, link, target):
         """Replaces only what was made here, or led to another installation of our library; returns what it replaced."""
-        there, folder = os.readlink(link) if os.path.islink(link) else None, os.path.dirname(link)
+        there, directory = os.readlink(link) if os.path.islink(link) else None, os.path.dirname(link)
         if there == target:
             self.say(f"{link} links to {target} already")
             return None
@@ -119,8 +119,8 @@ class Owner:
             raise Failure(f"{link} links to {there}, which is not ours: not replaced")
         # Noted before it is made: what is noted and not there does no harm.
         self.write([*self.read(".links"), f"{link} -> {target}"], ".links")
-        if not os.path.isdir(folder):
-            self.run("mkdir", "-p", folder)
+        if not os.path.isdir(directory):
+            self.run("mkdir", "-p", directory)
         # At one stroke: a server that loads it at this moment finds the old one or the new one.
         self.run("ln", "-sfn", target, f"{link}.new")
         self.run("mv", "-fT", f"{link}.new", link, done=f"linked {link} to {target}")

@@ -23,14 +23,14 @@ class Sfcb(Manager):
     programs = ("sfcbd", "sfcbstage", "sfcbrepos", "sfcbunstage", "sfcbmofpp")
 
     def find(self):
-        self.folders += [f"{self.root}/opt/sfcb/{kind}" for kind in ("sbin", "bin")]
-        daemon = self.locate("sfcbd", filter(None, self.folders))
+        self.directories += [f"{self.root}/opt/sfcb/{kind}" for kind in ("sbin", "bin")]
+        daemon = self.locate("sfcbd", filter(None, self.directories))
         if not daemon:
             return False
         # The other commands lie beside the daemon, and call each other by their bare names.
         self.home = os.path.dirname(os.path.dirname(os.path.realpath(daemon)))
-        self.folders[:0] = [f"{self.home}/sbin", f"{self.home}/bin"]
-        self.env["PATH"] = ":".join([*self.folders[:2], os.environ.get("PATH", "")])
+        self.directories[:0] = [f"{self.home}/sbin", f"{self.home}/bin"]
+        self.env["PATH"] = ":".join([*self.directories[:2], os.environ.get("PATH", "")])
         if not super().find():
             return False
         stage = self.place("sfcbstage", "s", "var/lib/sfcb/stage")
@@ -48,7 +48,7 @@ class Sfcb(Manager):
         return match(rf"^\s*{key}\s*:(.*)", text.decode(errors="replace")) or default
 
     def looks_in(self):
-        named = [self.root + folder for folder in self.configured("providerDirs").split()]
+        named = [self.root + directory for directory in self.configured("providerDirs").split()]
         libs = ("lib64", "lib", self.product.multiarch)
         return named + [f"{self.home}/{lib}/{kind}" for kind in ("cmpi", "sfcb") for lib in libs]
 
@@ -163,4 +163,4 @@ class Sfcb(Manager):
     def by_hand(self):
         unstage = f"sfcbunstage -n {self.product.namespace} -r {' '.join(STAGED)}"
         return ("With the server stopped these commands take it back:\n    "
-                f"PATH={':'.join(self.folders[:2])}:$PATH; {unstage}; sfcbrepos -f")
+                f"PATH={':'.join(self.directories[:2])}:$PATH; {unstage}; sfcbrepos -f")

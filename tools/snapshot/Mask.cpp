@@ -46,12 +46,12 @@ bool isHexDigit(char c) {
 
 /// The 32 digits of what is a UUID in any of its shapes, in lower case; empty for other texts.
 std::string digitsOf(const std::string& text) {
-    constexpr std::string_view BETWEEN = "{}- \t\r\n\v\f";
+    constexpr std::string_view between = "{}- \t\r\n\v\f";
     std::string digits;
     for (const char c : VK::lowerCase(text)) {
         if (isHexDigit(c))
             digits += c;
-        else if (BETWEEN.find(c) == std::string_view::npos)
+        else if (between.find(c) == std::string_view::npos)
             return {};
     }
     return digits.size() == 32 ? digits : std::string();
@@ -77,10 +77,10 @@ std::string Mask::stream(std::string_view text, std::size_t count, unsigned int 
 }
 
 std::string Mask::name(const std::string& text) const {
-    constexpr unsigned int TURNS = 100; // a short text may be a filler or itself again
+    constexpr unsigned int turns = 100; // a short text may be a filler or itself again
     if (ruleOf(text) != nullptr) return onlyFiller(text);
     std::string masked = text;
-    for (unsigned int turn = 0; turn < TURNS && (masked == text || ruleOf(masked) != nullptr); ++turn) {
+    for (unsigned int turn = 0; turn < turns && (masked == text || ruleOf(masked) != nullptr); ++turn) {
         const std::string_view bare = VK::trimmed(text);
         const std::string bytes = stream(bare, bare.size(), turn);
         const auto begin = masked.begin() + (bare.data() - text.data());
@@ -91,10 +91,10 @@ std::string Mask::name(const std::string& text) const {
 }
 
 std::string Mask::serial(const std::string& text) {
-    constexpr std::size_t SHORTEST = 4; // a shorter one may stand anywhere by chance
+    constexpr std::size_t shortest = 4; // a shorter one may stand anywhere by chance
     std::string masked = name(text);
     const std::string_view bare = VK::trimmed(text);
-    if (masked != text && bare.size() >= SHORTEST) replaced[std::string(bare)] = VK::trimmed(masked);
+    if (masked != text && bare.size() >= shortest) replaced[std::string(bare)] = VK::trimmed(masked);
     return masked;
 }
 

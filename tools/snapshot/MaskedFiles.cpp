@@ -15,7 +15,7 @@ struct KnownFile {
 };
 
 // A file that the provider reads and that is not here is masked whole.
-constexpr KnownFile KNOWN[] = {
+constexpr KnownFile knownFiles[] = {
     {"smbios_entry_point", Content::EntryPoint},
     {"DMI", Content::Table},
     {"product_serial", Content::Serial},
@@ -81,9 +81,9 @@ std::string maskedText(Content content, const std::string& text, Mask& mask) {
 
 Content contentOf(std::string_view path) {
     const std::string_view name = path.substr(path.rfind('/') + 1);
-    const auto* const known =
-        std::find_if(std::begin(KNOWN), std::end(KNOWN), [name](const KnownFile& file) { return file.name == name; });
-    return known != std::end(KNOWN) ? known->content : Content::Unknown;
+    const auto* const known = std::find_if(std::begin(knownFiles), std::end(knownFiles),
+                                           [name](const KnownFile& file) { return file.name == name; });
+    return known != std::end(knownFiles) ? known->content : Content::Unknown;
 }
 
 std::string maskedSysinfo(std::string_view text, Mask& mask) {

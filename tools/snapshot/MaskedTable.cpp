@@ -13,14 +13,14 @@ using VK::Host::SmbiosVersion;
 
 namespace {
 
-constexpr unsigned int FIRMWARE = 0;
-constexpr unsigned int SYSTEM = 1;
-constexpr unsigned int BASE_BOARD = 2;
-constexpr unsigned int CHASSIS = 3;
-constexpr char END_OF_TABLE = 127;
-constexpr std::size_t HEADER = 4;
-constexpr std::size_t UUID = 0x08;
-constexpr std::size_t UUID_LENGTH = 16;
+constexpr unsigned int firmware = 0;
+constexpr unsigned int systemType = 1;
+constexpr unsigned int baseBoardType = 2;
+constexpr unsigned int chassis = 3;
+constexpr char endOfTable = 127;
+constexpr std::size_t header = 4;
+constexpr std::size_t uuidAt = 0x08;
+constexpr std::size_t uuidLength = 16;
 
 using Offsets = std::vector<std::size_t>;
 
@@ -38,13 +38,13 @@ Offsets range(Offsets offsets, std::size_t begin, std::size_t end) {
 
 Kept keptOf(const SmbiosStructure& structure) {
     switch (structure.type()) {
-    case FIRMWARE:
+    case firmware:
         return {{0x04, 0x05, 0x08}, {}, range({0x06, 0x07}, 0x09, 0x1A)};
-    case SYSTEM:
+    case systemType:
         return {{0x04, 0x05, 0x06, 0x19}, {0x07}, {0x18}};
-    case BASE_BOARD:
+    case baseBoardType:
         return {{0x04, 0x05}, {}, {}};
-    case CHASSIS: {
+    case chassis: {
         Kept kept{{0x04, 0x06}, {0x07, 0x08}, range(range({0x05}, 0x09, 0x0D), 0x11, 0x15)};
         // The elements contained stand before the last text.
         if (const auto size = structure.byteAt(0x14)) kept.texts.push_back(0x15 + *structure.byteAt(0x13) * *size);
@@ -55,7 +55,7 @@ Kept keptOf(const SmbiosStructure& structure) {
     }
 }
 
-/// The bytes of a UUID's text, in its order.
+/// The bytes of a uuidAt's text, in its order.
 std::string bytesOf(const std::string& uuid) {
     std::string bytes;
     for (std::size_t i = 0; i + 1 < uuid.size(); i += uuid[i] == '-' ? 1 : 2)
@@ -82,12 +82,12 @@ private:
         const std::size_t begin = masked.size();
         const std::size_t length = *structure.byteAt(1);
         const Kept kept = keptOf(structure);
-        masked.append(bytes, begin, HEADER).append(length - HEADER, '\0');
+        masked.append(bytes, begin, header).append(length - header, '\0');
         for (const Offsets& offsets : {kept.texts, kept.serials, kept.numbers})
             for (const std::size_t offset : offsets)
                 if (offset < length) masked[begin + offset] = bytes[begin + offset];
-        if (const auto uuid = structure.bytesAt(UUID, UUID_LENGTH); uuid && structure.type() == SYSTEM)
-            masked.replace(begin + UUID, UUID_LENGTH, maskedUuid(*uuid));
+        if (const auto uuid = structure.bytesAt(uuidAt, uuidLength); uuid && structure.type() == systemType)
+            masked.replace(begin + uuidAt, uuidLength, maskedUuid(*uuid));
         const std::string_view strings = structure.contents().second;
         addStrings(strings, numbersAt(structure, kept.texts), numbersAt(structure, kept.serials));
         masked.append(strings.empty() ? 2 : 1, '\0');
@@ -124,8 +124,8 @@ private:
             return;
         }
         // A table that is broken stays so, in the same way.
-        const bool isEnd = rest.front() == END_OF_TABLE;
-        const std::string_view kept = rest.substr(0, isEnd ? HEADER : 2);
+        const bool isEnd = rest.front() == endOfTable;
+        const std::string_view kept = rest.substr(0, isEnd ? header : 2);
         masked.append(kept).append(rest.size() - kept.size(), isEnd ? '\0' : 'x');
     }
 

@@ -13,7 +13,7 @@ namespace snapshot {
 
 namespace {
 
-constexpr mode_t FOR_OTHERS = 077;
+constexpr mode_t forOthers = 077;
 
 struct Arguments {
     std::string directory;
@@ -78,7 +78,7 @@ int run(const std::vector<std::string>& words, tools::Output output) {
     if (const std::optional<int> status = tools::parse(app, words, output)) return *status;
     if (!std::filesystem::is_directory(arguments.root))
         return tools::refuse(app, arguments.root + " is no directory", output);
-    umask(FOR_OTHERS);
+    umask(forOthers);
     signal(SIGXFSZ, SIG_IGN); // a file that becomes too large is an error like others
     catchInterruptions();
     try {

@@ -18,19 +18,19 @@ using Paths = std::vector<std::string>;
 
 namespace {
 
-const std::string HOST_NAME = "/etc/hostname";
-const std::string ARCHITECTURE = "/proc/sys/kernel/arch";
+const std::string hostNameFile = "/etc/hostname";
+const std::string architecture = "/proc/sys/kernel/arch";
 
 /// What the kernel answers for the running host; and what names the users of the host.
-const std::set<std::string> NEVER_COPIED = {HOST_NAME, ARCHITECTURE, "/run/utmp"};
+const std::set<std::string> neverCopied = {hostNameFile, architecture, "/run/utmp"};
 
 /// What is read when something else than the host is described: the product's identifier; changes of zone and clock.
 /// The last one names the board, for developers.
-const Paths ALSO_COPIED = {"/etc/machine-id", "/etc/timezone", "/etc/adjtime", "/proc/device-tree/compatible"};
+const Paths alsoCopied = {"/etc/machine-id", "/etc/timezone", "/etc/adjtime", "/proc/device-tree/compatible"};
 
 /// Each once, where it stands first.
 Paths unique(Paths paths) {
-    std::set<std::string> seen = NEVER_COPIED;
+    std::set<std::string> seen = neverCopied;
     std::erase_if(paths, [&seen](const std::string& path) { return !seen.insert(path).second; });
     return paths;
 }
@@ -49,7 +49,7 @@ Paths Snapshot::takeRecord(const std::function<void(const Root&)>& read) {
     const Root nothing(target.getPath(), true); // nothing is in it so far
     read(nothing.recordedIn(record));
     Paths files = record.read;
-    files.insert(files.end(), ALSO_COPIED.begin(), ALSO_COPIED.end());
+    files.insert(files.end(), alsoCopied.begin(), alsoCopied.end());
     files = unique(std::move(files));
     for (const std::string& path : unique(record.followed)) planFollowed(path, files);
     return files;
@@ -89,8 +89,8 @@ void Snapshot::take(const std::function<void(const Root&)>& read) {
 
 void Snapshot::writeAnswers() {
     const std::string name = options.hostName ? *options.hostName : VK::Host::hostName(root).value_or("");
-    write(HOST_NAME, name + "\n");
-    write(ARCHITECTURE, VK::architectureOf(root) + "\n");
+    write(hostNameFile, name + "\n");
+    write(architecture, VK::architectureOf(root) + "\n");
 }
 
 /// Nothing, too, for what is there and is no file.

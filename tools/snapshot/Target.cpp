@@ -13,8 +13,8 @@ namespace fs = std::filesystem;
 
 namespace {
 
-constexpr mode_t CLOSED_DIRECTORY = 0700;
-constexpr mode_t CLOSED_FILE = 0600;
+constexpr mode_t closedDirectory = 0700;
+constexpr mode_t closedFile = 0600;
 
 /// A final slash would follow a link.
 fs::path withoutFinalSlash(const fs::path& path) {
@@ -59,7 +59,7 @@ void Target::makeMissing(const fs::path& directory) {
     std::error_code error;
     if (directory.empty() || fs::symlink_status(directory, error).type() != fs::file_type::not_found) return;
     makeMissing(directory.parent_path());
-    if (mkdir(directory.c_str(), CLOSED_DIRECTORY) != 0) throw Failure(directory, errno);
+    if (mkdir(directory.c_str(), closedDirectory) != 0) throw Failure(directory, errno);
     made.push_back(directory);
 }
 
@@ -78,7 +78,7 @@ void Target::openItself() {
 void Target::write(const std::string& name, std::string_view bytes) {
     const int flags = O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW | O_CLOEXEC;
     const auto [parent, own] = split(name);
-    const VK::FileDescriptor file(openat(open(parent, name), own.c_str(), flags, CLOSED_FILE));
+    const VK::FileDescriptor file(openat(open(parent, name), own.c_str(), flags, closedFile));
     if (!file) fail(name);
     entries.push_back(name);
     if (!writeAll(file.get(), bytes)) fail(name);
@@ -96,7 +96,7 @@ int Target::open(const std::string& directory, const std::string& forName) {
     if (found != directories.end()) return found->second.get();
     const auto [above, own] = split(directory);
     const int parent = open(above, forName);
-    if (mkdirat(parent, own.c_str(), CLOSED_DIRECTORY) != 0) fail(forName);
+    if (mkdirat(parent, own.c_str(), closedDirectory) != 0) fail(forName);
     VK::FileDescriptor& fd = directories[directory];
     fd = openDirectory(parent, own);
     if (!fd) fail(forName);
@@ -110,8 +110,8 @@ void Target::fail(const std::string& name) const {
 bool Target::remove() {
     bool removed = true;
     const auto take = [&](const std::string& name, int flags) {
-        const auto [folder, own] = split(name);
-        removed = unlinkat(directories[folder].get(), own.c_str(), flags) == 0 && removed;
+        const auto [directory, own] = split(name);
+        removed = unlinkat(directories[directory].get(), own.c_str(), flags) == 0 && removed;
     };
     for (const std::string& name : entries) take(name, 0);
     // What stands in a directory comes behind it in the alphabet.

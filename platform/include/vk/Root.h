@@ -40,14 +40,14 @@ public:
     };
 
     /// How much is read of any file unless a caller says otherwise.
-    static constexpr std::size_t DEFAULT_LIMIT = std::size_t{1} << 20;
+    static constexpr std::size_t defaultLimit = std::size_t{1} << 20;
 
     /// The root at the directory `where`; a relative one is taken from the working directory of now. Where it cannot be
     /// reached, every operation answers why. `isSnapshot` says that a root at `/` is not to be taken for the running
     /// host.
     explicit Root(const std::string& where, bool isSnapshot = false);
 
-    /// The root of the process's host (vk/HostSource.h): the snapshot's folder, else `/`.
+    /// The root of the process's host (vk/HostSource.h): the snapshot's directory, else `/`.
     static const Root& host();
 
     /// The same root, noting in the record what it is asked for. As long as the record lives, and in one thread.
@@ -61,7 +61,7 @@ public:
 
     /// Reads a regular file from its start, at most `limit` bytes. Files of the kernel, which state no size, are read
     /// to their end too. Never waits: EISDIR for a directory, EINVAL for anything else that is no regular file.
-    Contents read(const std::string& path, std::size_t limit = DEFAULT_LIMIT) const;
+    Contents read(const std::string& path, std::size_t limit = defaultLimit) const;
 
     /// The target of a symbolic link as it is written there; EINVAL when the path is no link.
     Contents readLink(const std::string& path) const;

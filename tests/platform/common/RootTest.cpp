@@ -34,14 +34,14 @@ bool refuseOpenat2(int error) {
 
 class SnapshotRoot : public testing::Test {
 protected:
-    TemporaryDirectory folder;
-    Root root{folder.path()};
+    TemporaryDirectory directory;
+    Root root{directory.path()};
 };
 
 } // namespace
 
 TEST_F(SnapshotRoot, ReadsAFile) {
-    folder.write("etc/hostname", "node7\n");
+    directory.write("etc/hostname", "node7\n");
     const Root::Contents contents = root.read("/etc/hostname");
     EXPECT_TRUE(contents);
     EXPECT_EQ(contents.text, "node7\n");
@@ -50,13 +50,13 @@ TEST_F(SnapshotRoot, ReadsAFile) {
 }
 
 TEST_F(SnapshotRoot, ReadsAnEmptyFileAsSuccess) {
-    folder.write("etc/machine-id", "");
+    directory.write("etc/machine-id", "");
     EXPECT_TRUE(root.read("/etc/machine-id"));
     EXPECT_EQ(root.read("/etc/machine-id").text, "");
 }
 
 TEST_F(SnapshotRoot, RecordsWhatItIsAskedFor) {
-    folder.link("hostname", "etc/name");
+    directory.link("hostname", "etc/name");
     Root::Record record;
     const Root recording = root.recordedIn(record);
     recording.read("/etc/hostname");
@@ -70,24 +70,24 @@ TEST_F(SnapshotRoot, RecordsWhatItIsAskedFor) {
 
 TEST_F(SnapshotRoot, ReadsBytesAsTheyAre) {
     const std::string bytes("\0\xff\n\0", 4);
-    folder.write("DMI", bytes);
+    directory.write("DMI", bytes);
     EXPECT_EQ(root.read("/DMI").text, bytes);
 }
 
 TEST_F(SnapshotRoot, TellsWhyAFileCannotBeRead) {
-    folder.write("etc/file", "x");
+    directory.write("etc/file", "x");
     EXPECT_EQ(root.read("/etc/missing").error, ENOENT);
     EXPECT_EQ(root.read("/no/where").error, ENOENT);
     EXPECT_EQ(root.read("/etc").error, EISDIR);
     EXPECT_EQ(root.read("/etc/file/below").error, ENOTDIR);
     EXPECT_EQ(root.read(std::string("/etc/file\0x", 11)).error, EINVAL);
-    EXPECT_EQ(Root(folder.path() + "/none").read("/etc/file").error, ENOENT);
+    EXPECT_EQ(Root(directory.path() + "/none").read("/etc/file").error, ENOENT);
 }
 
 TEST_F(SnapshotRoot, TellsAForbiddenFileFromAMissingOne) {
-    folder.write("secret", "x");
-    chmod(folder.path().c_str(), 0755);
-    chmod(folder.path("secret").c_str(), 0);
+    directory.write("secret", "x");
+    chmod(directory.path().c_str(), 0755);
+    chmod(directory.path("secret").c_str(), 0);
     const std::string errors = support::inChild([this] {
         if (geteuid() == 0 && setuid(65534) != 0) return std::string("cannot become another user");
         return std::to_string(root.read("/secret").error) + " " + std::to_string(root.read("/none").error);
@@ -96,10 +96,10 @@ TEST_F(SnapshotRoot, TellsAForbiddenFileFromAMissingOne) {
 }
 
 TEST_F(SnapshotRoot, StaysInsideWithoutTheKernelsHelp) {
-    folder.write("passwd", "inside");
-    folder.link("../../../../../../passwd", "dots");
-    folder.link("/etc/made", "link");
-    folder.write("etc/other", "");
+    directory.write("passwd", "inside");
+    directory.link("../../../../../../passwd", "dots");
+    directory.link("/etc/made", "link");
+    directory.write("etc/other", "");
     for (const int error : {ENOSYS, EPERM}) {
         const std::string texts = support::inChild([this, error] {
             if (!refuseOpenat2(error)) return std::string("cannot refuse system calls");
@@ -117,16 +117,16 @@ TEST_F(SnapshotRoot, StaysInsideWithoutTheKernelsHelp) {
 }
 
 TEST_F(SnapshotRoot, NeverWaitsForAFifo) {
-    ASSERT_EQ(mkfifo((folder.path() + "/fifo").c_str(), 0600), 0);
+    ASSERT_EQ(mkfifo((directory.path() + "/fifo").c_str(), 0600), 0);
     EXPECT_EQ(root.read("/fifo").error, EINVAL);
 }
 
 TEST_F(SnapshotRoot, ReadsAtMostTheLimit) {
-    folder.write("big", std::string(Root::DEFAULT_LIMIT + 5, 'x'));
-    folder.write("exact", std::string(Root::DEFAULT_LIMIT, 'x'));
-    EXPECT_EQ(root.read("/big").text.size(), Root::DEFAULT_LIMIT);
+    directory.write("big", std::string(Root::defaultLimit + 5, 'x'));
+    directory.write("exact", std::string(Root::defaultLimit, 'x'));
+    EXPECT_EQ(root.read("/big").text.size(), Root::defaultLimit);
     EXPECT_TRUE(root.read("/big").truncated);
-    EXPECT_EQ(root.read("/exact").text.size(), Root::DEFAULT_LIMIT);
+    EXPECT_EQ(root.read("/exact").text.size(), Root::defaultLimit);
     EXPECT_FALSE(root.read("/exact").truncated);
     EXPECT_EQ(root.read("/big", 3).text, "xxx");
     EXPECT_EQ(root.read("/big", 0).text, "");
@@ -134,8 +134,8 @@ TEST_F(SnapshotRoot, ReadsAtMostTheLimit) {
 }
 
 TEST_F(SnapshotRoot, TakesAbsoluteLinksInsideTheRoot) {
-    folder.write("usr/share/zoneinfo/Europe/Berlin", "TZif");
-    folder.link("/usr/share/zoneinfo/Europe/Berlin", "etc/localtime");
+    directory.write("usr/share/zoneinfo/Europe/Berlin", "TZif");
+    directory.link("/usr/share/zoneinfo/Europe/Berlin", "etc/localtime");
     EXPECT_EQ(root.read("/etc/localtime").text, "TZif");
     EXPECT_EQ(root.readLink("/etc/localtime").text, "/usr/share/zoneinfo/Europe/Berlin");
     EXPECT_EQ(root.resolve("/etc/localtime").text, "/usr/share/zoneinfo/Europe/Berlin");
@@ -144,45 +144,45 @@ TEST_F(SnapshotRoot, TakesAbsoluteLinksInsideTheRoot) {
 TEST_F(SnapshotRoot, NeverLeavesTheRoot) {
     TemporaryDirectory outside;
     outside.write("passwd", "outside");
-    folder.write("passwd", "inside");
-    folder.link("../../../../../../../../../../passwd", "dots");
-    folder.link(outside.path() + "/passwd", "absolute");
-    folder.link(outside.path(), "folder");
+    directory.write("passwd", "inside");
+    directory.link("../../../../../../../../../../passwd", "dots");
+    directory.link(outside.path() + "/passwd", "absolute");
+    directory.link(outside.path(), "directory");
     EXPECT_EQ(root.read("/../../../../passwd").text, "inside");
     EXPECT_EQ(root.read("/dots").text, "inside");
     EXPECT_EQ(root.read("/absolute").error, ENOENT);
-    EXPECT_EQ(root.read("/folder/passwd").error, ENOENT);
+    EXPECT_EQ(root.read("/directory/passwd").error, ENOENT);
 }
 
 TEST_F(SnapshotRoot, GivesUpOnLinksThatGoRound) {
-    folder.link("b", "a");
-    folder.link("a", "b");
+    directory.link("b", "a");
+    directory.link("a", "b");
     EXPECT_EQ(root.read("/a").error, ELOOP);
     EXPECT_EQ(root.resolve("/a").error, ELOOP);
     EXPECT_TRUE(root.readLink("/a"));
 }
 
 TEST_F(SnapshotRoot, ReadsTheTargetOfABrokenLink) {
-    folder.link("../gone", "link");
+    directory.link("../gone", "link");
     EXPECT_EQ(root.readLink("/link").text, "../gone");
     EXPECT_FALSE(root.exists("/link"));
     EXPECT_EQ(root.resolve("/link").error, ENOENT);
-    folder.write("file", "x");
+    directory.write("file", "x");
     EXPECT_EQ(root.readLink("/file").error, EINVAL);
     EXPECT_EQ(root.readLink("/none").error, ENOENT);
 }
 
 TEST_F(SnapshotRoot, ListsADirectoryInOrder) {
-    folder.write("edac/mc1/ue_count", "0");
-    folder.write("edac/mc0/ue_count", "0");
-    folder.write("edac/uevent", "");
+    directory.write("edac/mc1/ue_count", "0");
+    directory.write("edac/mc0/ue_count", "0");
+    directory.write("edac/uevent", "");
     EXPECT_THAT(root.list("/edac").names, ElementsAre("mc0", "mc1", "uevent"));
     EXPECT_EQ(root.list("/none").error, ENOENT);
     EXPECT_EQ(root.list("/edac/uevent").error, ENOTDIR);
 }
 
 TEST_F(SnapshotRoot, ChecksWhetherSomethingExists) {
-    folder.write("etc/file", "x");
+    directory.write("etc/file", "x");
     EXPECT_TRUE(root.exists("/etc/file"));
     EXPECT_TRUE(root.exists("/etc"));
     EXPECT_TRUE(root.exists("/"));
@@ -190,8 +190,8 @@ TEST_F(SnapshotRoot, ChecksWhetherSomethingExists) {
 }
 
 TEST_F(SnapshotRoot, OpensForWritingBelowTheRootOnly) {
-    folder.link("/etc/made", "link");
-    folder.write("etc/other", "");
+    directory.link("/etc/made", "link");
+    directory.write("etc/other", "");
     const int fd = root.open("/link", O_WRONLY | O_CREAT, 0640);
     ASSERT_GE(fd, 0);
     EXPECT_EQ(fcntl(fd, F_GETFD) & FD_CLOEXEC, FD_CLOEXEC);
@@ -202,8 +202,8 @@ TEST_F(SnapshotRoot, OpensForWritingBelowTheRootOnly) {
 }
 
 TEST_F(SnapshotRoot, LeavesNoDescriptorOpen) {
-    folder.write("etc/file", "x");
-    folder.link("/etc/file", "link");
+    directory.write("etc/file", "x");
+    directory.link("/etc/file", "link");
     const auto openDescriptors = [] { return Root("/").list("/proc/self/fd").names.size(); };
     const std::size_t before = openDescriptors();
     root.read("/link");
@@ -229,18 +229,18 @@ TEST(LiveRoot, IsAlsoMeantByOtherSpellings) {
 }
 
 TEST(LiveRoot, ResolvesLinks) {
-    TemporaryDirectory folder;
-    folder.write("file", "x");
-    folder.link("file", "link");
+    TemporaryDirectory directory;
+    directory.write("file", "x");
+    directory.link("file", "link");
     const Root root("/");
-    EXPECT_EQ(root.resolve(folder.path() + "/link").text, root.resolve(folder.path() + "/file").text);
+    EXPECT_EQ(root.resolve(directory.path() + "/link").text, root.resolve(directory.path() + "/file").text);
 }
 
 TEST(RelativeRoot, IsTakenFromTheWorkingDirectoryOfItsMaking) {
-    TemporaryDirectory folder;
-    folder.write("host/etc/hostname", "node7");
+    TemporaryDirectory directory;
+    directory.write("host/etc/hostname", "node7");
     const int before = open(".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    ASSERT_EQ(chdir(folder.path().c_str()), 0);
+    ASSERT_EQ(chdir(directory.path().c_str()), 0);
     const Root root("host");
     ASSERT_EQ(fchdir(before), 0);
     close(before);

@@ -13,9 +13,9 @@ using VK::RootWalk;
 
 namespace {
 
-/// What a file of the folder holds, or the walk's errno value as text.
-std::string readByWalking(const std::string& folder, const std::string& path) {
-    RootWalk walk(FileDescriptor(open(folder.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
+/// What a file of the directory holds, or the walk's errno value as text.
+std::string readByWalking(const std::string& directory, const std::string& path) {
+    RootWalk walk(FileDescriptor(open(directory.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
     if (const int error = walk.walk(path, true); error != 0) return std::to_string(error);
     const FileDescriptor fd(walk.open(O_RDONLY, 0));
     std::array<char, 64> text{};
@@ -26,52 +26,52 @@ std::string readByWalking(const std::string& folder, const std::string& path) {
 } // namespace
 
 TEST(RootWalk, FollowsLinksInsideTheRoot) {
-    TemporaryDirectory folder;
-    folder.write("a/b/file", "inside");
-    folder.link("/a/b", "absolute");
-    folder.link("../a/b", "a/relative");
-    folder.link("../../../../a/b/file", "a/b/dots");
+    TemporaryDirectory directory;
+    directory.write("a/b/file", "inside");
+    directory.link("/a/b", "absolute");
+    directory.link("../a/b", "a/relative");
+    directory.link("../../../../a/b/file", "a/b/dots");
     for (const std::string path : {"/a/b/file", "a//b/./file", "/absolute/file", "/a/relative/file", "/a/b/dots",
                                    "/a/b/../../a/b/file", "/../../a/b/file", "/absolute/../b/file"})
-        EXPECT_EQ(readByWalking(folder.path(), path), "inside") << path;
+        EXPECT_EQ(readByWalking(directory.path(), path), "inside") << path;
 }
 
 TEST(RootWalk, TellsWhyItCannotGoOn) {
-    TemporaryDirectory folder;
-    folder.write("file", "x");
-    folder.link("loop", "loop");
-    folder.link("/etc/passwd", "outside");
-    EXPECT_EQ(readByWalking(folder.path(), "/none"), std::to_string(ENOENT));
-    EXPECT_EQ(readByWalking(folder.path(), "/none/file"), std::to_string(ENOENT));
-    EXPECT_EQ(readByWalking(folder.path(), "/file/more"), std::to_string(ENOTDIR));
-    EXPECT_EQ(readByWalking(folder.path(), "/file/"), std::to_string(ENOTDIR));
-    EXPECT_EQ(readByWalking(folder.path(), "/loop"), std::to_string(ELOOP));
-    EXPECT_EQ(readByWalking(folder.path(), "/outside"), std::to_string(ENOENT));
+    TemporaryDirectory directory;
+    directory.write("file", "x");
+    directory.link("loop", "loop");
+    directory.link("/etc/passwd", "outside");
+    EXPECT_EQ(readByWalking(directory.path(), "/none"), std::to_string(ENOENT));
+    EXPECT_EQ(readByWalking(directory.path(), "/none/file"), std::to_string(ENOENT));
+    EXPECT_EQ(readByWalking(directory.path(), "/file/more"), std::to_string(ENOTDIR));
+    EXPECT_EQ(readByWalking(directory.path(), "/file/"), std::to_string(ENOTDIR));
+    EXPECT_EQ(readByWalking(directory.path(), "/loop"), std::to_string(ELOOP));
+    EXPECT_EQ(readByWalking(directory.path(), "/outside"), std::to_string(ENOENT));
 }
 
 TEST(RootWalk, StandsOnALinkThatItIsNotToFollow) {
-    TemporaryDirectory folder;
-    folder.link("gone", "link");
-    RootWalk walk(FileDescriptor(open(folder.path().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
+    TemporaryDirectory directory;
+    directory.link("gone", "link");
+    RootWalk walk(FileDescriptor(open(directory.path().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
     EXPECT_EQ(walk.walk("/link", false), 0);
     EXPECT_EQ(walk.path(), "/link");
 }
 
 TEST(RootWalk, MakesAMissingLastName) {
-    TemporaryDirectory folder;
-    folder.write("a/other", "");
-    folder.link("a/made", "link");
-    RootWalk walk(FileDescriptor(open(folder.path().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
+    TemporaryDirectory directory;
+    directory.write("a/other", "");
+    directory.link("a/made", "link");
+    RootWalk walk(FileDescriptor(open(directory.path().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
     EXPECT_EQ(walk.walk("/link", true), ENOENT);
     EXPECT_TRUE(walk.onlyLastNameIsMissing());
     const FileDescriptor fd(walk.open(O_WRONLY | O_CREAT, 0640));
     EXPECT_TRUE(fd);
-    EXPECT_EQ(readByWalking(folder.path(), "/a/made"), "");
+    EXPECT_EQ(readByWalking(directory.path(), "/a/made"), "");
 }
 
-TEST(RootWalk, OffersToMakeNothingBelowAMissingFolder) {
-    TemporaryDirectory folder;
-    RootWalk walk(FileDescriptor(open(folder.path().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
+TEST(RootWalk, OffersToMakeNothingBelowAMissingDirectory) {
+    TemporaryDirectory directory;
+    RootWalk walk(FileDescriptor(open(directory.path().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)));
     EXPECT_EQ(walk.walk("/none/file", true), ENOENT);
     EXPECT_FALSE(walk.onlyLastNameIsMissing());
 }

@@ -7,10 +7,10 @@ namespace VK::Host {
 namespace {
 
 TEST(ChassisType, HasThePackageTypeOfItsKind) {
-    constexpr unsigned int EXPECTED[] = {0, 4, 0, 1, 1, 1, 1, 1, 4, 4, 4, 4, 4, 4, 4, 4, 4, 1, 1, 1,
+    constexpr unsigned int expected[] = {0, 4, 0, 1, 1, 1, 1, 1, 4, 4, 4, 4, 4, 4, 4, 4, 4, 1, 1, 1,
                                          1, 1, 1, 2, 1, 1, 1, 1, 3, 1, 4, 4, 4, 4, 4, 4, 4, 0, 0};
-    for (ChassisType type = 0; type < sizeof EXPECTED / sizeof *EXPECTED; ++type)
-        EXPECT_EQ(packageType(type), EXPECTED[type]) << type;
+    for (ChassisType type = 0; type < sizeof expected / sizeof *expected; ++type)
+        EXPECT_EQ(packageType(type), expected[type]) << type;
     EXPECT_EQ(packageType(4294967295), 0U);
 }
 

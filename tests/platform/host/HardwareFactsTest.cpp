@@ -27,8 +27,8 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-const std::string UUID_BYTES = "\x33\x22\x11\x00\x55\x44\x77\x66\x88\x99\xAA\xBB\xCC\xDD\xEE\xFF"s;
-constexpr const char* UUID = "00112233-4455-6677-8899-aabbccddeeff";
+const std::string uuidBytes = "\x33\x22\x11\x00\x55\x44\x77\x66\x88\x99\xAA\xBB\xCC\xDD\xEE\xFF"s;
+constexpr const char* uuidText = "00112233-4455-6677-8899-aabbccddeeff";
 
 class HardwareFactsTest : public testing::Test {
 protected:
@@ -40,7 +40,7 @@ protected:
 
 TEST_F(HardwareFactsTest, ComeFromTheTables) {
     SmbiosImage(3, 2)
-        .add(SmbiosSystemImage{"Veska", "VS 200", "A1", "CZ1234", "P0815", UUID_BYTES})
+        .add(SmbiosSystemImage{"Veska", "VS 200", "A1", "CZ1234", "P0815", uuidBytes})
         .add(SmbiosChassisImage{23, "Veska Boxes", "V1", "C1", "S1", 3, 4, 3})
         .writeTo(host);
     host.write("sys/class/dmi/id/sys_vendor", "Somebody else\n");
@@ -51,7 +51,7 @@ TEST_F(HardwareFactsTest, ComeFromTheTables) {
     EXPECT_EQ(facts.model.text, "VS 200");
     EXPECT_EQ(facts.serial.text, "CZ1234");
     EXPECT_EQ(facts.sku.text, "P0815");
-    EXPECT_EQ(facts.uuid.text, UUID);
+    EXPECT_EQ(facts.uuid.text, uuidText);
     ASSERT_EQ(facts.chassis.size(), 1U);
     EXPECT_EQ(facts.chassis[0].manufacturer.text, "Veska Boxes");
     EXPECT_EQ(facts.chassis[0].serial.text, "C1");
@@ -110,7 +110,7 @@ TEST_F(HardwareFactsTest, WithoutTablesTheKernelTells) {
     EXPECT_EQ(facts.model.text, "VS 200");
     EXPECT_EQ(facts.serial.text, "CZ1234");
     EXPECT_EQ(facts.sku.text, "P0815");
-    EXPECT_EQ(facts.uuid.text, UUID);
+    EXPECT_EQ(facts.uuid.text, uuidText);
     ASSERT_EQ(facts.chassis.size(), 1U);
     EXPECT_EQ(facts.chassis[0].manufacturer.text, "Boxes");
     EXPECT_EQ(facts.chassis[0].type, 23U); // 151 without the lock bit
@@ -126,7 +126,7 @@ TEST_F(HardwareFactsTest, ADeviceTreeTells) {
     const HardwareFacts facts = read();
     EXPECT_EQ(facts.model.text, "Board Mk 2");
     EXPECT_EQ(facts.serial.text, "100000001234");
-    EXPECT_EQ(facts.uuid.text, UUID);
+    EXPECT_EQ(facts.uuid.text, uuidText);
     EXPECT_EQ(facts.chassis.at(0).type, 17U);
 }
 
@@ -138,7 +138,7 @@ TEST_F(HardwareFactsTest, S390AndXenTell) {
     EXPECT_EQ(facts.manufacturer.text, "IBM");
     EXPECT_EQ(facts.model.text, "2964 701 N63");
     EXPECT_EQ(facts.serial.text, "00000000000AB1C7");
-    EXPECT_EQ(facts.uuid.text, UUID);
+    EXPECT_EQ(facts.uuid.text, uuidText);
     ASSERT_EQ(facts.chassis.size(), 1U);
     EXPECT_EQ(facts.chassis[0].manufacturer.text, "IBM");
     EXPECT_EQ(facts.chassis[0].type, 0U);
@@ -199,11 +199,11 @@ SmbiosImage withBoard(const SmbiosSystemImage& system, const char* manufacturer,
     return SmbiosImage(3, 2).add(system).add(SmbiosStructureImage(2, 8).text(4, manufacturer).text(5, product));
 }
 
-const SmbiosSystemImage LEFT_AS_IT_CAME{
+const SmbiosSystemImage leftAsItCame{
     "To Be Filled By O.E.M.", "System Product Name", "System Version", "System Serial Number", "SKU", {}};
 
 TEST_F(HardwareFactsTest, ABoardThatIsSoldAloneTellsModelAndManufacturer) {
-    withBoard(LEFT_AS_IT_CAME, "ASRockRack", "X570D4U").writeTo(host);
+    withBoard(leftAsItCame, "ASRockRack", "X570D4U").writeTo(host);
     EXPECT_EQ(read().model.text, "X570D4U");
     EXPECT_EQ(read().manufacturer.text, "ASRockRack");
     EXPECT_EQ(Tree::hostNodes(read()).front().description, "ASRockRack X570D4U");
@@ -224,7 +224,7 @@ TEST_F(HardwareFactsTest, TheBoardIsNotAskedWhereTheSystemTellsItsMaker) {
 }
 
 TEST_F(HardwareFactsTest, ABoardWithoutProductTellsNoManufacturerEither) {
-    withBoard(LEFT_AS_IT_CAME, "ASRockRack", "Base Board Product Name").writeTo(host);
+    withBoard(leftAsItCame, "ASRockRack", "Base Board Product Name").writeTo(host);
     EXPECT_EQ(read().model.text, "");
     EXPECT_EQ(read().manufacturer.text, "");
     EXPECT_EQ(read().manufacturer.useless, "To Be Filled By O.E.M.");

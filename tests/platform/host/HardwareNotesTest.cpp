@@ -19,8 +19,8 @@ using testing::Each;
 using testing::HasSubstr;
 using testing::Not;
 
-const std::string ENTRY_POINT = "/sys/firmware/dmi/tables/smbios_entry_point";
-const std::string TABLE = "/sys/firmware/dmi/tables/DMI";
+const std::string entryPointFile = "/sys/firmware/dmi/tables/smbios_entry_point";
+const std::string tableFile = "/sys/firmware/dmi/tables/DMI";
 
 class HostNotes : public testing::Test {
 protected:
@@ -44,40 +44,41 @@ TEST_F(HostNotes, SayThatTheFirmwareHasNoTablesOnlyWithoutTheirDirectory) {
 }
 
 TEST_F(HostNotes, NameTheTableThatIsMissing) {
-    host.write(ENTRY_POINT.substr(1), image.entryPoint());
-    EXPECT_THAT(notes(),
-                AllOf(Contains("no SMBIOS tables: " + TABLE + " is missing"),
-                      Contains("no UUID: " + TABLE + " is missing"), Contains("no chassis: " + TABLE + " is missing")));
+    host.write(entryPointFile.substr(1), image.entryPoint());
+    EXPECT_THAT(notes(), AllOf(Contains("no SMBIOS tables: " + tableFile + " is missing"),
+                               Contains("no UUID: " + tableFile + " is missing"),
+                               Contains("no chassis: " + tableFile + " is missing")));
 }
 
 TEST_F(HostNotes, NameTheTableThatIsEmpty) {
-    host.write(ENTRY_POINT.substr(1), image.entryPoint());
-    host.write(TABLE.substr(1), "");
-    EXPECT_THAT(notes(), AllOf(Contains(TABLE + ": table is empty"),
-                               Contains("no UUID: " + TABLE + " is damaged: table is empty"),
-                               Contains("no chassis: " + TABLE + " is damaged: table is empty")));
+    host.write(entryPointFile.substr(1), image.entryPoint());
+    host.write(tableFile.substr(1), "");
+    EXPECT_THAT(notes(), AllOf(Contains(tableFile + ": table is empty"),
+                               Contains("no UUID: " + tableFile + " is damaged: table is empty"),
+                               Contains("no chassis: " + tableFile + " is damaged: table is empty")));
 }
 
 TEST_F(HostNotes, NameTheEntryPointThatIsMissing) {
-    host.write(TABLE.substr(1), image.table());
-    EXPECT_THAT(notes(), Contains("no SMBIOS tables: " + ENTRY_POINT + " is missing"));
+    host.write(tableFile.substr(1), image.table());
+    EXPECT_THAT(notes(), Contains("no SMBIOS tables: " + entryPointFile + " is missing"));
 }
 
 TEST_F(HostNotes, BlameTheEntryPointForItsChecksum) {
     image.writeTo(host);
     std::string damaged = image.entryPoint();
     damaged[5] = static_cast<char>(damaged[5] + 1);
-    host.write(ENTRY_POINT.substr(1), damaged);
-    EXPECT_THAT(notes(), AllOf(Contains(ENTRY_POINT + ": entry point's checksum is wrong"),
-                               Contains("no UUID: " + ENTRY_POINT + " is damaged: entry point's checksum is wrong"),
-                               Contains("no chassis: " + ENTRY_POINT + " is damaged: entry point's checksum is wrong"),
-                               Each(Not(HasSubstr("DMI")))));
+    host.write(entryPointFile.substr(1), damaged);
+    EXPECT_THAT(notes(),
+                AllOf(Contains(entryPointFile + ": entry point's checksum is wrong"),
+                      Contains("no UUID: " + entryPointFile + " is damaged: entry point's checksum is wrong"),
+                      Contains("no chassis: " + entryPointFile + " is damaged: entry point's checksum is wrong"),
+                      Each(Not(HasSubstr("DMI")))));
 }
 
 TEST_F(HostNotes, DoNotSayThatTheHostHasNoneOfWhatStandsBehindAFault) {
     SmbiosImage broken(3, 2);
     broken.addRaw("\x01\x02\0\0\0\0"s).writeTo(host);
-    const std::string why = TABLE + " is damaged: structure shorter than 4 bytes at byte 0";
+    const std::string why = tableFile + " is damaged: structure shorter than 4 bytes at byte 0";
     EXPECT_THAT(notes(), AllOf(Contains("no UUID: " + why), Contains("no serial number: " + why),
                                Contains("no model: " + why), Contains("no chassis: " + why)));
 }

@@ -23,7 +23,7 @@ struct Row {
     const char* text;
 };
 
-constexpr Row SAY_NOTHING[] = {
+constexpr Row sayNothing[] = {
 #define SAYS_NOTHING(KIND, TEXT) {FirmwareText::KIND, TEXT},
 #define SAYS_SOMETHING(KIND, TEXT)
 #include "support/FirmwareTexts.inc"
@@ -31,7 +31,7 @@ constexpr Row SAY_NOTHING[] = {
 #undef SAYS_SOMETHING
 };
 
-constexpr Row SAY_SOMETHING[] = {
+constexpr Row saySomething[] = {
 #define SAYS_NOTHING(KIND, TEXT)
 #define SAYS_SOMETHING(KIND, TEXT) {FirmwareText::KIND, TEXT},
 #include "support/FirmwareTexts.inc"
@@ -40,18 +40,18 @@ constexpr Row SAY_SOMETHING[] = {
 };
 
 TEST(Placeholder, IsSeenThrough) {
-    for (const Row& row : SAY_NOTHING) EXPECT_TRUE(isPlaceholder(row.text, row.kind)) << row.text;
+    for (const Row& row : sayNothing) EXPECT_TRUE(isPlaceholder(row.text, row.kind)) << row.text;
 }
 
 TEST(Placeholder, LeavesWhatTellsSomething) {
-    for (const Row& row : SAY_SOMETHING) {
+    for (const Row& row : saySomething) {
         const PlaceholderRule* rule = placeholderRule(row.text, row.kind);
         EXPECT_EQ(rule, nullptr) << row.text << " is taken for " << (rule != nullptr ? rule->reason : "");
     }
 }
 
 TEST(Placeholder, IsOneInAnyLetterCaseWithBlanksAndDotsAround) {
-    for (const Row& row : SAY_NOTHING) {
+    for (const Row& row : sayNothing) {
         std::string text = row.text;
         std::transform(text.begin(), text.end(), text.begin(),
                        [](unsigned char c) { return static_cast<char>(std::toupper(c)); });
@@ -68,14 +68,14 @@ TEST(Placeholder, HasTheRuleThatSaysWhy) {
 
 TEST(Placeholder, RulesAllHaveATextThatTheyAreFor) {
     std::set<std::string_view> reasons;
-    for (const Row& row : SAY_NOTHING)
+    for (const Row& row : sayNothing)
         if (const PlaceholderRule* const rule = placeholderRule(row.text, row.kind)) reasons.insert(rule->reason);
-    constexpr const char* ALL[] = {
+    constexpr const char* all[] = {
 #define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) REASON,
 #include "host/Placeholders.inc"
     };
-    for (const char* reason : ALL) EXPECT_EQ(reasons.count(reason), 1U) << reason;
-    EXPECT_EQ(reasons.size(), std::size(ALL)); // no two rules have the same
+    for (const char* reason : all) EXPECT_EQ(reasons.count(reason), 1U) << reason;
+    EXPECT_EQ(reasons.size(), std::size(all)); // no two rules have the same
 }
 
 /// The reasons why texts of a machine's tables say nothing.
@@ -98,17 +98,17 @@ std::set<std::string_view> reasonsOn(const Smbios& smbios) {
 }
 
 TEST(Placeholder, RulesStateOnHowManyOfTheTestsMachinesTheyWereSeen) {
-    const char* folder = std::getenv("VK_TEST_HOSTS");
-    if (folder == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a folder with snapshots of real machines";
+    const char* directory = std::getenv("VK_TEST_HOSTS");
+    if (directory == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a directory with snapshots of real machines";
     std::map<std::string_view, unsigned int> machines;
-    for (const std::string& name : Root(folder).list("/").names) {
-        const Root machine(std::string(folder) + "/" + name);
+    for (const std::string& name : Root(directory).list("/").names) {
+        const Root machine(std::string(directory) + "/" + name);
         const Smbios smbios = parseSmbios(machine.read("/sys/firmware/dmi/tables/smbios_entry_point").text,
                                           machine.read("/sys/firmware/dmi/tables/DMI").text);
         for (const std::string_view reason : reasonsOn(smbios)) ++machines[reason];
     }
     EXPECT_FALSE(machines.empty());
-    constexpr unsigned int NOT_COUNTED = 0;
+    constexpr unsigned int notCounted = 0;
 #define PLACEHOLDER(MATCH, MACHINES, REASON, TEXTS) EXPECT_EQ(machines[REASON], MACHINES) << REASON;
 #include "host/Placeholders.inc"
 }

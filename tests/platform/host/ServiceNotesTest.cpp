@@ -21,13 +21,13 @@ TEST(ServiceNotes, TellTheTimeServiceInOneLine) {
 }
 
 TEST(ServiceNotes, FindTheDaemonAmongTheProcesses) {
-    const support::TemporaryDirectory folder;
-    const fs::path proc = fs::path(folder.path()) / "proc";
+    const support::TemporaryDirectory directory;
+    const fs::path proc = fs::path(directory.path()) / "proc";
     const auto process = [&](const char* name, const std::string& commandLine) {
         fs::create_directories(proc / name);
         std::ofstream(proc / name / "cmdline") << commandLine;
     };
-    const VK::Root root(folder.path());
+    const VK::Root root(directory.path());
     EXPECT_FALSE(isNtpDaemonRunning(root));
     process("1", "/sbin/init");
     process("self", "/usr/sbin/ntpd"); // no process of its own
@@ -37,14 +37,14 @@ TEST(ServiceNotes, FindTheDaemonAmongTheProcesses) {
 }
 
 TEST(ServiceNotes, LookForTheCommandsWhereTheProviderDoes) {
-    EXPECT_EQ(commandFolder("/opt/vk/platform/", false), "/opt/vk/vcm/bin/");
-    EXPECT_EQ(commandFolder("/opt/vk/", false), "/opt/vk/vcm/bin/");
-    EXPECT_EQ(commandFolder("/opt/vk/platform/", true), "/usr/sbin/");
+    EXPECT_EQ(commandDirectory("/opt/vk/platform/", false), "/opt/vk/vcm/bin/");
+    EXPECT_EQ(commandDirectory("/opt/vk/", false), "/opt/vk/vcm/bin/");
+    EXPECT_EQ(commandDirectory("/opt/vk/platform/", true), "/usr/sbin/");
 }
 
 TEST(ServiceNotes, SayThatTheConfigurationCommandIsMissing) {
-    const support::TemporaryDirectory folder;
-    const std::string bin = std::string(folder.path()) + "/";
+    const support::TemporaryDirectory directory;
+    const std::string bin = std::string(directory.path()) + "/";
     EXPECT_EQ(commandNote(bin),
               "no " + bin + "cimconfig: the delivery settings of the CIM server read as 0, which then means nothing");
     std::ofstream(bin + "cimconfig") << "#!/bin/sh\n";

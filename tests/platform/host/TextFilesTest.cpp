@@ -30,16 +30,16 @@ TEST(Assignments, AreReadAsTheShellReadsThem) {
     EXPECT_THAT(parseAssignments("A=\"open\\"), ElementsAre(Pair("A", "open\\")));
 }
 
-constexpr const char* SYSINFO = "Manufacturer:         IBM             \n"
+constexpr const char* sysinfo = "Manufacturer:         IBM             \n"
                                 "Type:                 2964\n"
                                 "Model:                701              N63\n"
                                 "Sequence Code:        00000000000AB1C7\n"
                                 "LPAR Name:            LP01\n";
 
 TEST(Sysinfo, IsReadByItsKeys) {
-    EXPECT_EQ(sysinfoValue(SYSINFO, "Manufacturer"), "IBM");
-    EXPECT_EQ(sysinfoValue(SYSINFO, "Sequence Code"), "00000000000AB1C7");
-    EXPECT_EQ(sysinfoValue(SYSINFO, "Name"), "");
+    EXPECT_EQ(sysinfoValue(sysinfo, "Manufacturer"), "IBM");
+    EXPECT_EQ(sysinfoValue(sysinfo, "Sequence Code"), "00000000000AB1C7");
+    EXPECT_EQ(sysinfoValue(sysinfo, "Name"), "");
     EXPECT_EQ(sysinfoValue("", "Type"), "");
 }
 

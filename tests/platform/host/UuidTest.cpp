@@ -15,17 +15,17 @@ namespace {
 
 using namespace std::literals;
 
-constexpr std::string_view BYTES = "\x33\x22\x11\x00\x55\x44\x77\x66\x88\x99\xAA\xBB\xCC\xDD\xEE\xFF"sv;
+constexpr std::string_view eachByte = "\x33\x22\x11\x00\x55\x44\x77\x66\x88\x99\xAA\xBB\xCC\xDD\xEE\xFF"sv;
 
 TEST(Uuid, ByteOrderFollowsTheVersion) {
-    EXPECT_EQ(uuidFromBytes(BYTES, {2, 6}), "00112233-4455-6677-8899-aabbccddeeff");
-    EXPECT_EQ(uuidFromBytes(BYTES, {3, 0}), "00112233-4455-6677-8899-aabbccddeeff");
-    EXPECT_EQ(uuidFromBytes(BYTES, {2, 5}), "33221100-5544-7766-8899-aabbccddeeff");
-    EXPECT_EQ(uuidFromBytes(BYTES, {2, 3}), "33221100-5544-7766-8899-aabbccddeeff");
+    EXPECT_EQ(uuidFromBytes(eachByte, {2, 6}), "00112233-4455-6677-8899-aabbccddeeff");
+    EXPECT_EQ(uuidFromBytes(eachByte, {3, 0}), "00112233-4455-6677-8899-aabbccddeeff");
+    EXPECT_EQ(uuidFromBytes(eachByte, {2, 5}), "33221100-5544-7766-8899-aabbccddeeff");
+    EXPECT_EQ(uuidFromBytes(eachByte, {2, 3}), "33221100-5544-7766-8899-aabbccddeeff");
 }
 
 TEST(Uuid, TakesSixteenBytes) {
-    EXPECT_EQ(uuidFromBytes(BYTES.substr(1), {2, 6}), "");
+    EXPECT_EQ(uuidFromBytes(eachByte.substr(1), {2, 6}), "");
     EXPECT_EQ(uuidFromBytes("", {2, 6}), "");
 }
 
@@ -95,18 +95,18 @@ std::string hexDigits(std::string_view bytes) {
 }
 
 TEST(Uuid, SharedOnesStateOnHowManyOfTheTestsMachinesTheyWereSeen) {
-    const char* folder = std::getenv("VK_TEST_HOSTS");
-    if (folder == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a folder with snapshots of real machines";
+    const char* directory = std::getenv("VK_TEST_HOSTS");
+    if (directory == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a directory with snapshots of real machines";
     std::map<std::string, unsigned int> machines;
-    for (const std::string& name : Root(folder).list("/").names) {
-        const std::string table = Root(std::string(folder) + "/" + name).read("/sys/firmware/dmi/tables/DMI").text;
+    for (const std::string& name : Root(directory).list("/").names) {
+        const std::string table = Root(std::string(directory) + "/" + name).read("/sys/firmware/dmi/tables/DMI").text;
         SmbiosTable structures(table);
         while (const auto structure = structures.next())
             if (structure->type() == 1) ++machines[hexDigits(structure->bytesAt(8, 16).value_or(""))];
     }
     EXPECT_FALSE(machines.empty());
-    constexpr unsigned int NOT_COUNTED = 0;
-#define SHARED_UUID(MACHINES, REASON, BYTES) EXPECT_EQ(machines[BYTES], MACHINES) << REASON;
+    constexpr unsigned int notCounted = 0;
+#define SHARED_UUID(MACHINES, REASON, eachByte) EXPECT_EQ(machines[eachByte], MACHINES) << REASON;
 #include "host/Placeholders.inc"
 }
 

@@ -15,8 +15,8 @@ namespace {
 
 using Lexicon = NodeLexicon;
 
-constexpr auto NAME = Lexicon::NameProperty;
-constexpr auto OFFSET = Lexicon::GmtOffsetProperty;
+constexpr auto nameProperty = Lexicon::NameProperty;
+constexpr auto offset = Lexicon::GmtOffsetProperty;
 
 /// A process chooses its host once: each test runs in one of its own, and fails by what it prints.
 #define IN_PROCESS_WITH(variable, value, body)                                                                         \
@@ -43,11 +43,11 @@ TEST_F(InstrumentationTest, ACursorOnNothingKnowsNothing) {
         bool readOnly = true;
         EXPECT_FALSE(cursor);
         EXPECT_FALSE(++cursor);
-        EXPECT_FALSE(cursor.getProperty(NAME, text));
-        EXPECT_FALSE(cursor.getProperty(NAME, number));
-        EXPECT_FALSE(cursor.setProperty(NAME, text));
-        EXPECT_FALSE(cursor.setProperty(NAME, number));
-        EXPECT_FALSE(cursor.isPropertyReadOnly(NAME, readOnly));
+        EXPECT_FALSE(cursor.getProperty(nameProperty, text));
+        EXPECT_FALSE(cursor.getProperty(nameProperty, number));
+        EXPECT_FALSE(cursor.setProperty(nameProperty, text));
+        EXPECT_FALSE(cursor.setProperty(nameProperty, number));
+        EXPECT_FALSE(cursor.isPropertyReadOnly(nameProperty, readOnly));
         EXPECT_EQ(text, "before");
         EXPECT_EQ(number, 7U);
         EXPECT_TRUE(readOnly);
@@ -72,19 +72,19 @@ TEST_F(InstrumentationTest, ReadsAndWritesASimulatedHost) {
         EXPECT_EQ(cursor.getNodeDescription(), "Rack");
         std::string text;
         unsigned int number = 0;
-        EXPECT_TRUE(cursor.getProperty(NAME, text));
+        EXPECT_TRUE(cursor.getProperty(nameProperty, text));
         EXPECT_EQ(text, "node7");
-        EXPECT_FALSE(cursor.getProperty(NAME, number)); // it is a text
-        EXPECT_TRUE(cursor.getProperty(OFFSET, number));
+        EXPECT_FALSE(cursor.getProperty(nameProperty, number)); // it is a text
+        EXPECT_TRUE(cursor.getProperty(offset, number));
         EXPECT_EQ(number, 60U);
-        EXPECT_FALSE(cursor.getProperty(OFFSET, text)); // it is a number
+        EXPECT_FALSE(cursor.getProperty(offset, text)); // it is a number
         EXPECT_EQ(text, "node7");
         bool readOnly = false;
-        EXPECT_TRUE(cursor.isPropertyReadOnly(NAME, readOnly));
+        EXPECT_TRUE(cursor.isPropertyReadOnly(nameProperty, readOnly));
         EXPECT_TRUE(readOnly);
         number = 4294966996U;
-        EXPECT_TRUE(cursor.setProperty(OFFSET, number));
-        EXPECT_FALSE(cursor.setProperty(NAME, text));
+        EXPECT_TRUE(cursor.setProperty(offset, number));
+        EXPECT_FALSE(cursor.setProperty(nameProperty, text));
 
         Instrumentation chassis;
         chassis.selectNode(std::string("/c/x"));
@@ -94,7 +94,7 @@ TEST_F(InstrumentationTest, ReadsAndWritesASimulatedHost) {
         chassis.setFilter(static_cast<Lexicon::PathType>(1), "/c"); // no other path type is known
         EXPECT_FALSE(bool(chassis));
         chassis.selectNode(Lexicon::ComputerSystemNode);
-        EXPECT_TRUE(chassis.getProperty(OFFSET, number));
+        EXPECT_TRUE(chassis.getProperty(offset, number));
         EXPECT_EQ(number, 4294966996U);
 
         EXPECT_EQ(Instrumentation::convertPathToString(Instrumentation::convertStringToPath("/c/x")), "/c/x");
@@ -133,7 +133,7 @@ TEST_F(InstrumentationTest, ThisHostIsOneComputerWithTheKernelsName) {
         Instrumentation cursor;
         cursor.selectNode(Lexicon::ComputerSystemNode);
         std::string name;
-        EXPECT_TRUE(cursor.getProperty(NAME, name));
+        EXPECT_TRUE(cursor.getProperty(nameProperty, name));
         EXPECT_EQ(name, kernels);
         EXPECT_EQ(std::string(cursor.getPathToNode()), "/computer/0");
         EXPECT_FALSE(++cursor);

@@ -29,14 +29,14 @@ namespace {
 
 class LogFile : public testing::Test {
 protected:
-    std::string path() const { return folder.path("vk.log"); }
-    std::string text() const { return folder.read("vk.log"); }
+    std::string path() const { return directory.path("vk.log"); }
+    std::string text() const { return directory.read("vk.log"); }
     Environment toFile(Environment more = {}) const {
         more["NVLOG_SINK"] = "file:" + path();
         return more;
     }
 
-    TemporaryDirectory folder;
+    TemporaryDirectory directory;
 };
 
 } // namespace
@@ -86,7 +86,7 @@ TEST_F(LogFile, IsMadeForOwnerAndGroupAndClosedOnExec) {
 }
 
 TEST_F(LogFile, IsAppendedTo) {
-    folder.write("vk.log", "before\n");
+    directory.write("vk.log", "before\n");
     quietly(toFile({{"NVLOG_CHANNELS", "log"}}), [] { log("after"); });
     EXPECT_THAT(splitLines(text()), ElementsAre("before", EndsWith("run: after")));
 }
@@ -94,12 +94,12 @@ TEST_F(LogFile, IsAppendedTo) {
 TEST_F(LogFile, IsOpenedAgainWhenRotated) {
     quietly(toFile(), [this] {
         log("one");
-        rename(path().c_str(), folder.path("vk.log.1").c_str());
-        folder.write("vk.log", "");
+        rename(path().c_str(), directory.path("vk.log.1").c_str());
+        directory.write("vk.log", "");
         log("two");
         log("three");
     });
-    EXPECT_THAT(splitLines(folder.read("vk.log.1")), ElementsAre(EndsWith("one")));
+    EXPECT_THAT(splitLines(directory.read("vk.log.1")), ElementsAre(EndsWith("one")));
     EXPECT_THAT(splitLines(text()), ElementsAre(EndsWith("two"), EndsWith("three")));
 }
 
@@ -116,7 +116,7 @@ TEST_F(LogFile, LeavesStrangersDescriptorsAlone) {
     quietly(toFile(), [this] {
         log("one");
         for (int fd = 3; fd < 100; ++fd) close(fd); // as a daemon does
-        const int strangers = open(folder.path("stranger").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0600);
+        const int strangers = open(directory.path("stranger").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0600);
         for (int i = 0; i < 10; ++i) fcntl(strangers, F_DUPFD_CLOEXEC, 3); // the log's number among them
         log("two");
         unlink(path().c_str());
@@ -124,7 +124,7 @@ TEST_F(LogFile, LeavesStrangersDescriptorsAlone) {
         struct stat status {};
         EXPECT_EQ(fstat(strangers, &status), 0);
         EXPECT_EQ(status.st_size, 0);
-        std::_Exit(folder.read("stranger").empty() && splitLines(text()).size() == 1 ? 0 : 1); // the pipe is closed
+        std::_Exit(directory.read("stranger").empty() && splitLines(text()).size() == 1 ? 0 : 1); // the pipe is closed
     });
     EXPECT_THAT(splitLines(text()), ElementsAre(EndsWith("three")));
 }
@@ -146,9 +146,9 @@ TEST_F(LogFile, TakesLinesOfAnyLengthWhole) {
 }
 
 TEST_F(LogFile, TakesWholeLinesFromProcessesAndThreadsAtOnce) {
-    constexpr int LINES = 500;
+    constexpr int lineCount = 500;
     const auto write = [](const std::string& name) {
-        for (int i = 0; i < LINES; ++i) log(name + std::string(static_cast<std::size_t>(i) * 3, '.') + "|");
+        for (int i = 0; i < lineCount; ++i) log(name + std::string(static_cast<std::size_t>(i) * 3, '.') + "|");
     };
     quietly(toFile({{"NVLOG_CHANNELS", "log"}}), [&] {
         const pid_t other = fork();
@@ -160,28 +160,28 @@ TEST_F(LogFile, TakesWholeLinesFromProcessesAndThreadsAtOnce) {
         waitpid(other, &status, 0);
     });
     const auto lines = splitLines(text());
-    EXPECT_EQ(lines.size(), 8U * LINES);
+    EXPECT_EQ(lines.size(), 8U * lineCount);
     for (const std::string& line : lines)
         ASSERT_THAT(line, MatchesRegex("[-0-9]{10}T[0-9:.]{15}Z LOG 6000 [^ ]+ [^ ]+ run: [a-z]+[0-3][.]*[|]"));
 }
 
 TEST_F(LogFile, LosesNoLineWhileRotatedByOthers) {
-    constexpr int LINES = 2000;
+    constexpr int lineCount = 2000;
     quietly(toFile({{"NVLOG_CHANNELS", "log"}}), [this] {
         std::vector<std::thread> threads;
         for (int i = 0; i < 4; ++i)
             threads.emplace_back([] {
-                for (int line = 0; line < LINES / 4; ++line) log("x");
+                for (int line = 0; line < lineCount / 4; ++line) log("x");
             });
         for (int i = 0; i < 20; ++i) {
-            rename(path().c_str(), folder.path("old" + std::to_string(i)).c_str());
+            rename(path().c_str(), directory.path("old" + std::to_string(i)).c_str());
             usleep(500);
         }
         for (auto& thread : threads) thread.join();
     });
     std::size_t count = splitLines(text()).size();
-    for (int i = 0; i < 20; ++i) count += splitLines(folder.read("old" + std::to_string(i))).size();
-    EXPECT_EQ(count, std::size_t{LINES});
+    for (int i = 0; i < 20; ++i) count += splitLines(directory.read("old" + std::to_string(i))).size();
+    EXPECT_EQ(count, std::size_t{lineCount});
 }
 
 TEST_F(LogFile, KeepsOneDescriptorThroughRotations) {
@@ -214,13 +214,13 @@ TEST_F(LogFile, ThatCannotBeOpenedMakesSyslogOfIt) {
 
 TEST_F(LogFile, IsUsedAgainOnceItCanBeOpened) {
     const std::string lines =
-        withEnvironment({{"NVLOG_SINK", "file:" + folder.path("later/vk.log")}, {"NVLOG_CHANNELS", "log"}}, [this] {
+        withEnvironment({{"NVLOG_SINK", "file:" + directory.path("later/vk.log")}, {"NVLOG_CHANNELS", "log"}}, [this] {
             log("one");
-            folder.write("later/other", "");
+            directory.write("later/other", "");
             log("two");
         });
     EXPECT_EQ(lines, "3 LOG 6000 Norvane.Test NVLoggerTest:7 run: one\n");
-    EXPECT_THAT(splitLines(folder.read("later/vk.log")), ElementsAre(EndsWith("two")));
+    EXPECT_THAT(splitLines(directory.read("later/vk.log")), ElementsAre(EndsWith("two")));
 }
 
 TEST(FullDisk, SendsLinesToSyslog) {
@@ -230,9 +230,9 @@ TEST(FullDisk, SendsLinesToSyslog) {
 }
 
 TEST(FifoWithoutReader, IsNotWaitedFor) {
-    TemporaryDirectory folder;
-    ASSERT_EQ(mkfifo(folder.path("fifo").c_str(), 0600), 0);
-    EXPECT_EQ(withEnvironment({{"NVLOG_SINK", "file:" + folder.path("fifo")}}, [] { log("x"); }),
+    TemporaryDirectory directory;
+    ASSERT_EQ(mkfifo(directory.path("fifo").c_str(), 0600), 0);
+    EXPECT_EQ(withEnvironment({{"NVLOG_SINK", "file:" + directory.path("fifo")}}, [] { log("x"); }),
               "3 LOG 6000 Norvane.Test NVLoggerTest:7 run: x\n");
 }
 

@@ -20,10 +20,10 @@ namespace {
 constexpr const char* forbidden = "no mounts here";
 constexpr std::size_t lines = 2000;
 
-bool mountOver(const std::string& folder) {
+bool mountOver(const std::string& directory) {
     if (unshare(CLONE_NEWNS) != 0) return false;
     if (mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0) return false;
-    return mount("vk-test", folder.c_str(), "tmpfs", 0, "size=64k") == 0;
+    return mount("vk-test", directory.c_str(), "tmpfs", 0, "size=64k") == 0;
 }
 
 void logNumber(std::size_t number) {
@@ -44,14 +44,14 @@ std::vector<std::size_t> wholeNumbers(const std::string& text) {
 }
 
 TEST(FullDisk, SendsToSyslogWhatTheFileCannotTakeAndGoesBackToTheFile) {
-    const support::TemporaryDirectory folder;
+    const support::TemporaryDirectory directory;
     const std::string outcome = support::inChild([&]() -> std::string {
-        if (!mountOver(folder.path())) return forbidden;
-        const std::string file = folder.path("vk.log");
+        if (!mountOver(directory.path())) return forbidden;
+        const std::string file = directory.path("vk.log");
         setenv("NVLOG_SINK", ("file:" + file).c_str(), 1);
         setenv("NVLOG_CHANNELS", "log", 1);
         for (std::size_t i = 0; i < lines; ++i) logNumber(i);
-        const std::vector<std::size_t> kept = wholeNumbers(folder.read("vk.log"));
+        const std::vector<std::size_t> kept = wholeNumbers(directory.read("vk.log"));
         std::string sent;
         for (const std::string& line : takeSyslog()) sent += line + "\n";
         const std::vector<std::size_t> passedOn = wholeNumbers(sent);
@@ -61,7 +61,7 @@ TEST(FullDisk, SendsToSyslogWhatTheFileCannotTakeAndGoesBackToTheFile) {
 
         std::filesystem::resize_file(file, 0); // somebody makes room
         logNumber(lines);
-        EXPECT_THAT(wholeNumbers(folder.read("vk.log")), testing::ElementsAre(lines));
+        EXPECT_THAT(wholeNumbers(directory.read("vk.log")), testing::ElementsAre(lines));
         EXPECT_THAT(takeSyslog(), testing::IsEmpty());
         return "done";
     });

@@ -42,14 +42,14 @@ TEST(Syslog, GetsTheLogChannelsNoticesAndFailuresByDefault) {
 }
 
 TEST(StandardError, GetsTheSameLines) {
-    TemporaryDirectory folder;
+    TemporaryDirectory directory;
     quietly({{"NVLOG_SINK", "stderr"}}, [&] {
-        const int fd = open(folder.path("err").c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0600);
+        const int fd = open(directory.path("err").c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0600);
         dup2(fd, STDERR_FILENO);
         log("x");
         trace("y");
     });
-    EXPECT_THAT(splitLines(folder.read("err")),
+    EXPECT_THAT(splitLines(directory.read("err")),
                 ElementsAre(EndsWith(" LOG 6000 Norvane.Test NVLoggerTest:7 run: x"),
                             EndsWith(" TRACE 6000 Norvane.Test NVLoggerTest:7 run: y")));
 }

@@ -73,7 +73,7 @@ TEST(Settings, PassOverWhatIsNoLevel) {
 
 TEST(Settings, KeepAllLevelsWhenTheListIsTooLong) {
     std::string list;
-    for (std::size_t i = 0; i < Settings::MAX_LEVELS; ++i) list += std::to_string(i) + ",";
+    for (std::size_t i = 0; i < Settings::maxLevels; ++i) list += std::to_string(i) + ",";
     EXPECT_FALSE(withLevels(list.c_str()).keeps(Channel::Log, 6000));
     EXPECT_TRUE(withLevels((list + "9999").c_str()).keeps(Channel::Log, 6000));
 }

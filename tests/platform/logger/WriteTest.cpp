@@ -86,16 +86,16 @@ TEST(WriteLine, FailsOnAClosedDescriptor) {
 }
 
 TEST(WriteLine, SurvivesAFileSizeLimit) {
-    support::TemporaryDirectory folder;
-    const std::string result = support::inChild([&folder] {
+    support::TemporaryDirectory directory;
+    const std::string result = support::inChild([&directory] {
         const rlimit limit{6, 6};
         setrlimit(RLIMIT_FSIZE, &limit);
-        const int fd = open(folder.path("log").c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0640);
+        const int fd = open(directory.path("log").c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0640);
         const bool first = writeLine(fd, "one\n");
         const bool second = writeLine(fd, "second\n"); // SIGXFSZ would end the child
         close(fd);
         return std::string(first ? "whole " : "cut ") + (second ? "whole" : "cut");
     });
     EXPECT_EQ(result, "whole cut");
-    EXPECT_EQ(folder.read("log"), "one\nse");
+    EXPECT_EQ(directory.read("log"), "one\nse");
 }

@@ -15,7 +15,7 @@ using VK::Product;
 
 namespace {
 
-constexpr const char* MACHINE_ID = "0123456789abcdef0123456789abcdef";
+constexpr const char* machineId = "0123456789abcdef0123456789abcdef";
 
 std::string kernelsMachine() {
     utsname names{};
@@ -33,7 +33,7 @@ std::string productFrom(const char* variable, const std::string& value) {
     });
 }
 
-const std::string ROOT_DIRECTORY = std::string(INSTALL_PREFIX) + "/lib/vk/platform/";
+const std::string rootDirectory = std::string(INSTALL_PREFIX) + "/lib/vk/platform/";
 
 } // namespace
 
@@ -41,16 +41,16 @@ TEST(Product, OfThisHostIsToldByTheKernelAndTheMachineId) {
     std::ifstream file("/etc/machine-id");
     std::string id;
     if (!(file >> id) || id == "uninitialized") GTEST_SKIP() << "this host has no machine id";
-    EXPECT_EQ(productFrom(nullptr, ""), kernelsMachine() + " " + ROOT_DIRECTORY + " " + VK::uniqueIdentifier(id));
+    EXPECT_EQ(productFrom(nullptr, ""), kernelsMachine() + " " + rootDirectory + " " + VK::uniqueIdentifier(id));
 }
 
 TEST(Product, OfASnapshotIsToldByItsFilesOnly) {
     TemporaryDirectory snapshot;
-    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()), kernelsMachine() + " " + ROOT_DIRECTORY + " ");
-    snapshot.write("etc/machine-id", std::string(MACHINE_ID) + "\n");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()), kernelsMachine() + " " + rootDirectory + " ");
+    snapshot.write("etc/machine-id", std::string(machineId) + "\n");
     snapshot.write("proc/sys/kernel/arch", "ppc64le\n");
     EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()),
-              "ppc64le " + ROOT_DIRECTORY + " " + VK::uniqueIdentifier(MACHINE_ID));
+              "ppc64le " + rootDirectory + " " + VK::uniqueIdentifier(machineId));
 }
 
 TEST(Product, HasNoIdentifierWhereTheMachineIdIsNotSetYet) {
@@ -63,7 +63,7 @@ TEST(Product, HasNoIdentifierWhereTheMachineIdIsNotSetYet) {
 
 TEST(Product, IsReadOncePerProcess) {
     TemporaryDirectory snapshot;
-    snapshot.write("etc/machine-id", MACHINE_ID);
+    snapshot.write("etc/machine-id", machineId);
     const std::string result = inChild([&] {
         setenv("VK_INSTRUMENTATION_ROOT", snapshot.path().c_str(), 1);
         const std::wstring first = Product::getUid();
@@ -74,20 +74,20 @@ TEST(Product, IsReadOncePerProcess) {
 }
 
 TEST(Product, OfASimulatedHostIsToldByItsFileAndElseByThisHost) {
-    TemporaryDirectory folder;
-    folder.write(
+    TemporaryDirectory directory;
+    directory.write(
         "tree.json",
         R"({"product": {"architecture": "riscv64", "uid": "node7", "rootDirectory": "/opt/vk"}, "nodes": []})");
-    folder.write("part.json", R"({"product": {"uid": ""}, "nodes": []})");
-    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_TREE", folder.path("tree.json")), "riscv64 /opt/vk/ node7");
-    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_TREE", folder.path("part.json")),
-              kernelsMachine() + " " + ROOT_DIRECTORY + " ");
+    directory.write("part.json", R"({"product": {"uid": ""}, "nodes": []})");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_TREE", directory.path("tree.json")), "riscv64 /opt/vk/ node7");
+    EXPECT_EQ(productFrom("VK_INSTRUMENTATION_TREE", directory.path("part.json")),
+              kernelsMachine() + " " + rootDirectory + " ");
 }
 
 TEST(Product, IsIdentifiedByTheSystemsUuidWithoutAMachineId) {
     TemporaryDirectory snapshot;
     snapshot.write("sys/class/dmi/id/product_uuid", "4C4C4544-0042-4A10-8053-B4C04F4D3132\n");
     EXPECT_EQ(productFrom("VK_INSTRUMENTATION_ROOT", snapshot.path()),
-              kernelsMachine() + " " + ROOT_DIRECTORY + " " +
+              kernelsMachine() + " " + rootDirectory + " " +
                   VK::uniqueIdentifier("4c4c4544-0042-4a10-8053-b4c04f4d3132"));
 }

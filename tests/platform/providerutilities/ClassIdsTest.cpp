@@ -11,8 +11,8 @@ using VK::ProviderUtilities;
 
 namespace {
 
-constexpr unsigned short UNKNOWN = ProviderUtilities::CLASS_ID_UNKNOWN;
-const std::string UNTOLD = "LOG 6000 Norvane.ProviderUtilities The broker could not tell ";
+constexpr unsigned short unknown = ProviderUtilities::CLASS_ID_UNKNOWN;
+const std::string noClass = "LOG 6000 Norvane.ProviderUtilities The broker could not tell ";
 
 class ClassIds : public testing::Test {
 protected:
@@ -67,12 +67,12 @@ TEST_F(ClassIds, DoNotDependOnCase) {
 TEST_F(ClassIds, AreUnknownForEveryOtherName) {
     for (const char* name : {"", "CIM_ComputerSystem", "CIM_ElementCapabilities", "VESKA_ComputerSystem ",
                              "VESKA_ComputerSyste", "VESKA_ComputerSystemPackages", "ComputerSystem"})
-        EXPECT_EQ(idOf(name), UNKNOWN) << name;
+        EXPECT_EQ(idOf(name), unknown) << name;
 }
 
 TEST_F(ClassIds, AreUnknownWithoutAName) {
-    EXPECT_EQ(ProviderUtilities::getClassId(static_cast<const char*>(nullptr)), UNKNOWN);
-    EXPECT_EQ(ProviderUtilities::getClassId(static_cast<const CMPIObjectPath*>(nullptr)), UNKNOWN);
+    EXPECT_EQ(ProviderUtilities::getClassId(static_cast<const char*>(nullptr)), unknown);
+    EXPECT_EQ(ProviderUtilities::getClassId(static_cast<const CMPIObjectPath*>(nullptr)), unknown);
 }
 
 TEST_F(ClassIds, AreUnknownWhereTheBrokerDoesNotTellTheName) {
@@ -80,21 +80,21 @@ TEST_F(ClassIds, AreUnknownWhereTheBrokerDoesNotTellTheName) {
     for (const char* const slot : {"getClassName", "getCharPtr"}) {
         for (const CMPIrc code : {CMPI_RC_ERR_FAILED, CMPI_RC_ERR_NOT_FOUND}) {
             fake.refusals = {{slot, code}};
-            EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
-            EXPECT_THAT(takeLog(), ElementsAre(UNTOLD + "the class of a path, return code 1")) << slot << code;
+            EXPECT_EQ(ProviderUtilities::getClassId(path), unknown);
+            EXPECT_THAT(takeLog(), ElementsAre(noClass + "the class of a path, return code 1")) << slot << code;
         }
     }
     fake.refusals = {};
     fake.nullAnswers = {"getClassName"};
-    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
-    EXPECT_THAT(takeLog(), ElementsAre(UNTOLD + "the class of a path, return code 1"));
+    EXPECT_EQ(ProviderUtilities::getClassId(path), unknown);
+    EXPECT_THAT(takeLog(), ElementsAre(noClass + "the class of a path, return code 1"));
     fake.nullAnswers = {};
     fake.writesStatus = false;
     EXPECT_EQ(ProviderUtilities::getClassId(path), 1);
     fake.pathTable.getClassName = nullptr;
-    EXPECT_EQ(ProviderUtilities::getClassId(path), UNKNOWN);
+    EXPECT_EQ(ProviderUtilities::getClassId(path), unknown);
     const CMPIObjectPath withoutTable{nullptr, nullptr};
-    EXPECT_EQ(ProviderUtilities::getClassId(&withoutTable), UNKNOWN);
+    EXPECT_EQ(ProviderUtilities::getClassId(&withoutTable), unknown);
 }
 
 TEST_F(ClassRelations, HoldOnOneLineOfInheritanceInBothDirections) {
@@ -126,7 +126,7 @@ TEST_F(ClassRelations, DoNotHoldWhereTheBrokerDoesNotAnswer) {
     EXPECT_FALSE(ProviderUtilities::areClassesRelated(nullptr, "root/cimv2", name, name));
     fake.refusals = {{"classPathIsA", CMPI_RC_ERR_FAILED}};
     EXPECT_FALSE(related(name, name));
-    const std::string untold = UNTOLD + "whether a class is derived from another, return code 1";
+    const std::string untold = noClass + "whether a class is derived from another, return code 1";
     EXPECT_THAT(takeLog(), ElementsAre(untold, untold)) << "one for each direction";
     for (const CMPIrc absent : {CMPI_RC_ERR_NOT_FOUND, CMPI_RC_ERR_INVALID_CLASS}) {
         fake.refusals = {{"classPathIsA", absent}};

@@ -4,7 +4,7 @@
 
 namespace {
 
-constexpr CMPIStatus OK{CMPI_RC_OK, nullptr};
+constexpr CMPIStatus ok{CMPI_RC_OK, nullptr};
 
 CMPIData nothing() {
     CMPIData data{};
@@ -33,7 +33,7 @@ FakeBroker::Args& of(const CMPIArgs* args) {
 
 /// The status of a slot that has none to write to.
 CMPIStatus statusOf(FakeBroker& fake, const char* slot) {
-    CMPIStatus status = OK;
+    CMPIStatus status = ok;
     fake.refuses(slot, &status);
     return status;
 }
@@ -139,7 +139,7 @@ void fillInstanceTables(CMPIInstanceFT& instances, CMPIArgsFT& arguments) {
     };
     instances.getProperty = [](const CMPIInstance* instance, const char* name, CMPIStatus* status) {
         FakeBroker& fake = *of(instance).fake;
-        CMPIStatus ignored = OK;
+        CMPIStatus ignored = ok;
         const CMPIData data = fake.find(of(instance).entries, name, &ignored); // given along even with a failure
         if (!fake.refuses("getProperty", status) && ignored.rc != CMPI_RC_OK) *status = ignored;
         return data;
@@ -170,7 +170,7 @@ FakeBroker::FakeBroker() {
         if (index >= array.elements.size()) return CMPIStatus{CMPI_RC_ERR_NO_SUCH_PROPERTY, nullptr};
         if (type != array.type) return CMPIStatus{CMPI_RC_ERR_TYPE_MISMATCH, nullptr};
         array.elements[index] = {type, CMPI_goodValue, *value};
-        return OK;
+        return ok;
     };
     broker.hdl = this;
     broker.eft = &encapsulated;
@@ -181,7 +181,7 @@ bool FakeBroker::refuses(const char* slot, CMPIStatus* status) {
     if (refusal != refusals.end())
         *status = {refusal->second, nullptr};
     else if (writesStatus)
-        *status = OK;
+        *status = ok;
     return refusal != refusals.end() || nullAnswers.count(slot) > 0;
 }
 
@@ -213,7 +213,7 @@ CMPIStatus FakeBroker::put(std::vector<Entry>& entries, const char* name, const 
         data.value = *value;
     }
     entries.push_back({name, data});
-    return OK;
+    return ok;
 }
 
 CMPIObjectPath* FakeBroker::makePath(const std::string& nameSpace, const std::string& className) {

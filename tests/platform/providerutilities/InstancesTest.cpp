@@ -12,7 +12,7 @@ using VK::ProviderUtilities;
 
 namespace {
 
-const std::string REFUSED = "LOG 6000 Norvane.ProviderUtilities The broker refused the property P, return code ";
+const std::string refusal = "LOG 6000 Norvane.ProviderUtilities The broker refused the property P, return code ";
 
 class Instances : public testing::Test {
 protected:
@@ -90,10 +90,10 @@ TEST_F(Instances, LeaveABadDateTimeUnset) {
     EXPECT_FALSE(setText("yesterday", true));
     EXPECT_FALSE(setText("", true));
     EXPECT_EQ(contents(), "");
-    EXPECT_THAT(takeLog(), ElementsAre(REFUSED + "4", REFUSED + "4"));
+    EXPECT_THAT(takeLog(), ElementsAre(refusal + "4", refusal + "4"));
     fake.nullAnswers = {"newDateTimeFromChars"};
     EXPECT_FALSE(setText("20240101110000.000000+000", true));
-    EXPECT_THAT(takeLog(), ElementsAre(REFUSED + "1")) << "failed, whatever the status says";
+    EXPECT_THAT(takeLog(), ElementsAre(refusal + "1")) << "failed, whatever the status says";
     fake.encapsulated.newDateTimeFromChars = nullptr;
     EXPECT_FALSE(setText("20240101110000.000000+000", true));
     EXPECT_EQ(contents(), "");
@@ -115,7 +115,7 @@ TEST_F(Instances, LeaveOutAnArrayOfWhichAnyPartIsRefused) {
     for (const char* slot : {"newArray", "newString", "setElementAt", "setProperty"}) {
         fake.refusals = {{slot, CMPI_RC_ERR_FAILED}};
         EXPECT_FALSE(setTexts({"a", "b"})) << slot;
-        EXPECT_THAT(takeLog(), ElementsAre(REFUSED + "1")) << slot;
+        EXPECT_THAT(takeLog(), ElementsAre(refusal + "1")) << slot;
     }
     fake.refusals = {};
     for (const char* slot : {"newArray", "newString"}) {
@@ -141,7 +141,7 @@ TEST_F(Instances, LeaveOutAnArrayWhereTheBrokerLacksASlot) {
 TEST_F(Instances, LeaveOutAndLogAPropertyThatIsRefused) {
     fake.refusals = {{"setProperty", CMPI_RC_ERR_INVALID_DATA_TYPE}};
     EXPECT_FALSE(ProviderUtilities::setProperty(instance, "P", 1U));
-    EXPECT_THAT(takeLog(), ElementsAre(REFUSED + "61"));
+    EXPECT_THAT(takeLog(), ElementsAre(refusal + "61"));
     fake.refusals = {};
     EXPECT_FALSE(ProviderUtilities::setProperty(nullptr, "P", 1U));
     EXPECT_FALSE(ProviderUtilities::setProperty(instance, nullptr, 1U));

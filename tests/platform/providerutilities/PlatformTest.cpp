@@ -19,12 +19,12 @@ std::string kvmSaidBy(const char* variable, const std::string& value) {
 } // namespace
 
 TEST(IsKVM, IsToldByTheHostsSource) {
-    support::TemporaryDirectory folder;
-    folder.write("yes.json", R"({"product": {"kvm": true}, "nodes": []})");
-    folder.write("no.json", R"({"product": {"kvm": false}, "nodes": []})");
-    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_TREE", folder.path("yes.json")), "yes");
-    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_TREE", folder.path("no.json")), "no");
-    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_ROOT", folder.path()), "no");
-    folder.write("sys/class/dmi/id/sys_vendor", "QEMU\n");
-    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_ROOT", folder.path()), "yes");
+    support::TemporaryDirectory directory;
+    directory.write("yes.json", R"({"product": {"kvm": true}, "nodes": []})");
+    directory.write("no.json", R"({"product": {"kvm": false}, "nodes": []})");
+    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_TREE", directory.path("yes.json")), "yes");
+    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_TREE", directory.path("no.json")), "no");
+    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_ROOT", directory.path()), "no");
+    directory.write("sys/class/dmi/id/sys_vendor", "QEMU\n");
+    EXPECT_EQ(kvmSaidBy("VK_INSTRUMENTATION_ROOT", directory.path()), "yes");
 }

@@ -117,12 +117,12 @@ TEST(ChangingFiles, OfTheZoneAreOneZoneOrUtc) {
 }
 
 TEST(ChangingFiles, OfASimulatedHostAreOneOfItsTreesOrNone) {
-    const support::TemporaryDirectory folder;
-    const std::string file = folder.path("tree.json");
+    const support::TemporaryDirectory directory;
+    const std::string file = directory.path("tree.json");
     const std::string one = R"({"nodes":[{"type":40,"path":"/c","properties":{"108":"one"}}]})";
     const std::string two = R"({"nodes":[{"type":40,"path":"/c","properties":{"108":"two"}},{"type":1,"path":"/d"}]})";
-    const Churn churn({[&] { folder.write("tree.json", one); }, [&] { cut(file, 20); },
-                       [&] { folder.write("tree.json", two); }, [&] { append(file, std::string(70000, ' ') + "x"); },
+    const Churn churn({[&] { directory.write("tree.json", one); }, [&] { cut(file, 20); },
+                       [&] { directory.write("tree.json", two); }, [&] { append(file, std::string(70000, ' ') + "x"); },
                        [&] { std::filesystem::remove(file); }});
     SimulatedHost host(file);
     churn.expectOnly<Value>({Value(""), Value("one"), Value("two")}, [&] {
@@ -130,7 +130,7 @@ TEST(ChangingFiles, OfASimulatedHostAreOneOfItsTreesOrNone) {
         const NodeTree::Place place = tree->find("/c");
         return place.node != nullptr ? host.read(*place.node, 108).value_or("nameless") : Value("");
     });
-    folder.write("tree.json", one);
+    directory.write("tree.json", one);
 }
 
 /// Puts a file in the place of another at one stroke, as system tools do.

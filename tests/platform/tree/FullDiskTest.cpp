@@ -29,43 +29,43 @@ using testing::UnorderedElementsAre;
 constexpr const char* tree = R"({"nodes":[{"type":40,"path":"/c","properties":{"108":"node7"}}]})";
 constexpr const char* forbidden = "no mounts here";
 
-/// A file system of a few pages over a folder, in a mount namespace of this process's own.
-bool mountOver(const std::string& folder) {
+/// A file system of a few pages over a directory, in a mount namespace of this process's own.
+bool mountOver(const std::string& directory) {
     if (unshare(CLONE_NEWNS) != 0) return false;
     if (mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0) return false;
-    return mount("vk-test", folder.c_str(), "tmpfs", 0, "size=64k") == 0;
+    return mount("vk-test", directory.c_str(), "tmpfs", 0, "size=64k") == 0;
 }
 
-void fill(const std::string& folder) {
-    const int fd = open((folder + "/filler").c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0600);
+void fill(const std::string& directory) {
+    const int fd = open((directory + "/filler").c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, 0600);
     const std::string page(4096, 'x');
     while (write(fd, page.data(), page.size()) > 0) {
     }
     close(fd);
 }
 
-bool makeReadOnly(const std::string& folder) {
-    return mount(nullptr, folder.c_str(), nullptr, MS_REMOUNT | MS_RDONLY, nullptr) == 0;
+bool makeReadOnly(const std::string& directory) {
+    return mount(nullptr, directory.c_str(), nullptr, MS_REMOUNT | MS_RDONLY, nullptr) == 0;
 }
 
-bool makeWritable(const std::string& folder) {
-    return mount(nullptr, folder.c_str(), nullptr, MS_REMOUNT, nullptr) == 0;
+bool makeWritable(const std::string& directory) {
+    return mount(nullptr, directory.c_str(), nullptr, MS_REMOUNT, nullptr) == 0;
 }
 
-std::vector<std::string> namesIn(const std::string& folder) {
+std::vector<std::string> namesIn(const std::string& directory) {
     std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::directory_iterator(folder)) names.push_back(entry.path().filename());
+    for (const auto& entry : std::filesystem::directory_iterator(directory)) names.push_back(entry.path().filename());
     return names;
 }
 
-bool exists(const support::TemporaryDirectory& folder, const std::string& name) {
-    return std::filesystem::exists(folder.path(name));
+bool exists(const support::TemporaryDirectory& directory, const std::string& name) {
+    return std::filesystem::exists(directory.path(name));
 }
 
 /// Runs something in a process that may mount; skips the test where none may.
-void mounting(const std::function<void()>& run, const std::string& folder) {
+void mounting(const std::function<void()>& run, const std::string& directory) {
     const std::string outcome = inChild([&]() -> std::string {
-        if (!mountOver(folder)) return forbidden;
+        if (!mountOver(directory)) return forbidden;
         run();
         return "done";
     });
@@ -74,64 +74,64 @@ void mounting(const std::function<void()>& run, const std::string& folder) {
 }
 
 /// Tries to write to a simulated host's file, which must stay as it is.
-void expectUnwritten(const support::TemporaryDirectory& folder, const char* reason) {
-    SimulatedHost host(folder.path("tree.json"));
+void expectUnwritten(const support::TemporaryDirectory& directory, const char* reason) {
+    SimulatedHost host(directory.path("tree.json"));
     const auto before = host.tree();
     takeLog();
     const std::string large(8000, 'x');
     EXPECT_FALSE(host.write(*before->find("/c").node, 1, Value(large)));
     const auto lines = takeLog();
     EXPECT_THAT(lines, testing::ElementsAre(HasSubstr(reason)));
-    EXPECT_EQ(folder.read("tree.json"), tree);
-    EXPECT_FALSE(exists(folder, ".tree.json.vk-new"));
+    EXPECT_EQ(directory.read("tree.json"), tree);
+    EXPECT_FALSE(exists(directory, ".tree.json.vk-new"));
     EXPECT_EQ(host.read(*host.tree()->find("/c").node, 108), Value("node7"));
 }
 
 class FullDisk : public testing::Test {
 protected:
-    void SetUp() override { folder.write("keep", ""); }
+    void SetUp() override { directory.write("keep", ""); }
 
-    support::TemporaryDirectory folder;
+    support::TemporaryDirectory directory;
 };
 
 TEST_F(FullDisk, LeavesASimulatedHostsFileWhole) {
     mounting(
         [this] {
-            folder.write("tree.json", tree);
-            fill(folder.path());
-            expectUnwritten(folder, "No space left on device");
-            std::filesystem::remove(folder.path("filler"));
-            SimulatedHost host(folder.path("tree.json"));
+            directory.write("tree.json", tree);
+            fill(directory.path());
+            expectUnwritten(directory, "No space left on device");
+            std::filesystem::remove(directory.path("filler"));
+            SimulatedHost host(directory.path("tree.json"));
             EXPECT_TRUE(host.write(*host.tree()->find("/c").node, 1, Value("x"))) << "there is room again";
         },
-        folder.path());
+        directory.path());
 }
 
 TEST_F(FullDisk, ThatIsReadOnlyLeavesASimulatedHostsFileWhole) {
     mounting(
         [this] {
-            folder.write("tree.json", tree);
-            ASSERT_TRUE(makeReadOnly(folder.path()));
-            expectUnwritten(folder, "Read-only file system");
+            directory.write("tree.json", tree);
+            ASSERT_TRUE(makeReadOnly(directory.path()));
+            expectUnwritten(directory, "Read-only file system");
         },
-        folder.path());
+        directory.path());
 }
 
 TEST_F(FullDisk, WithASizeLimitLeavesASimulatedHostsFileWholeAndTheProcessRunning) {
-    folder.write("tree.json", tree);
+    directory.write("tree.json", tree);
     EXPECT_EQ(inChild([this]() -> std::string {
                   rlimit before{};
                   getrlimit(RLIMIT_FSIZE, &before);
                   const rlimit limit{100, before.rlim_max};
                   setrlimit(RLIMIT_FSIZE, &limit); // SIGXFSZ would end the child
-                  SimulatedHost host(folder.path("tree.json"));
+                  SimulatedHost host(directory.path("tree.json"));
                   const bool written = host.write(*host.tree()->find("/c").node, 1, Value(std::string(500, 'x')));
                   setrlimit(RLIMIT_FSIZE, &before);
                   return written ? "written" : "refused";
               }),
               "refused");
-    EXPECT_EQ(folder.read("tree.json"), tree);
-    EXPECT_FALSE(exists(folder, ".tree.json.vk-new"));
+    EXPECT_EQ(directory.read("tree.json"), tree);
+    EXPECT_FALSE(exists(directory, ".tree.json.vk-new"));
 }
 
 /// A change of zone that cannot be written: everything is as before, and one line says why.

@@ -158,11 +158,11 @@ TEST_F(RealHostTest, NothingOfAChassisCanBeWritten) {
 
 TEST(RealHost, ThatIsNotThereIsAnEmptyTree) {
     takeLog();
-    RealHost host(Root("/no/such/folder"));
+    RealHost host(Root("/no/such/directory"));
     EXPECT_TRUE(host.tree()->isEmpty());
     EXPECT_TRUE(host.tree()->isEmpty());
-    EXPECT_EQ(host.reading()->problem, "/no/such/folder: No such file or directory");
-    EXPECT_THAT(takeLog(), ElementsAre("6000 /no/such/folder: No such file or directory"));
+    EXPECT_EQ(host.reading()->problem, "/no/such/directory: No such file or directory");
+    EXPECT_THAT(takeLog(), ElementsAre("6000 /no/such/directory: No such file or directory"));
 }
 
 TEST(SimulatedHostLog, NamesABrokenFileOnce) {

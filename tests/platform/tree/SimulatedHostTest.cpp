@@ -19,12 +19,12 @@ namespace {
 
 using testing::HasSubstr;
 
-constexpr const char* TREE = R"({"nodes":[{"type":40,"path":"/c","properties":{"108":"node7","127":60},
+constexpr const char* treeText = R"({"nodes":[{"type":40,"path":"/c","properties":{"108":"node7","127":60},
     "readOnly":[108],"unanswerable":[9],"failWrites":[126]}]})";
 
 class SimulatedHostTest : public testing::Test {
 protected:
-    SimulatedHostTest() { directory.write("tree.json", TREE); }
+    SimulatedHostTest() { directory.write("tree.json", treeText); }
 
     std::string file() const { return directory.path("tree.json"); }
 
@@ -53,7 +53,7 @@ TEST_F(SimulatedHostTest, WritesWhatMayBeWrittenAndNothingElse) {
     EXPECT_FALSE(host.write(node, 108, Value("x")));     // read-only
     EXPECT_FALSE(host.write(node, 126, Value("x")));     // fails
     EXPECT_FALSE(host.write(node, 127, Value("sixty"))); // a number
-    EXPECT_EQ(directory.read("tree.json"), TREE);
+    EXPECT_EQ(directory.read("tree.json"), treeText);
     EXPECT_TRUE(host.write(node, 127, Value(4294966996U)));
     EXPECT_TRUE(host.write(node, 200, Value(1U)));           // new
     EXPECT_TRUE(host.write(node, 9, Value("unanswerable"))); // but writable
@@ -68,7 +68,7 @@ TEST_F(SimulatedHostTest, ParsesAnUnchangedFileOnce) {
     host.tree();
     const auto first = host.tree();
     EXPECT_EQ(host.tree(), first);
-    directory.write("tree.json", TREE);
+    directory.write("tree.json", treeText);
     EXPECT_NE(host.tree(), first);
 }
 
@@ -148,7 +148,7 @@ TEST_F(SimulatedHostTest, AFileThatCannotBeUsedIsAnEmptyTree) {
     EXPECT_EQ(problemOf(directory.path("pipe")), "not a regular file");
     directory.write("broken.json", "{\"nodes\":");
     EXPECT_THAT(problemOf(directory.path("broken.json")), HasSubstr("not JSON at byte 10"));
-    directory.write("secret.json", TREE);
+    directory.write("secret.json", treeText);
     ASSERT_EQ(chmod(directory.path("secret.json").c_str(), 0), 0);
     if (geteuid() != 0) { // root sees all
         EXPECT_EQ(problemOf(directory.path("secret.json")), "Permission denied");
@@ -166,11 +166,11 @@ TEST_F(SimulatedHostTest, RefusesAHundredMegabytesUnread) {
 TEST_F(SimulatedHostTest, AMendedFileIsReadAgain) {
     directory.write("tree.json", "{");
     EXPECT_TRUE(host.tree()->isEmpty());
-    directory.write("tree.json", TREE);
+    directory.write("tree.json", treeText);
     EXPECT_FALSE(host.tree()->isEmpty());
     ASSERT_EQ(unlink(file().c_str()), 0);
     EXPECT_TRUE(host.tree()->isEmpty());
-    directory.write("tree.json", TREE);
+    directory.write("tree.json", treeText);
     EXPECT_FALSE(host.tree()->isEmpty());
 }
 

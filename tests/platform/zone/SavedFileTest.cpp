@@ -48,17 +48,17 @@ TEST(SavedFile, PutsBackWhatItSaw) {
     directory.write("file", "bytes");
     directory.link("nowhere", "link");
     const Root root(directory.path());
-    const int folder = root.open("/", O_RDONLY | O_DIRECTORY);
+    const int opened = root.open("/", O_RDONLY | O_DIRECTORY);
     for (const char* name : {"file", "link", "missing"}) {
         SavedFile before, after;
         ASSERT_EQ(lookAt(root, name, before), 0);
-        ASSERT_EQ(putBack(folder, name, {SavedFile::File, "other"}), 0);
+        ASSERT_EQ(putBack(opened, name, {SavedFile::File, "other"}), 0);
         EXPECT_EQ(directory.read(name), "other");
-        ASSERT_EQ(putBack(folder, name, before), 0);
+        ASSERT_EQ(putBack(opened, name, before), 0);
         ASSERT_EQ(lookAt(root, name, after), 0);
         EXPECT_TRUE(before == after) << name;
     }
-    close(folder);
+    close(opened);
     SavedFile found;
     EXPECT_EQ(lookAt(root, "/", found), EISDIR);
 }
@@ -66,9 +66,9 @@ TEST(SavedFile, PutsBackWhatItSaw) {
 TEST(SavedFile, PutBackWhereNothingWasSurvivesACrash) {
     const support::TemporaryDirectory directory;
     directory.write("file", "bytes");
-    const FileDescriptor folder(open(directory.path().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    const FileDescriptor opened(open(directory.path().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     support::synchronised().clear();
-    ASSERT_EQ(putBack(folder.get(), "file", {}), 0);
+    ASSERT_EQ(putBack(opened.get(), "file", {}), 0);
     EXPECT_THAT(support::synchronised(), testing::ElementsAre(directory.path()));
     EXPECT_FALSE(std::filesystem::exists(directory.path("file")));
 }

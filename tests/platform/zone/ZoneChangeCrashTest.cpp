@@ -37,17 +37,17 @@ void killEverywhere(const HostCopy& host, const Prepare& prepare, const Change& 
 /// that comes back.
 void expectOldOrNew(const char* zone, const std::function<void(const Root&)>& prepare,
                     const std::function<bool(const Root&)>& change, int oldOffset, int newOffset) {
-    constexpr std::int64_t WINTER_2026 = 1768435200;
+    constexpr std::int64_t winter2026 = 1768435200;
     const support::InMemory<HostCopy> copy;
     const HostCopy& host = *copy;
     const Root root(host.path());
     const auto check = [&] {
         const auto found = zoneOfFile(root, "/etc/localtime");
         ASSERT_TRUE(found.has_value()) << "no zone";
-        const int winter = found->at(WINTER_2026).offset / 60;
+        const int winter = found->at(winter2026).offset / 60;
         ASSERT_TRUE(winter == oldOffset || winter == newOffset) << winter;
         ASSERT_TRUE(change(root));
-        ASSERT_EQ(zoneInForce(root).at(WINTER_2026).offset / 60, newOffset);
+        ASSERT_EQ(zoneInForce(root).at(winter2026).offset / 60, newOffset);
         ASSERT_TRUE(changeDaylightSaving(root, true));
         ASSERT_EQ(host.link("etc/localtime"), std::string("/usr/share/zoneinfo/") + zone);
     };

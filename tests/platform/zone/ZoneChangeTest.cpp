@@ -163,7 +163,7 @@ TEST_F(ZoneChange, ItsLineTellsWhatHappened) {
                                        std::to_string(getuid())));
 }
 
-TEST_F(ZoneChange, WithoutZoneFolderOffsetsAreFilesOfOurOwn) {
+TEST_F(ZoneChange, WithoutZoneDirectoryOffsetsAreFilesOfOurOwn) {
     host.remove("usr");
     host.remove("etc/localtime");
     ASSERT_TRUE(changeOffset(root(), 60));
@@ -216,7 +216,7 @@ TEST(ZoneInForce, IsUtcUnlessTheFileCanBeTrusted) {
     EXPECT_EQ(offset(), 0);
     host.remove("etc/localtime");
     host.write("var/zone", host.read("usr/share/zoneinfo/Asia/Kolkata"));
-    host.link("/var/zone", "etc/localtime"); // neither here nor in the zone folder
+    host.link("/var/zone", "etc/localtime"); // neither here nor in the zone directory
     EXPECT_EQ(offset(), 0);
     host.remove("etc/localtime");
     host.write("etc/localtime", "text");

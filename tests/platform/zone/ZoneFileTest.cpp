@@ -16,8 +16,8 @@ namespace {
 
 using namespace std::literals;
 
-constexpr std::int64_t WINTER_2026 = 1768435200; // January 15
-constexpr std::int64_t SUMMER_2026 = 1784073600; // July 15
+constexpr std::int64_t winter2026 = 1768435200; // January 15
+constexpr std::int64_t summer2026 = 1784073600; // July 15
 
 std::string zoneBytes(const std::string& name) {
     std::ifstream file("/usr/share/zoneinfo/" + name, std::ios::binary);
@@ -46,32 +46,32 @@ TEST(ZoneFile, TellsOffsetsAndDaylightSaving) {
     };
     for (const Expected& each : zones) {
         const TimeZone read = zone(each.name);
-        EXPECT_EQ(read.at(WINTER_2026).offset, each.winter) << each.name;
-        EXPECT_EQ(read.at(SUMMER_2026).offset, each.summer) << each.name;
-        EXPECT_EQ(read.standardOffsetAt(WINTER_2026), each.standard) << each.name;
-        EXPECT_EQ(read.standardOffsetAt(SUMMER_2026), each.standard) << each.name;
-        EXPECT_EQ(read.hasDaylightSavingFrom(SUMMER_2026), each.daylight) << each.name;
+        EXPECT_EQ(read.at(winter2026).offset, each.winter) << each.name;
+        EXPECT_EQ(read.at(summer2026).offset, each.summer) << each.name;
+        EXPECT_EQ(read.standardOffsetAt(winter2026), each.standard) << each.name;
+        EXPECT_EQ(read.standardOffsetAt(summer2026), each.standard) << each.name;
+        EXPECT_EQ(read.hasDaylightSavingFrom(summer2026), each.daylight) << each.name;
     }
 }
 
 TEST(ZoneFile, StandardTimeIsWhatTheZoneCallsSo) {
     // Ireland's standard time is that of summer: in winter it saves daylight the other way round.
-    EXPECT_EQ(zone("Europe/Dublin").standardOffsetAt(WINTER_2026), 3600);
-    EXPECT_TRUE(zone("Europe/Dublin").hasDaylightSavingFrom(WINTER_2026));
+    EXPECT_EQ(zone("Europe/Dublin").standardOffsetAt(winter2026), 3600);
+    EXPECT_TRUE(zone("Europe/Dublin").hasDaylightSavingFrom(winter2026));
 }
 
 TEST(ZoneFile, DaylightSavingThatIsOverIsNone) {
     const TimeZone japan = zone("Asia/Tokyo");
     EXPECT_TRUE(japan.hasDaylightSavingFrom(-700000000)); // 1947, with some to come
-    EXPECT_FALSE(japan.hasDaylightSavingFrom(WINTER_2026));
+    EXPECT_FALSE(japan.hasDaylightSavingFrom(winter2026));
 }
 
 /// Every installed zone, by its name.
 std::vector<std::string> installedZones() {
-    const std::filesystem::path folder = "/usr/share/zoneinfo";
+    const std::filesystem::path directory = "/usr/share/zoneinfo";
     std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::recursive_directory_iterator(folder)) {
-        const std::string name = entry.path().lexically_relative(folder);
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(directory)) {
+        const std::string name = entry.path().lexically_relative(directory);
         if (entry.is_regular_file() && zoneBytes(name).substr(0, 4) == "TZif") names.push_back(name);
     }
     return names;
@@ -131,8 +131,8 @@ TEST(ZoneFile, OfTheFirstVersionHasOneBlock) {
 TEST(ZoneFile, OfOurOwnIsWhatItsOffsetSays) {
     for (int minutes = -14 * 60; minutes <= 14 * 60; ++minutes) {
         const TimeZone read = parseZoneFile(makeZoneFile(minutes)).value();
-        ASSERT_EQ(read.at(WINTER_2026).offset, minutes * 60);
-        ASSERT_EQ(read.at(SUMMER_2026).offset, minutes * 60);
+        ASSERT_EQ(read.at(winter2026).offset, minutes * 60);
+        ASSERT_EQ(read.at(summer2026).offset, minutes * 60);
         ASSERT_FALSE(read.hasDaylightSavingFrom(0));
     }
     const std::string bytes = makeZoneFile(330);

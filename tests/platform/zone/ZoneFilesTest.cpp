@@ -148,12 +148,12 @@ TEST_F(ZoneFilesOfHost, StartFromTheZoneThatIsInForceWhenTheirTurnComes) {
 TEST_F(ZoneFilesOfHost, OfANameThatCannotBeReadAreChangedAllTheSame) {
     use("Europe/Berlin");
     host.remove("etc/timezone");
-    host.write("etc/timezone/note", "a folder");
+    host.write("etc/timezone/note", "a directory");
     ASSERT_TRUE(changeOffset(root(), 330));
     EXPECT_THAT(takeLog(),
                 ElementsAre(HasSubstr("6000 /etc/timezone does not follow: Is a directory"), StartsWith("3000 ")));
     ASSERT_TRUE(changeDaylightSaving(root(), true));
-    EXPECT_EQ(host.read("etc/timezone/note"), "a folder");
+    EXPECT_EQ(host.read("etc/timezone/note"), "a directory");
 
     host.remove("etc/timezone");
     const std::string large(2 << 20, 'x');
