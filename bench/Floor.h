@@ -2,5 +2,5 @@
 
 #include "objectmanager/model/Values.h"
 
-/// Tells the floor's provider which answer to make, until told otherwise; it is not copied.
+/// Sets the answer that the floor's provider makes from now on. It is not copied.
 extern "C" void Floor_Prepare(const om::Answer* answer);

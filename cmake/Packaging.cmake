@@ -64,7 +64,7 @@ set(CPACK_DEBIAN_TOOLS_PACKAGE_DEPENDS "vk-baseserver-provider (= ${PROJECT_VERS
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_NAME vk-baseserver-dev)
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_SECTION libdevel)
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_DEPENDS "vk-baseserver-provider (= ${PROJECT_VERSION})")
-# Our own libraries are told to dpkg-shlibdeps by the list above.
+# dpkg-shlibdeps finds our own libraries here; packaging/debian/shlibs, above, says which package holds them.
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${CMAKE_LIBRARY_OUTPUT_DIRECTORY})
 
 set(CPACK_RPM_COMPONENT_INSTALL ON)

@@ -55,7 +55,7 @@ json node(Choices& choices, const std::string& hostName) {
     made["status"] = choices.below(32);
     made["description"] = text(choices, nodeNames);
     made["properties"] = json::object();
-    // The one that elements are told by comes more often than chance would have it.
+    // The property that identifies an element is set more often than chance would have it.
     if (!choices.oneIn(4))
         made["properties"][made["type"] == computerNode ? nameProperty : serialProperty] = value(choices, hostName);
     for (std::size_t i = choices.below(6); i > 0; --i)
@@ -65,7 +65,7 @@ json node(Choices& choices, const std::string& hostName) {
     return made;
 }
 
-/// What a node is told by.
+/// What identifies a node.
 std::optional<std::string> identity(const json& made, const char* property) {
     const auto found = made["properties"].find(property);
     if (found == made["properties"].end() || !found->is_string()) return std::nullopt;

@@ -8,7 +8,7 @@
 
 namespace fuzz {
 
-/// What each node of a type is told by, in order; nothing for a node that has no such text.
+/// What identifies each node of a type, in order; nothing for a node that has no such text.
 using Identities = std::vector<std::optional<std::string>>;
 
 /// A simulated host of up to seven nodes.

@@ -94,8 +94,8 @@ fuzz::Identities::const_iterator theOnly(const fuzz::Identities& all, const om::
     return found == all.end() || std::find(found + 1, all.end(), *text) == all.end() ? found : all.end();
 }
 
-/// Whether an end of an association names one element that can be found from it. The search for a chassis fails at the
-/// first one without a serial number, which is meant: those behind it cannot be found.
+/// Whether an end of an association names one element that can be found from it. The search for a chassis ends at the
+/// first one without a serial number, on purpose: those behind it cannot be found.
 bool endCanBeFound(const om::ObjectPath& end, const fuzz::RandomHost& host) {
     if (end.className == "VESKA_ComputerSystem") return theOnly(host.computers, end, "Name") != host.computers.end();
     if (end.className != "VESKA_PhysicalPackage") return true;
@@ -104,7 +104,7 @@ bool endCanBeFound(const om::ObjectPath& end, const fuzz::RandomHost& host) {
 }
 
 /// Whether the path names one element: that of a computer without a name or a chassis without a tag does not, nor that
-/// of an association with an end that cannot be found. The time service's association cannot be got, which is meant.
+/// of an association with an end that cannot be found. GetInstance does not serve the time service's, on purpose.
 bool canBeGot(const om::ObjectPath& path, const fuzz::RandomHost& host) {
     if (path.className == "VESKA_TimeServiceAffectsElement") return false;
     if (path.className == "VESKA_ComputerSystem") return keyOf(path, "Name") != nullptr;
@@ -132,7 +132,7 @@ void checkThatAllCanBeGot(const om::Answer& answer, const fuzz::RandomHost& host
         if (canBeGot(pathOf(result), host)) checkThatItCanBeGot(pathOf(result), host);
 }
 
-/// Few requests are for associations, on which the shape of the host tells most: every host is asked for its own.
+/// Few requests are for associations, for which the shape of the host matters most: every host is asked for its own.
 void checkAssociations(const fuzz::RandomHost& host) {
     for (const char* className : {"VESKA_ComputerCapabilities", "VESKA_ComputerSystemPackage"}) {
         om::Request request;

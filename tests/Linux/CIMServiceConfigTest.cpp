@@ -66,7 +66,7 @@ TEST_F(CIMServiceConfigTest, FindsTheCommandsBesideThePlatform) {
         {"/srv/platform/x/platform/", "/srv/vcm/bin/"},
         {"/opt/vk/", "/opt/vk/vcm/bin/"},
         {"/opt/Platform/", "/opt/Platform/vcm/bin/"},
-        // Meant: only the low byte of each wide character is kept.
+        // On purpose, only the low byte of each wide character is kept.
         {"/opt/v\xC3\xA4/platform/", "/opt/v\xE4/vcm/bin/"},
         {"/opt/\xC4\x80k/platform/", "/opt/\0k/vcm/bin/"},
     };

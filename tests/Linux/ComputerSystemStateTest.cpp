@@ -1,4 +1,4 @@
-// What a computer tells of how it is: health, operational and enabled state, purpose.
+// The state of a computer: health, operational and enabled state, purpose.
 
 #include "Linux/ComputerSystem.h"
 #include "Linux/OneComputer.h"

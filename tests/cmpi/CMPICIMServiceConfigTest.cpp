@@ -116,7 +116,7 @@ TEST_F(CMPICIMServiceConfigTest, SetsWhatTheArgumentsSay) {
         {{attempts(5), interval(30)}, {setInterval + "30] [-p]", setAttempts + "5] [-p]"}, CMPI_RC_OK},
         {{interval(0), attempts(0)}, {setInterval + "0] [-p]", setAttempts + "0] [-p]"}, CMPI_RC_OK},
         {{interval(2147483647)}, {setInterval + "2147483647] [-p]"}, CMPI_RC_OK},
-        {{interval(2147483648), attempts(4294967295)}, // meant: signed
+        {{interval(2147483648), attempts(4294967295)}, // signed on purpose
          {setInterval + "-2147483648] [-p]", setAttempts + "-1] [-p]"},
          CMPI_RC_OK},
         {{attempts(5), uint32("another", 1), uint32("third", 2), uint32("fourth", 3)},

@@ -30,7 +30,7 @@ om::ObjectPath association(const std::string& tag, const std::string& name) {
 std::vector<std::string> namedEnds() {
     const om::Answer names = test::names(className);
     EXPECT_EQ(test::ends(test::pathsOfInstances(test::instances(className))), test::ends(test::paths(names)));
-    EXPECT_FALSE(names.done); // meant: neither enumeration of this class is closed
+    EXPECT_FALSE(names.done); // on purpose: neither enumeration of this class is closed
     EXPECT_EQ(names.code, CMPI_RC_OK);
     return test::ends(test::paths(names));
 }
@@ -129,7 +129,7 @@ TEST(CMPIComputerSystemPackage, LeadsFromAChassisNowhereOnAHostWithoutComputer) 
     EXPECT_TRUE(answer.done);
 }
 
-// Meant: bases further up are not reached, nor is the class at this end.
+// On purpose, bases further up are not reached, nor is the class at this end.
 TEST(CMPIComputerSystemPackage, ReachesOnlyTheClassAtTheOtherEndAndItsBase) {
     test::simulate({test::computer(0, "a"), test::chassis(0, 0, "A")});
     for (const auto& [source, resultClass] :

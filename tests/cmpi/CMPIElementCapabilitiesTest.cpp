@@ -46,7 +46,7 @@ TEST(CMPIElementCapabilities, EnumerateOneAssociationPerComputerEachWithItsOwnCa
     EXPECT_TRUE(names.done);
     const om::Answer instances = test::instances(className);
     EXPECT_EQ(test::ends(test::pathsOfInstances(instances)), test::ends(test::paths(names)));
-    EXPECT_FALSE(instances.done); // meant: only the names are closed
+    EXPECT_FALSE(instances.done); // on purpose: only the names are closed
 }
 
 TEST(CMPIElementCapabilities, HoldTheirReferencesAsProperties) {

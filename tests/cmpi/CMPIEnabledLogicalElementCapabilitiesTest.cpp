@@ -38,7 +38,7 @@ TEST(CMPIEnabledLogicalElementCapabilities, LeaveOutWhatTheHostCannotAnswer) {
     test::simulate({node});
     const om::Answer answer = test::instances(className);
     EXPECT_THAT(test::namesOf(test::instancesOf(answer)[0].properties), ElementsAre("InstanceID"));
-    EXPECT_FALSE(answer.done); // meant: this enumeration is not closed
+    EXPECT_FALSE(answer.done); // on purpose: this enumeration is not closed
 }
 
 TEST(CMPIEnabledLogicalElementCapabilities, AnswerAnUnknownInstanceIDWithNothingAndNoError) {

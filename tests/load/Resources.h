@@ -18,7 +18,7 @@ struct Resources {
 /// Whether memory can be judged: a sanitizer's allocator keeps what is freed.
 bool memoryTells();
 
-/// Whether what malloc handed out can be told exactly: not while each thread caches some of what it freed.
+/// Whether it is known exactly what malloc handed out: not while each thread caches some of what it freed.
 bool heapTells();
 
 /// The product's libraries that are mapped into this process, by file name.

@@ -67,11 +67,11 @@ std::vector<FaultCase> associationCases() {
     return cases;
 }
 
-/// Without them the object manager has not told what is asked for: the class, the namespace, the keys.
+/// Without them the provider does not know what is asked for: the class, the namespace, the keys.
 const std::set<std::string> telling = {"getClassName", "getCharPtr",  "classPathIsA", "getNameSpace",
                                        "getKey",       "getKeyCount", "getKeyAt"};
 
-/// What was not told may be taken for a class that is not known. Paths are made to ask about relations of classes.
+/// Without its name a class may count as one that is not known. Paths are made to ask about relations of classes.
 bool mayHideTheClass(const std::string& kind) {
     return isOneOf(kind, {"getClassName", "getCharPtr", "classPathIsA", "newObjectPath"});
 }
@@ -81,7 +81,7 @@ bool isAssociated(const om::Request& request) {
 }
 
 /// The elements that one refused call may cost: one, but
-/// - all of the request's where the object manager did not tell what is asked for;
+/// - all of the request's where the provider does not know what is asked for;
 /// - all at the other end of an association where the one path is refused that chooses them;
 /// - a computer's chassis in a walk of their associations, which are found by the computer's path.
 std::size_t mostLost(const om::Request& request, const std::string& kind, const Outcome& whole) {
@@ -90,7 +90,7 @@ std::size_t mostLost(const om::Request& request, const std::string& kind, const 
     return choosing && request.path.className == "VESKA_ComputerSystemPackage" ? test::mostChassis : 1;
 }
 
-/// The status is that of the answer without a fault, unless the class was not told.
+/// The status is that of the answer without a fault, unless the provider could not read the class.
 void checkStatus(const std::string& kind, const om::Answer& answer, const om::Answer& whole) {
     EXPECT_FALSE(answer.message);
     if (answer.code == whole.code) return;
@@ -100,7 +100,7 @@ void checkStatus(const std::string& kind, const om::Answer& answer, const om::An
     EXPECT_TRUE(answer.results.empty());
 }
 
-/// Whether it is closed as it is without a fault, or is not for a reason that the log tells.
+/// Whether it is closed as it is without a fault, or is not for a reason that the log says.
 void checkDone(const std::string& kind, const Outcome& outcome, const Outcome& whole, bool thrown) {
     const bool cut = thrown || outcome.answer.code != whole.answer.code || kind == "returnDone";
     EXPECT_EQ(outcome.answer.done, whole.answer.done && !cut);

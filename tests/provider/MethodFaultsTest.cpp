@@ -97,7 +97,7 @@ TEST_F(MethodFaultsTest, AMethodAnswersACodeOfItsOwnOrFailedWithTheText) {
                 return;
             }
             checkMethod(kind, outcome, whole, 1);
-            // An argument that the object manager says is not there is left out; one that it cannot tell is told of.
+            // An argument that the object manager calls missing is left out; one that cannot be read is logged too.
             const bool skipped = outcome.answer.code == whole.answer.code && outcome.commands != whole.commands;
             if (skipped) {
                 EXPECT_EQ(test::added(outcome.lines, whole.lines).size(), unstated ? 0u : 1u);
@@ -154,7 +154,7 @@ TEST_F(MethodFaultsTest, AnExceptionWhoseTextTheBrokerDoesNotMakeAnswersFailedWi
     EXPECT_EQ(std::count_if(outcome.lines.begin(), outcome.lines.end(), test::tellsException), 1);
 }
 
-/// A change of the time service, or of a class that takes none, either happens or does not and is told of.
+/// A change of the time service, or of a class that takes none, either happens, or does not and is logged.
 /// `mostLines` is how many properties can be read in vain.
 void checkModify(const std::string& kind, bool unstated, const Outcome& outcome, const Outcome& whole,
                  std::size_t mostLines) {

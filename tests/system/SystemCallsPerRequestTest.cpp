@@ -25,8 +25,8 @@ struct Case {
 
 const std::string computer = "VESKA_ComputerSystem.Name=\"node7\"";
 
-// A name takes one uname where the kernel tells it. A stat asks a file whether it has changed: of a snapshot the host
-// name, two files that tell the end of the host and the directory of memory controllers; of a time zone its link and
+// A name takes one uname where the kernel has it. A stat asks a file whether it has changed: of a snapshot the host
+// name, two files that show a shutdown and the directory of memory controllers; of a time zone its link and
 // its file. Nothing is opened, listed or started.
 // clang-format off
 const std::vector<Case> cases = {
@@ -96,7 +96,7 @@ protected:
         std::vector<std::string> request = GetParam().request;
         for (std::string& word : request)
             if (const auto at = word.find("node7"); at != std::string::npos) word.replace(at, 5, hostName);
-        usleep(50'000); // until the files' stamps tell every change
+        usleep(50'000); // until the files' stamps show every change
         Calls few = callsOf("NVLOG_SINK=none " + environment, request, 2);
         Calls more;
         for (const auto& [call, count] : callsOf("NVLOG_SINK=none " + environment, request, 12))

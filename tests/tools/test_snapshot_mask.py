@@ -1,4 +1,4 @@
-"""vk-host-snapshot --mask: a masked copy tells the same but for what names the machine."""
+"""vk-host-snapshot --mask: a masked copy gives the same answers but for what names the machine."""
 
 import os
 import struct
@@ -77,7 +77,7 @@ class Tables(unittest.TestCase):
     TABLE = "sys/firmware/dmi/tables/DMI"
 
     def masked(self, data):
-        """The masked copy of a table, which must tell the provider the same but for serial numbers and UUID."""
+        """The masked copy of a table. The provider must answer the same from it, but for serial numbers and UUID."""
         root = make_host(data)
         target, done = take(root, "--mask")
         self.assertEqual(done.returncode, 0, done.stderr)

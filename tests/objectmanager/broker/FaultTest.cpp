@@ -97,7 +97,7 @@ TEST_F(FaultTest, AnObserverIsToldOfEachCallBeforeItIsDone) {
     });
     made = path("A");
     made->ft->addKey(made, "Name", chars("x"), CMPI_chars);
-    made->ft->addKey(made, nullptr, chars("x"), CMPI_chars); // refused, and told of all the same
+    made->ft->addKey(made, nullptr, chars("x"), CMPI_chars); // refused, and seen all the same
     EXPECT_THAT(calls, testing::ElementsAre("newObjectPath", "getKeyCount", "addKey0", "getKeyCount", "addKey1"));
 }
 

@@ -2,7 +2,7 @@
 
 #include <type_traits>
 
-// Where sizes agree, these tell the types apart.
+// These compare the types themselves: types that differ may have the same size.
 #define SAME(name, ...) static_assert(std::is_same<name, __VA_ARGS__>::value, #name);
 #include "TypeNames.inc"
 

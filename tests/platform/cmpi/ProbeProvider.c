@@ -1,5 +1,5 @@
 /*
- * A provider made with the stubs, in plain C, that tells which of its functions was called and with what. It also
+ * A provider made with the stubs, in plain C, that records which of its functions was called and with what. It also
  * compiles as C++.
  */
 #include "ProbeProvider.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-/* What a ProbeProvider library tells about itself. */
+/* What a ProbeProvider library says about itself. */
 
 #include <cmpift.h>
 

@@ -136,7 +136,7 @@ TEST_P(CmpiStubs, FillThePropertyTableButForTheOrigin) {
 TEST_P(CmpiStubs, FillTheIndicationTableToItsEnd) {
     auto* mi = create<CMPIIndicationMI>("Indication");
     ASSERT_NE(mi, nullptr);
-    expectVersionsAndName(mi, "IndicationProbe"); // the capital letter is meant: brokers know it so
+    expectVersionsAndName(mi, "IndicationProbe"); // a capital letter on purpose: brokers know it so
     CMPISelectExp filterObject{};
     const CMPISelectExp* filter = &filterObject;
     expectCalls("probeIndicationCleanup", mi->ft->cleanup, mi, yes);

@@ -101,7 +101,7 @@ TEST_F(CursorTest, SeesWhatItWroteAndGoesOnFromThere) {
     EXPECT_THAT(rest(), ElementsAre("/b", "/c"));
 }
 
-/// Tells another status at each look, and another name of a node whose name is not in the file.
+/// Returns another status at each look, and another name of a node whose name is not in the file.
 class AgeingHost : public NodeSource {
 public:
     explicit AgeingHost(SimulatedHost& theNodes) : nodes(theNodes) {}

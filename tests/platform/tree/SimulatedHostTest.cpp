@@ -64,7 +64,7 @@ TEST_F(SimulatedHostTest, WritesWhatMayBeWrittenAndNothingElse) {
 }
 
 TEST_F(SimulatedHostTest, ParsesAnUnchangedFileOnce) {
-    usleep(50'000); // until the file's stamp tells every change
+    usleep(50'000); // until the file's stamp shows every change
     host.tree();
     const auto first = host.tree();
     EXPECT_EQ(host.tree(), first);

@@ -4,7 +4,7 @@
 #include <cstring>
 #include <stdexcept>
 
-/// How the tests tell a replaced library what to do, through the environment.
+/// The environment variables through which the tests say what a replaced library does.
 namespace replacement {
 
 inline const char* setting(const char* name) {

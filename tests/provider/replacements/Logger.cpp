@@ -1,5 +1,5 @@
 // A logger in place of the product's, with the same headers. It appends the texts it receives to REPLACEMENT_LOG, fails
-// where it is told to, and with REPLACEMENT_KEEPS=1 its buffer never starts anew.
+// where the environment says so, and with REPLACEMENT_KEEPS=1 its buffer never starts anew.
 #include "Environment.h"
 #include "nvlog/NVLogger.h"
 #include "nvlog/NVMessageBuffer.h"
