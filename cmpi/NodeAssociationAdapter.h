@@ -76,7 +76,7 @@ private:
         } else if (requestedClassId == Self::associationClassId) {
             if (!setObjectPath(objectPath)) throw InstrumentationException("Could not find instance");
         }
-        // Meant: for any other class there is nothing to return, once.
+        // On purpose: for any other class the adapter stands once, and returns null.
     }
 
     Self& self() { return static_cast<Self&>(*this); }

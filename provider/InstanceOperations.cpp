@@ -68,8 +68,8 @@ constexpr ClassRow row(ClassId classId, Service enumInstanceNames, Service enumI
     return {classId, walkNames<Adapter>, walkInstances<Adapter>, enumInstanceNames, enumInstances, getInstance};
 }
 
-// Which class each operation serves, and whether it closes the result. Clients have come to depend on every one of the
-// irregularities: they are meant.
+// Which class each operation serves, and whether it closes the result. The irregularities are kept on purpose because
+// clients have come to depend on every one of them.
 // clang-format off
 constexpr ClassRow classRows[] = {
     //                                            class                                       EnumInstanceNames EnumInstances GetInstance

@@ -8,7 +8,7 @@ namespace vkcim {
 
 namespace {
 
-/// Gives the standard output away, to whom it does not belong any more: a descriptor of the file that it was, which
+/// Makes standard output lead to standard error. Returns a descriptor of what standard output was before, which
 /// commands do not inherit; -1 where it is closed.
 int takeStandardOutput() {
     const int own = fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1);

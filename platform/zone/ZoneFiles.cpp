@@ -110,7 +110,7 @@ struct ZoneFiles::Session {
     std::optional<FileLock> lock;
     std::optional<ZoneMemory> memory;
     SavedZone present;
-    int zoneNameError = 0; ///< why /etc/timezone cannot be told
+    int zoneNameError = 0; ///< why /etc/timezone cannot be seen
 };
 
 bool ZoneFiles::fail(const std::string& what, int error) {

@@ -7,7 +7,7 @@
 namespace VK::Zone {
 
 /// One change of the files that make the time zone: /etc/localtime, /etc/timezone where there is one, and the memory of
-/// what they were before. Changes of several processes wait for each other. Each answers true when the host is as
+/// what they were before. Changes of several processes wait for each other. Each returns true when the host is as
 /// asked once every other change is over, whether this one had to change anything or not; false when that failed, and
 /// then zone and memory are as before.
 class ZoneFiles {

@@ -44,8 +44,8 @@ public:
     static unsigned int getKeyCount(const CMPIObjectPath* objectPath);
 
     /// Reads a text or a reference key, its name without regard to case: true and the value, or false (no such key, of
-    /// another type, or null) with `value` untouched. Throws std::runtime_error when the broker answers an error, other
-    /// than that the key is not there, to every way of asking that it offers, and when it offers none.
+    /// another type, or null) with `value` untouched. Throws std::runtime_error when the broker offers no
+    /// way of asking, or every way that it offers returns another error than that the key is missing.
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, std::string& value);
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, CMPIObjectPath** value);
 
@@ -54,7 +54,7 @@ public:
     static bool setKeyProperty(CMPIObjectPath* objectPath, const char* name, CMPIObjectPath* value);
 
     /// Appends the path's keys to the moniker, in order: text as it is, integers in decimal, booleans as `TRUE` and
-    /// `FALSE`; references, nulls and other kinds are left out. False when the broker would not tell the keys.
+    /// `FALSE`; references, nulls and other kinds are left out. False when the broker did not return the keys.
     static bool transformObjectPathToMoniker(const CMPIObjectPath* objectPath, Moniker& moniker);
     /// Adds the moniker's pairs to the path as text keys, in order; false when one was refused. The moniker's cursor
     /// stands on its first pair then; in a moniker without pairs it stays where it was.
