@@ -12,7 +12,7 @@ static const TraceSource source{loggerComputerSystemPackage, "ComputerSystemPack
 
 namespace {
 
-/// Stands on the first chassis of that serial number, or on nothing.
+/// Selects the first chassis of that serial number, or nothing.
 void selectChassis(Instrumentation& cursor, const std::string& tag) {
     for (cursor.selectNode(NodeLexicon::SystemChassisNode); cursor; ++cursor) {
         std::string serial;

@@ -36,7 +36,7 @@ unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CM
     for (Argument& argument : arguments)
         argument.given = ProviderUtilities::getProperty(in, argument.name, argument.value);
 
-    // In this order; the first failure ends it, and otherwise the last setting's result is the answer.
+    // In this order; the first failure ends it; otherwise the last setting's result is returned.
     unsigned int answer = CMPI_RC_ERR_INVALID_PARAMETER;
     for (const Argument& argument : arguments) {
         if (!argument.given) continue;

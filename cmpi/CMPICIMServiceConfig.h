@@ -12,7 +12,7 @@ public:
     using Data = CIMServiceConfig;
 
     /// Runs `SetCIMconfig` (any other name, in any case: 17) and returns a CMPI return code: 0, 1 for a failed command,
-    /// 4 without an argument that can be used. `out` and `result` are not used.
+    /// 4 without a usable argument. `out` and `result` are not used.
     unsigned int invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out, const CMPIResult* result);
 
     /// Hands a request of the form name=value to the data class and returns its result.

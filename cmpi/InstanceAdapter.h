@@ -106,7 +106,7 @@ protected:
     Data data;
 
 private:
-    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    /// The scope is that of the whole constructor: its entry line stands before those of the members.
     InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, const CMPIObjectPath* objectPath,
                     const ParameterTraceScope&)
         : broker(theBroker), context(theContext), nameSpace(ProviderUtilities::getNamespace(objectPath)) {

@@ -30,7 +30,7 @@ struct Request {
     unsigned short classId;
     Service service;
 
-    /// To be called while the adapter stands: administrators read the lines of its end as the end of the answer.
+    /// To be called while the adapter lives: administrators read the lines of its end as the end of the answer.
     void closeIfDone() const {
         if (service != Open) answer.close();
     }

@@ -44,7 +44,7 @@ const std::vector<std::string>& faultNames();
 /// The kind of that name, exactly as it is written; nothing for another text.
 std::optional<FaultKind> faultKind(std::string_view name);
 
-/// A failure that is asked for: as object managers fail when they run out of memory. It answers null (a count 0, data
+/// A failure that is asked for: as object managers fail when they run out of memory. It returns null (a count 0, data
 /// that is not there) with the status CMPI_RC_ERR_FAILED, and does nothing else.
 struct Fault {
     FaultKind kind = FaultKind::None;

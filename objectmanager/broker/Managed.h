@@ -90,7 +90,7 @@ public:
 
     /// The innermost call of this thread, or null.
     static Call* current();
-    /// Whether the arena is that of a call of this thread, so that this thread may touch its objects.
+    /// Whether the arena belongs to a call of this thread, so that this thread may touch its objects.
     static bool ofThisThread(const Arena* arena);
 
     Arena& arena() { return arena_; }

@@ -11,7 +11,7 @@ struct FileStamp {
     FileStamp() = default;
     explicit FileStamp(const struct stat& status);
 
-    /// Of what stands at a path, a link itself.
+    /// Of what stands at a path; for a link, of the link itself.
     static FileStamp of(const char* path);
     /// Of what a path leads to.
     static FileStamp behind(const char* path);

@@ -10,7 +10,7 @@
 namespace VK::Zone {
 
 /// Sets this host's clock to a CIM date-time, and then the hardware clock where there is one. True when the clock
-/// was set; else false, with one log line that says why: the text is none, lies before 2000, the root is not this
+/// was set; else false, with one log line that says why: no date-time, one before 2000, the root is not this
 /// host's, or the privilege CAP_SYS_TIME is missing. A change writes one line too: from when, to when, by whom.
 bool changeClock(const Root& root, const std::string& text);
 

@@ -21,8 +21,8 @@ public:
 
     explicit ZoneFiles(const Root& hostRoot) : root(hostRoot) {}
 
-    /// Puts a zone of that offset for ever into force, unless that is the offset now. What it replaces is remembered,
-    /// unless something is already.
+    /// Puts a zone that always has that offset into force, unless it is the offset now. What it replaces is
+    /// remembered, unless something is already.
     bool putOffset(int minutes);
     /// The same at the standard offset of a zone with daylight saving, which is remembered instead of any other.
     bool dropDaylightSaving();

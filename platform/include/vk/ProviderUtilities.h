@@ -13,7 +13,7 @@ namespace VK {
 
 /// What a provider does with CMPI objects, on top of any broker.
 ///
-/// Every status and null that the broker answers is checked. A key or property that the broker refuses is left out
+/// Every status and null that the broker returns is checked. A key or property that the broker refuses is left out
 /// and logged once, at level 6000, and so is a path or an instance that it does not make. Paths, instances and arrays
 /// belong to the broker and are never freed here. Nothing is thrown but std::bad_alloc, and std::runtime_error where
 /// said: a request whose keys cannot be read must not be taken for one without them, which means all. A null path,
@@ -33,13 +33,13 @@ public:
     static bool areClassesRelated(const CMPIBroker* broker, const std::string& nameSpace, const char* className,
                                   const char* otherClassName);
 
-    /// A path's namespace; empty when it has none. Throws std::runtime_error when the broker answers an error.
+    /// A path's namespace; empty when it has none. Throws std::runtime_error when the broker returns an error.
     static std::string getNamespace(const CMPIObjectPath* objectPath);
 
     /// A new path without keys, or null.
     static CMPIObjectPath* createObjectPath(const CMPIBroker* broker, const char* className, std::string nameSpace);
 
-    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker answers an error, or
+    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker returns an error, or
     /// cannot be asked.
     static unsigned int getKeyCount(const CMPIObjectPath* objectPath);
 
