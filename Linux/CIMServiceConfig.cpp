@@ -25,7 +25,7 @@ int runAlone(const std::string& command) {
 struct CIMServiceConfig::Setting {
     const char* argument; ///< its name in requests
     const char* setCommand;
-    const char* getCommand; ///< with two blanks, which is meant
+    const char* getCommand; ///< with two blanks, on purpose
     const char* outputKey;
 };
 
@@ -99,7 +99,7 @@ bool CIMServiceConfig::get(const TracePoint& at, const Setting& setting, unsigne
     stream.readLine(line, sizeof line);
     traceVariable(at, "output from cimconfig command :", line);
     const std::string text = line;
-    // Meant: without a ":" the position behind it wraps to 0, and the whole line is read.
+    // On purpose: without a ":" the position behind it wraps to 0, and the whole line is read.
     const std::string number = text.substr(text.find(':') + 1);
     value = static_cast<unsigned int>(std::strtol(number.c_str(), nullptr, 10));
     traceVariable(at, setting.outputKey, value);
@@ -127,7 +127,7 @@ bool CIMServiceConfig::getAttemptParameter(unsigned int& attemptsOut) const {
 }
 
 unsigned int CIMServiceConfig::executeCIMServiceConfig(std::string& request) {
-    const TraceScope scope(VK_SCOPE(source), FailureLevel); // meant: the entry stands at the failures' level
+    const TraceScope scope(VK_SCOPE(source), FailureLevel); // on purpose: the entry line has this level
     const std::size_t equals = request.find('=');
     if (equals == std::string::npos) return 1;
     const std::string name = request.substr(0, equals);

@@ -10,7 +10,7 @@ namespace VK::BaseServerProvider {
 /// cannot be read.
 std::string requiredComputerName(const Instrumentation& node, const char* failure);
 
-/// Stands on the first computer node of exactly this name, or on nothing. A computer without a name met before throws
+/// Selects the first computer node of exactly this name, or nothing. A computer without a name before it throws
 /// InstrumentationException.
 void selectComputer(Instrumentation& cursor, const std::string& name);
 

@@ -143,7 +143,7 @@ bool ComputerSystem::getEnabledState(unsigned short& state) const {
     case 16:
         state = 4; // Shutting Down
         break;
-    default: // meant: the state stays as it was, and is supplied all the same
+    default: // on purpose: the state stays as it was, and is supplied
         break;
     }
     return true;
@@ -170,7 +170,7 @@ void ComputerSystem::makeTexts(const std::string* uuid) const {
     }
     std::string serial;
     std::string model;
-    // The computer's own serial number and model, not the chassis', which is meant.
+    // On purpose: the computer's own serial number and model, not the chassis'.
     if (*identity.hasChassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
         node().getProperty(NodeLexicon::ModelProperty, model)) {
         add(model + ":" + serial, "CIM:Model:SerialNumber");

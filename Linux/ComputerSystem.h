@@ -10,11 +10,11 @@ namespace VK::BaseServerProvider {
 
 /// How a computer system can be selected.
 enum class ComputerSystemFilter : unsigned int {
-    Name = 0 ///< by its name; a computer without a name passes, which is meant
+    Name = 0 ///< by its name; on purpose, a computer without a name passes
 };
 
 /// The host computer: a cursor over the computer-system nodes, with a getter for each property of the CIM class.
-/// A getter answers true when it supplied a value; otherwise its argument is untouched.
+/// A getter returns true when it supplied a value; otherwise its argument is untouched.
 class ComputerSystem : public NodeCursor<ComputerSystem, ComputerSystemFilter> {
 public:
     ComputerSystem();
@@ -32,18 +32,18 @@ public:
     bool getHealthState(unsigned short& state) const;
     /// "OK", "Pred Fail", "Degraded" or "Unknown".
     bool getStatus(std::string& status) const;
-    /// Appends to `states`, which is meant: what the caller put there stays.
+    /// Appends to `states` on purpose: what the caller put there stays.
     bool getOperationalStatus(std::vector<unsigned short>& states) const;
-    /// 2 enabled, 4 shutting down, 0 unknown; another power state answers true and leaves `state`, which is meant.
+    /// 2 enabled, 4 shutting down, 0 unknown; on purpose, another power state returns true and leaves `state`.
     bool getEnabledState(unsigned short& state) const;
     bool getDedicated(std::vector<unsigned short>& purposes) const;
-    /// Appends what identifies the computer, pair by pair, as it was when first asked for on this node. The answer
-    /// tells only whether there is a chassis: without one it is false although both vectors were filled, which is
-    /// meant.
+    /// Appends what identifies the computer, pair by pair, as it was when first asked for on this node. Returns
+    /// whether there is a chassis, and not whether there are pairs. On purpose: without a chassis it returns false
+    /// although both vectors were filled.
     bool getIdentifyingInfo(std::vector<std::string>& descriptions, std::vector<std::string>& values) const;
     bool getOtherIdentifyingInfo(std::vector<std::string>& values) const;
     bool getIdentifyingDescriptions(std::vector<std::string>& descriptions) const;
-    /// The last two for a reader that wants the texts only where the answer is true: else the argument stays empty.
+    /// The last two for a reader that wants the texts only where they return true: otherwise the argument stays empty.
     bool supplyOtherIdentifyingInfo(std::vector<std::string>& values) const;
     bool supplyIdentifyingDescriptions(std::vector<std::string>& descriptions) const;
 

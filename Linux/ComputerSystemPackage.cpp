@@ -12,7 +12,7 @@ static const TraceSource source{loggerComputerSystemPackage, "ComputerSystemPack
 
 namespace {
 
-/// Stands on the first chassis of that serial number, or on nothing.
+/// Selects the first chassis of that serial number, or nothing.
 void selectChassis(Instrumentation& cursor, const std::string& tag) {
     for (cursor.selectNode(NodeLexicon::SystemChassisNode); cursor; ++cursor) {
         std::string serial;
@@ -37,7 +37,7 @@ void ComputerSystemPackage::getComputerSystemMoniker(Moniker& monikerPackage) {
     const std::string tag = requiredKey(monikerPackage, "Tag");
     traceVariable(source, "tag", tag.c_str());
     selectChassis(instrumentation, tag);
-    // Meant: a chassis that is not there has an empty parent, which shows as a missing name.
+    // On purpose: a missing chassis has an empty parent, which shows as a missing name.
     const std::string parent = instrumentation.getPathToParentNode();
     instrumentation.selectNode(parent);
     const std::string name = requiredComputerName(instrumentation, "Name Property on Computer not available.");

@@ -25,7 +25,7 @@ public:
     /// "Name", InstrumentationException when a computer has no name or none is found.
     void getPhysicalPackageMoniker(Moniker& monikerComputer);
 
-    /// The UUID of the first computer, whichever computer the association concerns, which is meant.
+    /// On purpose the UUID of the first computer, whichever computer the association concerns.
     bool getPlatformGUID(std::string& guid);
 
 private:

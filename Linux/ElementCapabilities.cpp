@@ -21,7 +21,7 @@ ElementCapabilities::~ElementCapabilities() noexcept(false) {
 void ElementCapabilities::getCapabilitiesMoniker(Moniker& monikerComputer) {
     const ParameterTraceScope scope(VK_SCOPE(source), " monikerComputer=", &monikerComputer);
     selectComputer(instrumentation, requiredKey(monikerComputer, "Name"));
-    // Meant: off the end the path is empty, and so is the InstanceID.
+    // On purpose: off the end the path is empty, and so is the InstanceID.
     const std::string instanceID = Instrumentation::convertPathToString(instrumentation.getPathToNode());
     traceVariable(source, "instanceID", instanceID.c_str());
     replaceMoniker(monikerComputer, "InstanceID", instanceID);

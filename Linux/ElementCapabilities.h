@@ -14,8 +14,8 @@ public:
     ElementCapabilities(const ElementCapabilities&) = delete;
     ElementCapabilities& operator=(const ElementCapabilities&) = delete;
 
-    /// From a computer to its capabilities. A name that no computer bears gives an empty "InstanceID" and no error,
-    /// which is meant. Throws FrameworkException without "Name", InstrumentationException when a computer has no name.
+    /// From a computer to its capabilities. A name that no computer has gives an empty "InstanceID" and no error,
+    /// on purpose. Throws FrameworkException without "Name", InstrumentationException when a computer has no name.
     void getCapabilitiesMoniker(Moniker& monikerComputer);
 
     /// From capabilities to their computer. Throws FrameworkException without "InstanceID",

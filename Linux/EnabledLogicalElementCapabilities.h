@@ -13,7 +13,7 @@ enum class EnabledLogicalElementCapabilitiesFilter : unsigned int {
 };
 
 /// What a client may change on the computer system: a cursor over the same nodes as ComputerSystem, one element each.
-/// A getter answers true when it supplied a value; otherwise its argument is untouched.
+/// A getter returns true when it supplied a value; otherwise its argument is untouched.
 class EnabledLogicalElementCapabilities
     : public NodeCursor<EnabledLogicalElementCapabilities, EnabledLogicalElementCapabilitiesFilter> {
 public:
@@ -23,7 +23,7 @@ public:
     /// The text form of the node's path.
     bool getInstanceID(std::string& instanceID) const;
     bool getElementName(std::string& name) const;
-    /// Whether the computer's name can be written; false where the host does not tell.
+    /// Whether the computer's name can be written; false where the host does not say.
     bool getElementNameEditSupported(bool& supported) const;
 
     /// What this host cannot supply.

@@ -7,7 +7,7 @@
 namespace VK::BaseServerProvider {
 
 HostName::HostName() {
-    // Meant: the result does not count. A name that does not fit stays cut; after any other failure the field is empty.
+    // On purpose the result is ignored. A name that does not fit stays cut; after any other failure the field is empty.
     static_cast<void>(gethostname(field, sizeof field));
 }
 

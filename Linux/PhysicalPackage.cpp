@@ -81,7 +81,7 @@ bool PhysicalPackage::getDescription(std::string& description) const {
 
 bool PhysicalPackage::getPackageType(unsigned short& type) const {
     const TraceScope scope(VK_SCOPE(source));
-    // By the node's number; 6 is 12, and 4, 5 and all above 6 are 1, which is meant.
+    // By the node's number; on purpose, 6 is 12, and 4, 5 and all above 6 are 1.
     constexpr unsigned short cimTypes[] = {
         0,  // unknown: Unknown
         3,  // chassis: Chassis/Frame

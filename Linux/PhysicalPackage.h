@@ -9,12 +9,12 @@ namespace VK::BaseServerProvider {
 
 /// How a chassis can be selected.
 enum class PhysicalPackageFilter : unsigned int {
-    TAG = 0,        ///< by its serial number; a chassis without one passes, which is meant
+    TAG = 0,        ///< by its serial number; on purpose, a chassis without one passes
     SYSTEM_NAME = 1 ///< by the path of its parent node
 };
 
 /// The server's chassis: a cursor over the chassis nodes, with a getter for each property of the CIM class.
-/// A getter answers true when it supplied a value; otherwise its argument is untouched.
+/// A getter returns true when it supplied a value; otherwise its argument is untouched.
 class PhysicalPackage : public NodeCursor<PhysicalPackage, PhysicalPackageFilter> {
 public:
     PhysicalPackage();
@@ -29,9 +29,9 @@ public:
     bool getSKU(std::string& sku) const;
     /// The node's description, if there is one.
     bool getElementName(std::string& name) const;
-    /// The node's description, supplied even when it is empty, unlike the element name: both are meant.
+    /// The node's description, on purpose supplied even when it is empty, unlike the element name.
     bool getDescription(std::string& description) const;
-    /// CIM's PackageType; 0 where the host does not tell.
+    /// CIM's PackageType; 0 where the host does not say.
     bool getPackageType(unsigned short& type) const;
 
     /// What this host cannot supply.
@@ -63,7 +63,7 @@ public:
 
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::SystemChassisNode;
-    static constexpr bool evaluatesUnfiltered = false; // meant: unlike the computer
+    static constexpr bool evaluatesUnfiltered = false; // on purpose, unlike the computer
     static constexpr bool remembersNode = false;
     bool passes(const Filter& filter) const;
 };

@@ -104,11 +104,11 @@ unsigned int TimeService::StopService() {
 unsigned int TimeService::SyncClock() {
     const TraceScope scope(VK_SCOPE(source));
     const bool wasRunning = isDaemonRunning();
-    if (wasRunning) StopService(); // meant: its result does not count
+    if (wasRunning) StopService(); // on purpose: its result is ignored
     std::string output;
     const bool synchronised = executeCommand("ntpd -xgq", "r", output) &&
                               (contains(output, "ntpd: time slew") || contains(output, "ntpd: time set"));
-    // Meant: the restart's result replaces that of the synchronisation.
+    // On purpose: the restart's result replaces that of the synchronisation.
     if (wasRunning) return StartService();
     return synchronised ? success : failure;
 }

@@ -10,7 +10,7 @@
 namespace VK::BaseServerProvider {
 
 /// The host's one time service: its identity, the daylight-saving flag, the clock with its GMT offset, and the NTP
-/// daemon. Getters answer true when they supplied a value. Actions answer 0 for success and 2 for failure. Commands run
+/// daemon. Getters return true when they supplied a value. Actions return 0 for success and 2 for failure. Commands run
 /// in the shell and are judged by their first line of output alone, never by their exit status.
 class TimeService : public SingleElement {
 public:
@@ -24,7 +24,7 @@ public:
     bool getSystemName(std::string& name) const;
     bool getSystemCreationClassName(std::string& className) const;
 
-    /// The region is neither known nor settable here, which is meant: false, and nothing is touched.
+    /// On purpose, the region can be neither read nor set here: returns false and changes nothing.
     bool getRegion(std::string&) const { return false; }
     bool setRegion(const std::string&) { return false; }
 
@@ -41,7 +41,7 @@ public:
     unsigned int StopService();
 
     /// Has ntpd set the clock once. A daemon that was running is stopped before and started again after, and then the
-    /// restart's result is the answer, whatever became of the synchronisation, which is meant.
+    /// restart's result is returned, on purpose, whatever became of the synchronisation.
     unsigned int SyncClock();
 
     /// Sets the GMT offset (minutes east of UTC, two's complement), then the clock (seconds since 1970-01-01 UTC), then

@@ -26,7 +26,7 @@ public:
     AssociationAdapter& operator=(const AssociationAdapter&) = delete;
 
     /// The path of the association that stands now, with both references; null when none does, when a path was refused,
-    /// and when the broker could not tell the class of the request's path, whose keys then have chosen nothing.
+    /// and when the broker did not return the class of the request's path, whose keys then have chosen nothing.
     CMPIObjectPath* getObjectPath() const {
         const TraceScope scope(VK_SCOPE(Self::traceSource()));
         if (requestedClassId == ClassId::Unknown) return nullptr;
@@ -86,8 +86,8 @@ protected:
 
     /// A new path of `className`: keyless for a keyless path, else with the keys into which `resolve` turns those of
     /// `objectPath`. Null for null, and when the broker refuses the path or one of its keys, which is logged, or drops
-    /// an empty one: without its keys it would name every element. What `resolve` throws passes; keys that the broker
-    /// does not tell throw InstrumentationException.
+    /// an empty one: without its keys it would name every element. What `resolve` throws passes. Where the broker
+    /// does not return the keys, this throws InstrumentationException.
     template <class Resolve>
     CMPIObjectPath* locate(const char* className, const CMPIObjectPath* objectPath, Resolve resolve) const {
         if (objectPath == nullptr) return nullptr;
@@ -101,8 +101,8 @@ protected:
         return whole ? path : nullptr;
     }
 
-    /// Narrows the walk of an end by a path. False for the null of one that was refused: there is nothing to walk then,
-    /// while an end that is left as it is would go over all elements.
+    /// Narrows the walk of an end by a path. False for null, a path that was refused: there is nothing to walk then,
+    /// while an end that is not narrowed would go over all elements.
     template <class End>
     static bool narrow(End& end, const CMPIObjectPath* path) {
         if (path != nullptr) end.setObjectPath(path);
@@ -124,8 +124,8 @@ protected:
     CMPIComputerSystem computer;
 
 private:
-    /// Whether the path has the one key that its moniker has. Object managers that take an empty text for a key that is
-    /// not there drop it without a word.
+    /// Whether the path has the one key that its moniker has. Some object managers take an empty string for a missing
+    /// key and drop it without an error.
     static bool hasKey(const CMPIObjectPath* path, const Moniker& moniker) {
         std::string name;
         std::string value;

@@ -36,12 +36,12 @@ unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CM
     for (Argument& argument : arguments)
         argument.given = ProviderUtilities::getProperty(in, argument.name, argument.value);
 
-    // In this order; the first failure ends it, and otherwise the last setting's result is the answer.
+    // In this order; the first failure ends it; otherwise the last setting's result is returned.
     unsigned int answer = CMPI_RC_ERR_INVALID_PARAMETER;
     for (const Argument& argument : arguments) {
         if (!argument.given) continue;
         char request[256] = {};
-        // Meant: signed, so that a value above 2147483647 goes out negative.
+        // Signed on purpose, so that a value above 2147483647 goes out negative.
         std::snprintf(request, sizeof request, "%s%s%d", argument.name, "=", static_cast<int>(argument.value));
         answer = executeMethod(request) != 0 ? CMPI_RC_ERR_FAILED : CMPI_RC_OK;
         if (answer != CMPI_RC_OK) break;

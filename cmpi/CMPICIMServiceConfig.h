@@ -11,11 +11,11 @@ public:
     using InstanceAdapter::InstanceAdapter;
     using Data = CIMServiceConfig;
 
-    /// Runs `SetCIMconfig` (any other name, in any case: 17) and answers a CMPI return code: 0, 1 for a failed command,
-    /// 4 without an argument that can be used. `out` and `result` are not used.
+    /// Runs `SetCIMconfig` (any other name, in any case: 17) and returns a CMPI return code: 0, 1 for a failed command,
+    /// 4 without a usable argument. `out` and `result` are not used.
     unsigned int invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out, const CMPIResult* result);
 
-    /// Hands a request of the form name=value to the data class and answers its result.
+    /// Hands a request of the form name=value to the data class and returns its result.
     unsigned int executeMethod(std::string request);
 
     static constexpr char className[] = "VESKA_CIMServiceConfig";

@@ -22,7 +22,7 @@ CMPITimeServiceAffectsElement::CMPITimeServiceAffectsElement(const CMPIBroker* t
     traceRequestedClassId(source);
     if (requestedClassId == partnerClassId)
         narrowed = narrow(computer, locateComputer(objectPath));
-    else if (requestedClassId == associationClassId) // meant: all computers, whatever the path's keys
+    else if (requestedClassId == associationClassId) // on purpose: all computers, whatever the path's keys
         narrowed = narrow(computer, keylessPath(CMPIComputerSystem::className));
     else if (requestedClassId == ClassId::ComputerSystem)
         narrowed = narrow(partner, locateTimeService(objectPath));

@@ -36,7 +36,7 @@ public:
     static const TraceSource& traceSource();
 
 private:
-    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    /// The scope is that of the whole constructor: its entry line stands before those of the members.
     CMPITimeServiceAffectsElement(const CMPIBroker* theBroker, const CMPIContext* context,
                                   const CMPIObjectPath* objectPath, const ParameterTraceScope&);
 

@@ -22,10 +22,10 @@ void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** 
     if (instance == nullptr) return;
     bool automatic = false;
     if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic)) {
-        data.setAutomaticDSTAdjustment(automatic); // meant: its result does not count
+        data.setAutomaticDSTAdjustment(automatic); // on purpose: its result is ignored
         return;
     }
-    unsigned short region = 0; // meant: taken and dropped
+    unsigned short region = 0; // on purpose: accepted and ignored
     ProviderUtilities::getProperty(instance, "Region", region);
 }
 
@@ -34,7 +34,7 @@ namespace {
 using Cmpi::hasService;
 using Cmpi::hasSlot;
 
-/// An argument's data; of type CMPI_null when it is not there.
+/// An argument's data; of type CMPI_null when it is missing.
 CMPIData argument(const CMPIArgs* in, const char* name) {
     CMPIData absent = {};
     absent.state = CMPI_nullValue | CMPI_notFound;
@@ -44,7 +44,7 @@ CMPIData argument(const CMPIArgs* in, const char* name) {
     return status.rc == CMPI_RC_OK ? data : absent;
 }
 
-/// Refuses an argument of the wrong type. The status with its message stays here, which is meant: the caller sees the
+/// Refuses an argument of the wrong type. The status with its message stays here on purpose: the caller sees the
 /// code alone.
 unsigned int refuse(const CMPIBroker* broker, const char* message) {
     CMPIStatus status = {CMPI_RC_ERR_INVALID_PARAMETER, nullptr};
@@ -53,7 +53,7 @@ unsigned int refuse(const CMPIBroker* broker, const char* message) {
     return CMPI_RC_ERR_FAILED;
 }
 
-/// Answers the host's time now, in "TimeData".
+/// Returns the host's time now, in "TimeData".
 unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
     if (!hasService(broker, &CMPIBrokerEncFT::newDateTime) || !hasSlot(out, &CMPIArgsFT::addArg))
         return CMPI_RC_ERR_FAILED;
@@ -63,7 +63,7 @@ unsigned int returnCurrentTime(const CMPIBroker* broker, CMPIArgs* out) {
     return out->ft->addArg(out, "TimeData", &now, CMPI_dateTime).rc == CMPI_RC_OK ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
 }
 
-/// The 25 characters of a date-time; false where the broker does not tell them.
+/// The 25 characters of a date-time; false where the broker does not return them.
 bool textOf(const CMPIDateTime* dateTime, std::string& text) {
     if (!hasSlot(dateTime, &CMPIDateTimeFT::getStringFormat)) return false;
     const CMPIString* string = dateTime->ft->getStringFormat(dateTime, nullptr);
@@ -85,7 +85,7 @@ bool secondsOf(const CMPIDateTime* dateTime, long& seconds) {
     return true;
 }
 
-/// Minutes east of UTC from a date-time's sign on, 0 without one, as an interval has it.
+/// The minutes east of UTC that follow a date-time's sign; 0 without a sign, as in an interval.
 unsigned int offsetOf(const std::string& text) {
     std::size_t sign = text.find('+');
     if (sign == std::string::npos) sign = text.find('-');

@@ -12,10 +12,10 @@ public:
     using Data = TimeService;
 
     /// Changes the one property that can be changed, "AutomaticDSTAdjustment". "Region" is accepted and has no effect,
-    /// which is meant. Never reports an error.
+    /// on purpose. Never reports an error.
     void modifyInstance(const CMPIInstance* instance, const char** properties);
 
-    /// Runs `ManageTime` (any other name, in any case: 17) and answers a CMPI return code: 0, 1 for a failed action, 4
+    /// Runs `ManageTime` (any other name, in any case: 17) and returns a CMPI return code: 0, 1 for a failed action, 4
     /// for unusable arguments. The host is touched only when every argument has been checked. `result` is not used.
     unsigned int invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out, const CMPIResult* result);
 

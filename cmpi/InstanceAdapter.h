@@ -48,7 +48,7 @@ public:
     InstanceAdapter& operator=(const InstanceAdapter&) = delete;
 
     /// Narrows the walk by the keys of a request's path. A path without keys, or without those that filter, leaves it
-    /// as it is, which is meant; the class name among the keys is not checked.
+    /// as it is, on purpose; the class name among the keys is not checked.
     void setObjectPath(const CMPIObjectPath* objectPath) {
         const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " objectPath=", objectPath);
         if (ProviderUtilities::getKeyCount(objectPath) == 0) return;
@@ -85,8 +85,8 @@ public:
         return path;
     }
 
-    /// The current element's instance, with every property that has a value: the list is traced, and not applied, which
-    /// is meant. Null when the broker could not make it.
+    /// The current element's instance, with every property that has a value: the list is traced, and not applied, on
+    /// purpose. Null when the broker could not make it.
     CMPIInstance* getCMPIInstance(const char** properties) const {
         const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " properties=", properties);
         CMPIObjectPath* path = getObjectPath();
@@ -106,7 +106,7 @@ protected:
     Data data;
 
 private:
-    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    /// The scope is that of the whole constructor: its entry line stands before those of the members.
     InstanceAdapter(const CMPIBroker* theBroker, const CMPIContext* theContext, const CMPIObjectPath* objectPath,
                     const ParameterTraceScope&)
         : broker(theBroker), context(theContext), nameSpace(ProviderUtilities::getNamespace(objectPath)) {

@@ -42,12 +42,12 @@ public:
         return *this;
     }
 
-    /// Whether a pair stands, as operator bool says it, but without a line.
+    /// Whether there is a pair: as operator bool, but writes no line.
     bool hasPair() const { return valid; }
 
-    /// Stands on the association that the path names, or for a path without keys on the first of all. False when there
-    /// is none: a reference missing, the two not belonging together, no computer at all. A path that the broker refused
-    /// on the way is no reason for that: true, and nothing to walk.
+    /// Moves to the association that the path names; for a path without keys, to the first of all. False when there
+    /// is none: a reference is missing, they do not belong together, or there is no computer. Where the broker refused
+    /// a path on the way, it returns true, and there is nothing to walk.
     bool setObjectPath(const CMPIObjectPath* objectPath) {
         const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " objectPath=", objectPath);
         return ProviderUtilities::getKeyCount(objectPath) == 0 ? selectFirst() : selectNamed(objectPath);
@@ -64,7 +64,7 @@ protected:
     using Base::requestedClassId;
 
 private:
-    /// The scope is the constructor's whole: its entry line stands before those of the members.
+    /// The scope is that of the whole constructor: its entry line stands before those of the members.
     NodeAssociationAdapter(const CMPIBroker* theBroker, const CMPIContext* context, const CMPIObjectPath* objectPath,
                            const ParameterTraceScope&)
         : Base(theBroker, context, objectPath) {
@@ -76,7 +76,7 @@ private:
         } else if (requestedClassId == Self::associationClassId) {
             if (!setObjectPath(objectPath)) throw InstrumentationException("Could not find instance");
         }
-        // Meant: for any other class there is nothing to return, once.
+        // On purpose: for any other class the adapter stands once, and returns null.
     }
 
     Self& self() { return static_cast<Self&>(*this); }

@@ -5,8 +5,8 @@
 namespace VK {
 
 /// What log lines are made of lives as long as the library: threads may log while the process ends, when other static
-/// objects are gone already. So it is left to the system there, and freed only where the library is unloaded, which
-/// nobody uses any more then.
+/// objects are gone already. So at the process's end it is left to the system. It is freed only when the library is
+/// unloaded: nobody uses it any more then.
 class Lasting {
 public:
     Lasting(const Lasting&) = delete;

@@ -18,7 +18,7 @@ struct alignas(64) SharedText {
 
 constinit std::array<SharedText, 32> sharedTexts;
 
-/// Threads start at different places, told apart by where their stacks lie.
+/// Threads start at different places, which follow from their stacks' addresses.
 std::size_t firstPlace() {
     const auto stack = reinterpret_cast<std::uintptr_t>(__builtin_frame_address(0));
     return stack / (64 * std::size_t{1024});

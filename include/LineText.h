@@ -7,7 +7,7 @@
 
 namespace VK {
 
-/// The string in which a line with values is handed over. It has its memory from lines before, of any thread: a line
+/// The string in which a line with values is handed over. Its memory comes from earlier lines of any thread: a line
 /// allocates nothing, and a thread that serves one request pays for nothing of its own.
 class LineText {
 public:

@@ -27,7 +27,7 @@ std::ostream& operator<<(NVMessageBuffer& buffer, const T* pointer) {
 
 namespace VK {
 
-/// What a line tells; selects its format. A value without a name formats as an empty line.
+/// What a line says; selects its format. A value without a name formats as an empty line.
 enum MessageType : unsigned int { ENTERING = 0, EXITING = 1, METHOD_INVOKED = 2, MESSAGE = 3 };
 
 /// The levels in use.
@@ -109,7 +109,7 @@ inline char* trace(const char* variable, const char* file, unsigned int line, un
 
 // --- Handing lines to the logger.
 
-/// Throws on what the logger threw: anything that is not a std::exception as one, so that the boundary towards the
+/// Throws again what the logger threw; what is no std::exception becomes one, so that the boundary towards the
 /// object manager knows it. To be called where an exception is handled.
 [[noreturn]] void rethrowFromLogger();
 

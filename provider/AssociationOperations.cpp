@@ -18,7 +18,7 @@ struct Request {
 };
 
 /// Whether the request wants no class of the other end. Only the package association asks; role and result role are
-/// never looked at. Both are meant.
+/// ignored. Both are on purpose.
 bool refuses(const CMPIComputerSystemPackage& adapter, const Request& request) {
     return request.resultClass != nullptr && *request.resultClass != '\0' &&
            adapter.isNotTargetClass(request.resultClass);

@@ -12,7 +12,7 @@
 
 /// The provider as the object manager sees it: the functions of its three tables.
 ///
-/// Instance and association operations log an exception and answer with the status as it stood, which is CMPI_RC_OK
+/// Instance and association operations log an exception and return the status as it stood, which is CMPI_RC_OK
 /// unless the class is not served; method invocation passes the exception's text on. Nothing is kept between calls.
 namespace VK::BaseServerProvider {
 

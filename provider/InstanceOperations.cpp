@@ -30,7 +30,7 @@ struct Request {
     unsigned short classId;
     Service service;
 
-    /// To be called while the adapter stands: administrators read the lines of its end as the end of the answer.
+    /// To be called while the adapter lives: administrators read the lines of its end as the end of the answer.
     void closeIfDone() const {
         if (service != Open) answer.close();
     }
@@ -68,8 +68,8 @@ constexpr ClassRow row(ClassId classId, Service enumInstanceNames, Service enumI
     return {classId, walkNames<Adapter>, walkInstances<Adapter>, enumInstanceNames, enumInstances, getInstance};
 }
 
-// Which class each operation serves, and whether it closes the result. Clients have come to depend on every one of the
-// irregularities: they are meant.
+// Which class each operation serves, and whether it closes the result. The irregularities are kept on purpose because
+// clients have come to depend on every one of them.
 // clang-format off
 constexpr ClassRow classRows[] = {
     //                                            class                                       EnumInstanceNames EnumInstances GetInstance

@@ -59,7 +59,7 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, co
             methodRow->invoke(request, methodRow->fixedName != nullptr ? methodRow->fixedName : methodName);
         if (rc != 0) {
             returnCode = rc;
-            status.rc = static_cast<CMPIrc>(rc); // meant: one number is both
+            status.rc = static_cast<CMPIrc>(rc); // on purpose: one number is both
         }
     };
     frame.run(work, [&](const std::exception& exception) {
@@ -71,7 +71,7 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, co
     Answer answer(frame, result);
     contained([&] { answer.add(returnCode); });
     contained([&] { answer.close(); });
-    return status; // meant: there is no exit marker here
+    return status; // on purpose: there is no exit marker here
 }
 
 } // namespace VK::BaseServerProvider

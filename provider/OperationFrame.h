@@ -17,7 +17,7 @@ template <class Step>
 void contained(Step step) {
     try {
         step();
-    } catch (const std::exception&) { // NOLINT(bugprone-empty-catch): there is nobody left to tell
+    } catch (const std::exception&) { // NOLINT(bugprone-empty-catch): there is nowhere left to log it
     }
 }
 
@@ -56,7 +56,7 @@ public:
     }
 
     /// The same for an operation that ends with the exit marker and swallows exceptions: the status stays as it stood,
-    /// which is meant.
+    /// on purpose.
     template <class Work>
     CMPIStatus runMarked(Work work, unsigned int line = __builtin_LINE()) const {
         CMPIStatus status = {CMPI_RC_OK, nullptr};

@@ -20,7 +20,7 @@ constexpr int unusableArguments = 2;
 /// The options that every program has.
 void addCommonOptions(CLI::App& app);
 
-/// Reads the words behind the program's name: nothing, or the exit status of what has been said already.
+/// Reads the words behind the program's name: nothing, or the exit status where an answer was printed already.
 std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, Output output);
 
 /// Says why arguments cannot be used, and returns the exit status.

@@ -7,7 +7,7 @@
 
 namespace om {
 
-/// What an extended error tells. Texts and arrays that were not set are null.
+/// What an extended error holds. Texts and arrays that were not set are null.
 struct ErrorAttributes {
     using Text = std::optional<std::string>;
 

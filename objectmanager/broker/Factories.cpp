@@ -93,7 +93,7 @@ CMPIString* getType(const CMPIBroker* handle, const void* object, CMPIStatus*) {
     return newString(broker, typeNameOf(object));
 }
 
-// Nothing is written: the object manager's output is its answer, and a provider has a log of its own.
+// Writes nothing: the object manager's output holds only its answer, and a provider has a log of its own.
 CMPIStatus noMessages(const CMPIBroker* handle, int, const char*, const char* chars, const CMPIString* string) {
     open(handle);
     if (chars == nullptr) open<StringObject>(string);

@@ -44,7 +44,7 @@ const std::vector<std::string>& faultNames();
 /// The kind of that name, exactly as it is written; nothing for another text.
 std::optional<FaultKind> faultKind(std::string_view name);
 
-/// A failure that is asked for: as object managers fail when they run out of memory. It answers null (a count 0, data
+/// A failure that is asked for: as object managers fail when they run out of memory. It returns null (a count 0, data
 /// that is not there) with the status CMPI_RC_ERR_FAILED, and does nothing else.
 struct Fault {
     FaultKind kind = FaultKind::None;
@@ -53,12 +53,12 @@ struct Fault {
     bool unstated = false; ///< the status says OK, as some object managers leave it; not for slots that return it
 };
 
-/// Is told of a call to the broker, by its slot's name, before it is done: so that a test can write it into the log
-/// between the provider's lines. Slots that never fail on request are not told of.
+/// Receives the slot's name before each call to the broker is done, so that a test can write it into the log
+/// between the provider's lines. Slots that never fail on request are not reported.
 using CallObserver = std::function<void(const std::string& slot)>;
 
-/// Watches the calls that this thread's providers make while it lives: counts those that may fail, and tells of them.
-/// One within another changes nothing: a provider's call back is part of the operation.
+/// Watches the calls that this thread's providers make while it lives: counts those that may fail, and reports them.
+/// A nested one changes nothing: a provider's call back is part of the operation.
 class CallWatch {
 public:
     explicit CallWatch(const std::optional<Fault>& fault, CallObserver observer = {});

@@ -29,7 +29,7 @@ public:
     Managed& operator=(const Managed&) = delete;
 
     /// The provider's release: frees a clone at once. An object of the call loses its content, so that a later use is
-    /// told apart as an invalid handle; its shell goes with the call.
+    /// refused as an invalid handle; its shell goes with the call.
     void release() noexcept;
     void becomeClone();
     /// Makes it the broker's own, which a provider cannot release.
@@ -90,7 +90,7 @@ public:
 
     /// The innermost call of this thread, or null.
     static Call* current();
-    /// Whether the arena is that of a call of this thread, so that this thread may touch its objects.
+    /// Whether the arena belongs to a call of this thread, so that this thread may touch its objects.
     static bool ofThisThread(const Arena* arena);
 
     Arena& arena() { return arena_; }

@@ -17,7 +17,7 @@ public:
     Object& operator=(const Object&) = delete;
 
 protected:
-    /// Never null in a live object; providers may look at it to tell a null object.
+    /// Never null in a live object; providers may look at it to recognise a null object.
     void pointTo(const void* data) { this->hdl = const_cast<void*>(data); }
     void invalidate() noexcept { this->hdl = nullptr; }
 

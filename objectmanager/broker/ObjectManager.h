@@ -44,7 +44,7 @@ struct Request {
     std::string query;
     std::string language;
     std::optional<Fault> fault; ///< its calls are counted anew for every request
-    CallObserver onCall;        ///< told of the broker's calls, for tests; `vkcim` has no option for it
+    CallObserver onCall;        ///< receives the broker's calls, for tests; `vkcim` has no option for it
 };
 
 /// A library that cannot be loaded, or a factory function that is missing, fails or returns null.

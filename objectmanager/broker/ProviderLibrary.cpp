@@ -84,7 +84,7 @@ void ProviderLibrary::cleanUp(Interface<MI>& interface) {
         const Call call;
         const CMPIBoolean terminating = 1;
         mi->ft->cleanup(mi, &newContext(broker), terminating);
-    } catch (...) { // the library goes whatever it says
+    } catch (...) { // the library is unloaded all the same
     }
 }
 

@@ -75,7 +75,7 @@ CMPIEnumeration* enumerateInstances(const CMPIBroker* handle, const CMPIContext*
     return enumerate(handle, context, request, CMPI_instance);
 }
 
-/// The one instance of a path; none is NOT_FOUND, and more are a fault of the provider.
+/// The one instance of a path; without one NOT_FOUND, and more than one is a fault of the provider.
 Instance askForInstance(const CMPIBroker* handle, const CMPIContext* context, const Request& request) {
     Answer answer = ask(handle, context, request);
     if (answer.results.empty()) throw Failure{CMPI_RC_ERR_NOT_FOUND};

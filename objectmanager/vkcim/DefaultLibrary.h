@@ -12,7 +12,7 @@ std::string defaultLibrary(const std::string& directory);
 /// directory, where a file of that name goes first.
 std::string libraryPath(const std::string& name);
 
-/// The directory of the running program; empty when it cannot be told.
+/// The directory of the running program; empty when it cannot be found out.
 std::string programDirectory();
 
 } // namespace vkcim

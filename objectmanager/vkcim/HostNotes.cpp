@@ -11,7 +11,7 @@
 namespace vkcim {
 
 // The library is neither linked nor loaded from here: only the one that the provider brought is asked (RTLD_NOLOAD),
-// so that the notes tell of the same host, and vkcim runs where that library is another one or is missing.
+// so that the notes are on the same host, and vkcim runs where that library is another one or is missing.
 std::vector<std::string> hostNotes(const std::string& provider) {
     if (provider != Arguments().provider) return {};
     const std::unique_ptr<void, int (*)(void*)> library(dlopen("libvkinstrumentation.so.1", RTLD_NOW | RTLD_NOLOAD),

@@ -18,7 +18,7 @@ public:
         for (const Link& link : links) {
             if (below.count(link.above) == 0) drawFrom(link.above);
         }
-        // What is left stands in a circle: it starts anywhere.
+        // What is left is in circles, each of which may start anywhere.
         for (const Link& link : links) drawFrom(link.above);
     }
 

@@ -8,11 +8,11 @@ namespace vkcim {
 
 namespace {
 
-/// Gives the standard output away, to whom it does not belong any more: a descriptor of the file that it was, which
+/// Makes standard output lead to standard error. Returns a descriptor of what standard output was before, which
 /// commands do not inherit; -1 where it is closed.
 int takeStandardOutput() {
     const int own = fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, STDERR_FILENO + 1);
-    // A closed stream's number must not become that of a file which others then print into.
+    // A closed stream's number must stay taken: a file that got it would receive what others print.
     const int nowhere = fcntl(STDERR_FILENO, F_GETFD) < 0 ? open("/dev/null", O_RDWR) : -1;
     if (nowhere >= 0) dup2(nowhere, STDERR_FILENO);
     dup2(STDERR_FILENO, STDOUT_FILENO);

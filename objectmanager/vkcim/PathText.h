@@ -12,7 +12,7 @@
 namespace vkcim {
 
 /// Reads a path without host. A path that names no namespace, and each reference in it that names none, gets
-/// `nameSpace` or that of the path around it. The schema tells which quoted keys are references; for a class or key
+/// `nameSpace` or that of the path around it. The schema says which quoted keys are references; for a class or key
 /// that it lacks they are strings unless written `KEY=ref:"…"`. Integers are sint64, those above its range uint64.
 /// Throws ParseError.
 om::ObjectPath parsePath(std::string_view text, const std::string& nameSpace, const om::Schema& schema);

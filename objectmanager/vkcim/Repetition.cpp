@@ -14,7 +14,7 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-/// Lets nobody go before everybody is there.
+/// Lets no thread go on before all have arrived.
 class StartLine {
 public:
     explicit StartLine(std::size_t count) : missing(count) {}
@@ -24,7 +24,7 @@ public:
         if (--missing == 0) everybody.notify_all();
         everybody.wait(lock, [this] { return missing == 0; });
     }
-    /// For one that will never come.
+    /// For a thread that will never arrive.
     void giveUp(std::size_t count) {
         const std::lock_guard lock(mutex);
         missing -= count;

@@ -24,8 +24,8 @@ std::string kernelsHostName() {
     return uname(&names) == 0 ? names.nodename : "";
 }
 
-/// The described host's, which a snapshot's or a simulated one's is not the kernel's; that stands for a provider that
-/// does not serve computer systems, and so describes no other host.
+/// The name of the described host: of a snapshot or a simulated host it is not the kernel's. A provider that
+/// does not serve computer systems describes no other host: there it is the kernel's.
 std::string hostName(const Report::Answers& classes) {
     const auto computers = std::find_if(classes.begin(), classes.end(), [](const auto& answered) {
         return om::sameName(answered.first, "VESKA_ComputerSystem");

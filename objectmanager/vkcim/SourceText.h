@@ -21,7 +21,7 @@ public:
         bytes.push_back(c);
         offsets.push_back(offset);
     }
-    /// Tells where the text ends in the whole.
+    /// Sets where the text ends in the whole.
     void end(std::size_t offset) { endOffset = offset; }
 
     std::string_view text() const { return bytes; }

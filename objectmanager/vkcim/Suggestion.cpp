@@ -38,7 +38,7 @@ std::optional<std::string> nearestClass(std::string_view className, const om::Sc
     std::optional<std::string> nearest;
     std::size_t best = className.size() / 4 + 1;
     for (const om::ClassDeclaration& known : schema.classes()) {
-        // The name alone, without the schema's prefix, is a common way to get it wrong.
+        // A common mistake is the name alone, without the schema's prefix.
         const bool bare = om::sameName(className, withoutPrefix(known.name));
         const std::size_t away = bare ? 1 : distance(className, known.name);
         if (away < best || (away == best && !nearest)) {

@@ -9,7 +9,7 @@
 namespace vkcim {
 
 /// The known class whose name comes nearest to `className`, for a name that the schema lacks; nothing when none is
-/// near enough to be what was meant.
+/// near enough.
 std::optional<std::string> nearestClass(std::string_view className, const om::Schema& schema);
 
 } // namespace vkcim

@@ -12,7 +12,7 @@
 
 namespace {
 
-/// Colours are for terminals, and for nobody who said no (https://no-color.org).
+/// Colours only on a terminal, and only unless the user refused them (https://no-color.org).
 bool wantsColours() {
     const char* refused = std::getenv("NO_COLOR");
     const char* terminal = std::getenv("TERM");

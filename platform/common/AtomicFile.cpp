@@ -20,7 +20,7 @@ std::string besides(const std::string& name) {
     return "." + name + ".vk-new";
 }
 
-/// Keeps the signal of a write beyond the process's file size limit from it, which would end it.
+/// Keeps the signal of a write beyond the file size limit from the process, which it would end.
 class SizeLimitSignal {
 public:
     SizeLimitSignal() noexcept {
@@ -75,14 +75,14 @@ int putInPlace(int directory, const std::string& from, const std::string& to) {
     return 0;
 }
 
-/// Has what replaces `name` made beside it, under a name that is handed over, and puts it in place.
+/// Calls `make` with a name beside `name`, and puts what it made there in the place of `name`.
 template <class Make>
 int replace(int directory, const std::string& name, const Make& make) {
     const std::string fresh = besides(name);
     if (unlinkat(directory, fresh.c_str(), 0) != 0 && errno != ENOENT) return errno;
     int error = make(fresh.c_str());
     if (error == 0) error = putInPlace(directory, fresh, name);
-    // It is still there after a failure, and when it was the file in place already: renaming does nothing then.
+    // The new name is still there after a failure, and when both are one file: renaming does nothing then.
     unlinkat(directory, fresh.c_str(), 0);
     return error;
 }

@@ -23,7 +23,7 @@ bool number(std::string_view text, std::size_t begin, std::size_t length, int& v
     return true;
 }
 
-/// Six digits, of which the last ones may be left open.
+/// Six digits; asterisks may stand for the last ones.
 bool fraction(std::string_view text, int& value) {
     std::string digits(text);
     for (std::size_t i = digits.size(); i-- > 0 && digits[i] == '*';) digits[i] = '0';

@@ -6,20 +6,20 @@
 
 namespace VK {
 
-/// What a file was like when it was looked at: it tells whether it is still the one that was read.
+/// What a file was like when it was looked at: it shows whether the file is still the one that was read.
 struct FileStamp {
     FileStamp() = default;
     explicit FileStamp(const struct stat& status);
 
-    /// Of what stands at a path, a link itself.
+    /// Of what stands at a path; for a link, of the link itself.
     static FileStamp of(const char* path);
     /// Of what a path leads to.
     static FileStamp behind(const char* path);
 
     /// Now, on the clock of `changed`.
     static std::int64_t now();
-    /// Whether it tells every change from `instant` on. Two changes within one tick of the file system's clock leave
-    /// the same stamp: one that young may still be followed by a change that it does not tell.
+    /// Whether it shows every change from `instant` on. Two changes within one tick of the file system's clock leave
+    /// the same stamp: a stamp that young may still be followed by a change that it does not show.
     bool tellsChangesFrom(std::int64_t instant) const;
 
     friend bool operator==(const FileStamp& a, const FileStamp& b) {

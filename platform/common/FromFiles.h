@@ -11,8 +11,8 @@
 
 namespace VK {
 
-/// A lock that is held for a few instructions, and so is to be had at once. A process that was forked from a thread
-/// beside one that held it never gets it, and goes on without.
+/// A lock that is held for a few instructions, and so is free again at once. A process that was forked while another
+/// thread held it never gets it, and goes on without it.
 class BriefLock {
 public:
     explicit BriefLock(std::atomic_flag& theFlag) : flag(theFlag) {

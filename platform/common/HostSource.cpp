@@ -7,8 +7,8 @@ namespace VK {
 
 namespace {
 
-/// An object manager changes its working directory when it becomes a daemon, and that must not change the host. As
-/// given where the working directory cannot be had.
+/// An object manager changes its working directory when it becomes a daemon, and that must not change the host. The
+/// path as it is where the working directory cannot be found out.
 std::string absolute(const char* path) {
     std::error_code error;
     const std::filesystem::path found = std::filesystem::absolute(path, error);

@@ -13,7 +13,7 @@ namespace VK {
 
 namespace {
 
-/// One for all names. Closing any descriptor of a file ends the process's record locks on it: so this process may have
+/// One for all names. Closing any descriptor of a file ends the process's record locks on it: so this process may hold
 /// no two open at a time.
 std::mutex amongThreads;
 

@@ -9,8 +9,8 @@
 
 namespace VK {
 
-/// Files that something was made of, and what they were like: one lstat of each, which takes no descriptor, tells
-/// whether they still are. Links on the way to a file count as files of their own; a file that is missing counts by the
+/// Files that something was made of, and what they were like: one lstat of each, which takes no descriptor, shows
+/// whether they changed. Links on the way to a file count as files of their own; a file that is missing counts by the
 /// first name that is not there.
 class SeenFiles {
 public:
@@ -22,7 +22,7 @@ public:
     /// The links on the way alone.
     void addLinks(const std::string& path) { follow(path, false); }
 
-    /// Whether nothing was made, changed or removed since. False also where that cannot be told: a file is as young as
+    /// Whether nothing was made, changed or removed since. False also where that cannot be known: a file is as young as
     /// the file system's clock is coarse, or lies in a file system of the kernel, whose files change without a trace.
     bool unchanged() const;
 
@@ -38,7 +38,7 @@ private:
     const Root& root;
     const std::int64_t begin;
     std::vector<Seen> files;
-    bool settled = true; ///< the stamps tell every later change
+    bool settled = true; ///< the stamps show every later change
 };
 
 } // namespace VK

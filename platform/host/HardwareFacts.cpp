@@ -44,7 +44,7 @@ ChassisType typeFromText(const std::string& text) {
     return number ? static_cast<ChassisType>(std::stoul(text)) & 0x7F : 0;
 }
 
-/// Where the tables have none: what the kernel, the device tree or s390 tell of the one chassis.
+/// Where the tables have none: what the kernel, the device tree or s390 say of the one chassis.
 std::vector<ChassisFacts> withoutTables(const Root& root, const Sysinfo& sysinfo) {
     ChassisFacts facts;
     facts.manufacturer = firstOf({fromSysfs(root, "chassis_vendor"), sysinfo["Manufacturer"]});

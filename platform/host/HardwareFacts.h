@@ -15,7 +15,7 @@ struct ChassisFacts {
     Fact version;
     Fact serial;
     Fact sku;
-    ChassisType type = 0; ///< 0 when nothing tells it
+    ChassisType type = 0; ///< 0 when nothing says it
     unsigned int status = 0;
 };
 
@@ -38,7 +38,7 @@ struct HardwareFacts {
     std::vector<ChassisFacts> chassis;
 };
 
-/// Reads the facts of the host below `root`, each from the first source that tells it: /etc/machine-info, the
+/// Reads the facts of the host below `root`, each from the first source that has it: /etc/machine-info, the
 /// SMBIOS tables, the kernel's reading of them, the device tree, s390's system information, Xen.
 HardwareFacts readHardware(const Root& root);
 

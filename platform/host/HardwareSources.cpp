@@ -43,7 +43,7 @@ Fact MachineInfo::operator[](const char* key) const {
 }
 
 Tables::Tables(const Root& root) {
-    // Both at once: a root that keeps a record is to know both.
+    // Both are always read: a root that keeps a record must note both.
     const Root::Contents entryPoint = root.read(entryPointFile);
     const Root::Contents table = root.read(tableFile);
     if (!entryPoint) {

@@ -23,7 +23,7 @@ bool processorSaysKvm() {
     constexpr unsigned int underHypervisor = 1U << 31;
     constexpr unsigned int hypervisorLeaf = 0x40000000;
     unsigned int a = 0, b = 0, c = 0, d = 0;
-    // Processors without hypervisor answer for that leaf too, with something else.
+    // Processors without a hypervisor also return something for that leaf.
     if (__get_cpuid(1, &a, &b, &c, &d) == 0 || (c & underHypervisor) == 0) return false;
     char signature[12];
     __cpuid(hypervisorLeaf, a, b, c, d);

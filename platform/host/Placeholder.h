@@ -17,7 +17,7 @@ struct PlaceholderRule {
         Whole,        ///< the letters and digits of the text are those of one of `texts`
         Begin,        ///< they begin like one of `texts`
         FieldName,    ///< one of `texts`, maybe with words for whose it is before it and a short number at its end
-        Counting,     ///< four digits or more, each one more (or each one less) than the one before it, 9 and 0 being
+        Counting,     ///< four digits or more, each one more, or each one less, than the one before it; 9 and 0 are
                       ///< neighbours; behind 9 or 0 letters may count on. A model or version has eight at least.
         OneCharacter, ///< one character, twice or more often
         NoLetter,     ///< no letter and no digit, or x alone

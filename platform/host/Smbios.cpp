@@ -39,13 +39,13 @@ SmbiosBaseBoard readBaseBoard(const Fields& fields) {
 SmbiosChassis readChassis(const Fields& fields) {
     SmbiosChassis chassis;
     chassis.manufacturer = fields.text(0x04);
-    chassis.type = fields.byte(0x05) & 0x7F; // the first bit tells whether there is a lock
+    chassis.type = fields.byte(0x05) & 0x7F; // the first bit says whether there is a lock
     chassis.version = fields.text(0x06);
     chassis.serial = fields.text(0x07);
     chassis.bootUpState = fields.byte(0x09);
     chassis.powerSupplyState = fields.byte(0x0A);
     chassis.thermalState = fields.byte(0x0B);
-    // The elements contained come before the last field, 0x13 telling how many and 0x14 how long each is.
+    // The contained elements come before the last field: 0x13 holds their number, 0x14 the length of each.
     if (fields.structure.byteAt(0x14)) chassis.sku = fields.text(0x15 + fields.byte(0x13) * fields.byte(0x14));
     return chassis;
 }

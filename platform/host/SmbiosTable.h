@@ -11,7 +11,7 @@
 
 namespace VK::Host {
 
-/// What the entry point tells of the table.
+/// What the entry point says of the table.
 struct SmbiosEntryPoint {
     SmbiosVersion version;
     std::size_t tableLength = 0; ///< the most that the table can be long
@@ -52,8 +52,7 @@ class SmbiosTable {
 public:
     explicit SmbiosTable(std::string_view bytes) : rest(bytes), size(bytes.size()) {}
 
-    /// The next structure; nothing at the end (type 127, zeros only, or no more bytes) or where the table is
-    /// broken.
+    /// The next structure; nothing at the end (type 127, only zeros, no more bytes) or where the table is broken.
     std::optional<SmbiosStructure> next();
 
     /// Where and how the table is broken; empty as long as it is not.

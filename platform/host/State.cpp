@@ -48,7 +48,7 @@ std::vector<std::string> memoryErrorFiles(const Root& root) {
 }
 
 bool hasUncorrectableMemoryErrors(const Root& root) {
-    bool found = false; // all are read: a root that keeps a record is to know them
+    bool found = false; // all are read: a root that keeps a record must note them
     for (const std::string& file : memoryErrorFiles(root))
         found = root.read(file).text.find_first_of("123456789") != std::string::npos || found;
     return found;

@@ -24,7 +24,7 @@ std::string hostNameFromFile(std::string_view text);
 bool utmpSaysShutdown(std::string_view bytes);
 
 /// Whether a shutdown that /run/systemd/shutdown/scheduled announces is due; `now` in microseconds since 1970. A
-/// dry run is none.
+/// dry run does not count.
 bool scheduledShutdownIsDue(std::string_view text, std::uint64_t now);
 
 } // namespace VK::Host

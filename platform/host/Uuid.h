@@ -19,12 +19,10 @@ struct SmbiosVersion {
 /// little-endian. Empty unless there are 16 bytes.
 std::string uuidFromBytes(std::string_view bytes, SmbiosVersion version);
 
-/// Whether a UUID, in lower case with or without dashes, tells nothing: an unset one, or one that whole product lines
-/// share.
+/// Whether a UUID, in lower case with or without dashes, says nothing: an unset one, or one of a whole product line.
 bool isSharedUuid(std::string_view uuid);
 
-/// A UUID that stands as text somewhere, trimmed and in lower case. Empty for other texts, and for UUIDs that tell
-/// nothing.
+/// A UUID that stands as text somewhere, trimmed and in lower case. Empty for other texts and UUIDs that say nothing.
 std::string uuidFromText(std::string_view text);
 
 } // namespace VK::Host

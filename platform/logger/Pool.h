@@ -53,7 +53,7 @@ private:
         };
     };
 
-    /// Threads start at different places, told apart by where their stacks lie.
+    /// Threads start at different places, which follow from their stacks' addresses.
     static std::size_t firstPlace() noexcept {
         const auto stack = reinterpret_cast<std::uintptr_t>(__builtin_frame_address(0));
         return stack / (64 * 1024);

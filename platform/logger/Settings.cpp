@@ -94,7 +94,7 @@ Settings parseSettings(const char* sink, const char* levels, const char* channel
 KnownSettings knownSettings;
 
 const Settings& readSettings() noexcept {
-    // Other than a static local's guard, this is right also in the child of a fork in the middle of it.
+    // Unlike a static local's guard, this also works in the child of a fork in the middle of it.
     static pthread_once_t once = PTHREAD_ONCE_INIT;
     pthread_once(&once, &readEnvironment);
     return knownSettings.settings;

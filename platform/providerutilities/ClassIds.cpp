@@ -17,7 +17,7 @@ bool isDerivedFrom(const CMPIBroker* broker, const std::string& nameSpace, const
     if (path == nullptr) return false;
     CMPIStatus status = Cmpi::freshStatus();
     const CMPIBoolean isA = broker->eft->classPathIsA(broker, path, base, &status);
-    // Requests may name any class; there are object managers that answer so for one they do not know.
+    // Requests may name any class; some object managers return this error for one that they do not know.
     if (status.rc != CMPI_RC_ERR_INVALID_CLASS)
         Cmpi::noteUntold("areClassesRelated", __LINE__, "whether a class is derived from another", status);
     return Cmpi::succeeded(status) && isA != 0;

@@ -56,7 +56,7 @@ bool setArray(const CMPIBroker* broker, CMPIInstance* instance, const char* name
     return set(instance, name, &value, static_cast<CMPIType>(CMPI_ARRAY | elementType));
 }
 
-/// For messages; null where the broker does not tell.
+/// For messages; null where the broker does not return one.
 const char* classOf(const CMPIObjectPath* path) {
     if (!Cmpi::hasSlot(path, &CMPIObjectPathFT::getClassName)) return nullptr;
     CMPIStatus status = Cmpi::freshStatus();

@@ -8,7 +8,7 @@ namespace VK {
 
 namespace {
 
-/// A key's value as a moniker has it; none for references, nulls and other kinds, and when `status` tells a failure.
+/// A key's value as a moniker has it; none for references, nulls and other kinds, and when `status` says failure.
 std::optional<std::string> valueText(const CMPIData& key, CMPIStatus& status) {
     const CMPIValue& value = key.value;
     switch (key.type) {

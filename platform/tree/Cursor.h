@@ -11,7 +11,7 @@ namespace VK::Tree {
 
 /// What VK::Instrumentation is made of: a place among the nodes of one type, or on one node, of a host's tree as it
 /// stood when the nodes were selected. A node's name and status are read once while the cursor stands on it: what one
-/// answer says of them is of one moment.
+/// answer says of them belongs to one moment.
 class Cursor {
 public:
     /// Over the host of this process.

@@ -58,7 +58,7 @@ std::string timeServiceNote() {
         facts.automaticDst = automatic;
     if (Tree::simulatedHost() == nullptr)
         facts.zone = Zone::zoneNameOf(Root::host().readLink(Zone::localTimeFile).text);
-    facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, whatever is described
+    facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, also for a snapshot
     return Host::timeNote(facts);
 }
 

@@ -107,7 +107,7 @@ constexpr ChassisRow chassisRows[] = {
     {Lexicon::PackageTypeProperty, [](const ChassisView& view) { return Told(Host::packageType(view.chassis.type)); }},
 };
 
-/// Fills in what the rows tell.
+/// Fills in what the rows supply.
 template <typename Row, std::size_t N, typename View>
 void fill(Node& node, const Row (&rows)[N], const View& view) {
     for (const Row& row : rows)

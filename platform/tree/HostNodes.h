@@ -18,7 +18,7 @@ std::vector<Node> hostNodes(const Host::HardwareFacts& facts);
 struct ChangingProperty {
     NodeLexicon::Properties number;
     std::optional<Value> (*read)(HostNow& host);
-    /// Changes it: what the change answers; nothing for a value that it cannot take. Null: read-only.
+    /// Changes it and returns the change's result; nothing for a value that it cannot take. Null: read-only.
     std::optional<bool> (*change)(const Root& root, const Value& value) = nullptr;
     bool onLiveHostsOnly = false; ///< of a snapshot it is read-only
 };

@@ -45,7 +45,7 @@ public:
 
     /// The nodes of a type, in order.
     const Nodes& ofType(unsigned int type) const;
-    /// The node with this path; a place without node when there is none.
+    /// The node with this path; a place with a null node when there is none.
     Place find(const std::string& path) const;
     bool isEmpty() const { return nodes.empty(); }
 

@@ -43,7 +43,7 @@ private:
     std::mutex mutex;
     std::shared_ptr<const State> known;
     FileStamp stamp;
-    bool settled = false;     ///< the stamp tells every later change
+    bool settled = false;     ///< the stamp shows every later change
     std::uint64_t lookAt = 0; ///< the look (vk/HostLook.h) in which the file was asked last
 };
 

@@ -24,8 +24,7 @@ bool hasZeroByte(const std::string& text);
 TreeText readTreeText(std::string_view text);
 
 /// The text with one property of the node at `path` changed or added; everything else keeps its value and its
-/// order. Empty when the text cannot be read, has no such node, or the value is no UTF-8 or has a
-/// zero byte.
+/// order. Empty when the text cannot be read or has no such node, or the value is no UTF-8 or has a zero byte.
 std::string changeTreeText(std::string_view text, const std::string& path, unsigned int property, const Value& value);
 
 } // namespace VK::Tree

@@ -18,7 +18,7 @@ struct SavedFile {
     }
 };
 
-/// Looks at a path: 0, or the errno value why that cannot be told. Links are not followed.
+/// Looks at a path: 0, or the errno value that says why it cannot be seen. Links are not followed.
 int lookAt(const Root& root, const std::string& path, SavedFile& found);
 
 /// Puts at the name in a directory what was saved, at one stroke: 0, or the errno value. Where `from` is a directory

@@ -4,7 +4,7 @@
 
 namespace VK::Zone {
 
-// Each answers true when the host is as asked, changed or not; else false, with one log line that says why, and nothing
+// Each returns true when the host is as asked, changed or not; else false, with one log line that says why, and nothing
 // is changed or forgotten. A change writes one line too: from what, to what, by which user. Whatever interrupts a
 // change, /etc/localtime is a valid zone, and the zone before it is in force or remembered.
 

@@ -46,7 +46,7 @@ private:
 /// Reads a zone file; nothing unless it is whole and right.
 std::optional<TimeZone> parseZoneFile(std::string_view bytes);
 
-/// A zone file (version 2) for one offset for ever, in whole minutes; its name is its offset, `+0530`.
+/// A zone file (version 2) with one offset at all times, in whole minutes; its zone's name is the offset, `+0530`.
 std::string makeZoneFile(std::int32_t offsetMinutes);
 
 } // namespace VK::Zone

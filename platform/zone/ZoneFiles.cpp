@@ -47,7 +47,7 @@ std::string describe(const SavedFile& localTime) {
     return name.empty() ? localTime.content : name;
 }
 
-/// The zone directory's name of a zone that is that offset for ever. Its signs are those of POSIX: west is positive.
+/// The zone directory's name for a zone that always has that offset. Its signs are those of POSIX: west is positive.
 std::string nameOfOffset(const Root& root, int minutes) {
     if (minutes % 60 != 0) return {};
     std::string name = "Etc/GMT";
@@ -110,7 +110,7 @@ struct ZoneFiles::Session {
     std::optional<FileLock> lock;
     std::optional<ZoneMemory> memory;
     SavedZone present;
-    int zoneNameError = 0; ///< why /etc/timezone cannot be told
+    int zoneNameError = 0; ///< why /etc/timezone cannot be seen
 };
 
 bool ZoneFiles::fail(const std::string& what, int error) {

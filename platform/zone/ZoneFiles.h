@@ -7,7 +7,7 @@
 namespace VK::Zone {
 
 /// One change of the files that make the time zone: /etc/localtime, /etc/timezone where there is one, and the memory of
-/// what they were before. Changes of several processes wait for each other. Each answers true when the host is as
+/// what they were before. Changes of several processes wait for each other. Each returns true when the host is as
 /// asked once every other change is over, whether this one had to change anything or not; false when that failed, and
 /// then zone and memory are as before.
 class ZoneFiles {
@@ -21,8 +21,8 @@ public:
 
     explicit ZoneFiles(const Root& hostRoot) : root(hostRoot) {}
 
-    /// Puts a zone of that offset for ever into force, unless that is the offset now. What it replaces is remembered,
-    /// unless something is already.
+    /// Puts a zone that always has that offset into force, unless it is the offset now. What it replaces is
+    /// remembered, unless something is already.
     bool putOffset(int minutes);
     /// The same at the standard offset of a zone with daylight saving, which is remembered instead of any other.
     bool dropDaylightSaving();

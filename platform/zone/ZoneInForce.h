@@ -32,7 +32,7 @@ bool hasDaylightSaving(const Root& root);
 /// Adds the files that make the zone in force.
 void addZoneFiles(SeenFiles& files);
 
-/// The same of a zone that was read before; and now, as a CIM date-time with microseconds and its offset.
+/// The same of a zone that was read before; and the present time in it, as a CIM date-time with microseconds.
 int offsetInForce(const TimeZone& zone);
 bool hasDaylightSaving(const TimeZone& zone);
 std::string systemTime(const TimeZone& zone);

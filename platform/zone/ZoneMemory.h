@@ -31,7 +31,7 @@ public:
     void recover(const SavedFile& localTime);
 
     /// What is remembered, or nothing; also what version 1.0.0 remembered, which takes the present form. A damaged
-    /// memory is none: it is renamed. 0, or the errno value.
+    /// memory does not count and is renamed. 0, or the errno value.
     int read(std::optional<SavedZone>& zone);
     /// What `read` renamed, for people; else empty.
     const std::string& damage() const { return renamed; }

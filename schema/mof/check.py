@@ -37,7 +37,7 @@ _QUALIFIERS = {name.lower(): (scopes, kind) for scopes, kind, *names in map(str.
 _SCOPES = {"c": "a class", "a": "an association", "p": "a property", "r": "a reference", "m": "a method",
            "i": "a parameter"}
 
-# What may be wrong: whether it is, and the words for it.
+# Each thing that may be wrong: whether it happened, and the words for it.
 Complaint = Tuple[object, str]
 
 

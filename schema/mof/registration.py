@@ -1,4 +1,4 @@
-"""How object managers are told which classes the provider serves."""
+"""What registers the provider's classes with object managers."""
 
 import json
 from dataclasses import dataclass

@@ -41,7 +41,7 @@ class Manager(Owner):
         super().run(self.command.get(program) or program, *words, **more)
 
     def run_at_last(self, *command, **more):
-        """That it fails does not hide why the rest failed."""
+        """A failure here does not hide why the rest failed."""
         try:
             self.run(*command, **more)
         except Failure as failure:
@@ -87,7 +87,7 @@ class Manager(Owner):
                     replaced = self.put_link(link, self.product.library)
                 shown = self.register()
             except BaseException:
-                # What was registered before still needs its link, what was not needs none.
+                # What was registered before still needs its link; otherwise none is needed.
                 if not before and not self.is_registered():
                     self.forget()
                 elif replaced:

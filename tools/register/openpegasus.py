@@ -91,7 +91,7 @@ class OpenPegasus(CimServer):
         try:
             self.clear(older)
             self.declare(self.product.share)
-            # That cimmof succeeds says little: what is there already it leaves as it is.
+            # cimmof also succeeds where it leaves what is there already as it is.
             known = self.known()
             flaw = self.command["cimcli"] and not self.options.dry_run and self.difference(known)
             if flaw and (flaw.startswith("without") or known[1:] == older[1:]):

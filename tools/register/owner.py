@@ -117,7 +117,7 @@ class Owner:
             raise Failure(f"{link} is there and no link: not replaced")
         if there and not self.is_ours(link) and os.path.basename(there) != os.path.basename(self.product.library):
             raise Failure(f"{link} links to {there}, which is not ours: not replaced")
-        # Noted before it is made: what is noted and not there does no harm.
+        # Noted before it is made: a note of a missing link does no harm.
         self.write([*self.read(".links"), f"{link} -> {target}"], ".links")
         if not os.path.isdir(directory):
             self.run("mkdir", "-p", directory)

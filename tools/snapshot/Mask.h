@@ -6,16 +6,16 @@
 
 namespace snapshot {
 
-/// Replaces what tells one machine from another, the same by the same, so that what belongs together still does.
+/// Replaces what identifies a machine. Equal texts are replaced equally, so that what belongs together still does.
 class Mask {
 public:
-    /// The salt decides what is put for what; nobody who does not know it can find out.
+    /// The salt decides the replacements; without it nobody can find out what was replaced.
     explicit Mask(std::string saltOfRun) : salt(std::move(saltOfRun)) {}
 
-    /// Digits become digits, letters letters of the same case; the rest stays, and so does what says nothing.
+    /// Digits become digits, and letters become letters of the same case. The rest stays, and so do placeholders.
     std::string name(const std::string& text) const;
 
-    /// As a name; what is put for it is put wherever else the serial number stands, too.
+    /// As a name; the same replacement is put wherever else the serial number stands.
     std::string serial(const std::string& text);
 
     /// A UUID's text with its digits replaced, in its letter case; anything else as a name.

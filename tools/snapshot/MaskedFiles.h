@@ -7,7 +7,7 @@
 
 namespace snapshot {
 
-/// What of a file tells one machine from another, in the order in which files are to be masked: serial numbers first,
+/// What in a file identifies a machine, in the order in which files are to be masked: serial numbers first,
 /// since they may stand in the others.
 enum class Content { EntryPoint, Table, Serial, Sysinfo, Uuid, Plain, Unknown };
 

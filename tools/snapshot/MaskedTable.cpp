@@ -24,10 +24,10 @@ constexpr std::size_t uuidLength = 16;
 
 using Offsets = std::vector<std::size_t>;
 
-/// Where in a structure stands what is the same on many machines; all else is emptied.
+/// Where a structure holds what is the same on many machines; everything else is emptied.
 struct Kept {
     Offsets texts;   ///< numbers of strings
-    Offsets serials; ///< numbers of strings that tell one machine from another: masked
+    Offsets serials; ///< numbers of strings that identify a machine: masked
     Offsets numbers;
 };
 

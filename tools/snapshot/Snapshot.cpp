@@ -21,10 +21,10 @@ namespace {
 const std::string hostNameFile = "/etc/hostname";
 const std::string architecture = "/proc/sys/kernel/arch";
 
-/// What the kernel answers for the running host; and what names the users of the host.
+/// What the kernel supplies for the running host, and the file that names the host's users.
 const std::set<std::string> neverCopied = {hostNameFile, architecture, "/run/utmp"};
 
-/// What is read when something else than the host is described: the product's identifier; changes of zone and clock.
+/// What describing the host does not read: files for the product's identifier and for changes of zone and clock.
 /// The last one names the board, for developers.
 const Paths alsoCopied = {"/etc/machine-id", "/etc/timezone", "/etc/adjtime", "/proc/device-tree/compatible"};
 
@@ -41,7 +41,7 @@ bool isDirectory(const Root& root, const std::string& path) {
 
 } // namespace
 
-/// The files that reading opened. A host that has nothing is asked for everything: each source is asked only where
+/// The files that reading opened. An empty host is read as well, which opens every source: each is read only where
 /// those before it say nothing.
 Paths Snapshot::takeRecord(const std::function<void(const Root&)>& read) {
     Root::Record record;
@@ -55,7 +55,7 @@ Paths Snapshot::takeRecord(const std::function<void(const Root&)>& read) {
     return files;
 }
 
-/// A path that may be a link is copied as one, and where it leads what was read there.
+/// A path that may be a link is copied as a link, and what was read is copied to where it leads.
 void Snapshot::planFollowed(const std::string& path, Paths& files) {
     if (isDirectory(root, path)) return;
     const Root::Contents end = root.resolve(path);
@@ -93,7 +93,7 @@ void Snapshot::writeAnswers() {
     write(architecture, VK::architectureOf(root) + "\n");
 }
 
-/// Nothing, too, for what is there and is no file.
+/// Also nothing for what is there and is no file.
 std::optional<std::string> Snapshot::contentsOf(const std::string& path) {
     const Root::Contents contents = root.read(path);
     if (contents) return contents.text;

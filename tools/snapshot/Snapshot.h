@@ -15,7 +15,7 @@ namespace snapshot {
 /// Copies the files that reading a host opens.
 class Snapshot {
 public:
-    /// Without a mask all is copied as it is; without a host name the host's own is written. `checkpoint` is called
+    /// Without a mask all is copied unchanged; without a host name the host's own is written. `checkpoint` is called
     /// between two files, and ends the copying by what it throws.
     struct Options {
         Mask* mask = nullptr;

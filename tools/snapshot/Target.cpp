@@ -21,7 +21,7 @@ fs::path withoutFinalSlash(const fs::path& path) {
     return path.has_filename() || !path.has_relative_path() ? path : withoutFinalSlash(path.parent_path());
 }
 
-/// What stands before the last slash, and what behind it.
+/// What is before the last slash, and what is behind it.
 std::pair<std::string, std::string> split(const std::string& name) {
     const std::size_t slash = name.rfind('/');
     return slash == std::string::npos ? std::pair(std::string(), name)
@@ -63,7 +63,7 @@ void Target::makeMissing(const fs::path& directory) {
     made.push_back(directory);
 }
 
-/// Nobody else may have put anything there, or be able to, or to read what comes there.
+/// Nobody else may have put anything there, be able to do so, or be able to read it.
 void Target::openItself() {
     VK::FileDescriptor fd = openDirectory(AT_FDCWD, path);
     struct stat status {};
@@ -90,7 +90,7 @@ void Target::link(const std::string& name, const std::string& target) {
     entries.push_back(name);
 }
 
-/// A directory below it that is to hold that name, made where need be.
+/// The directory below it for that name, made where it is missing.
 int Target::open(const std::string& directory, const std::string& forName) {
     const auto found = directories.find(directory);
     if (found != directories.end()) return found->second.get();
@@ -114,7 +114,7 @@ bool Target::remove() {
         removed = unlinkat(directories[directory].get(), own.c_str(), flags) == 0 && removed;
     };
     for (const std::string& name : entries) take(name, 0);
-    // What stands in a directory comes behind it in the alphabet.
+    // In alphabetical order a directory comes before its entries.
     for (auto each = directories.rbegin(); each != directories.rend(); ++each)
         if (!each->first.empty()) take(each->first, AT_REMOVEDIR);
     return removeMade() && removed;

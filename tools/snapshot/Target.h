@@ -21,14 +21,14 @@ public:
 /// The directory of a snapshot: no path is followed below it that this run did not make.
 class Target {
 public:
-    /// Makes the directory where it is not there. One that is has to be empty, its user's own and closed to others.
+    /// Makes the directory where it is missing. One that exists must be empty, its user's own and closed to others.
     /// Nothing is left of it where that fails.
     explicit Target(const std::filesystem::path& directory);
 
     void write(const std::string& name, std::string_view bytes);
     void link(const std::string& name, const std::string& target);
 
-    /// Takes away all that this run made: false where something of it stays.
+    /// Removes everything that this run made: false where something of it stays.
     bool remove();
 
     const std::filesystem::path& getPath() const { return path; }

@@ -5,7 +5,7 @@
  * - ftVersion is the CMPI version its maker wrote it to. Slots that a later version added come last; look at the number
  *   before touching them.
  * - A CMPIStatus* rc or a ...Out pointer may be null: the answer is then not wanted. Otherwise *rc is always written.
- * - A failing function answers null, 0 or CMPI_null, according to its type.
+ * - A failing function returns null, 0 or CMPI_null, according to its type.
  * - What a broker's function returns is the broker's and lives until the request ends. What clone returns is a copy of
  *   the caller's own, which lives until release and may be kept between requests. Releasing what a new... function made
  *   only ends it early; releasing what the provider was called with does nothing.
@@ -195,7 +195,7 @@ struct _CMPIBrokerFT {
     CMPIEnumeration* (*referenceNames)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                                        const char* resultClass, const char* role, CMPIStatus* rc);
 
-    /* Call a method of the object at path; it answers its return value and fills out, which comes empty. */
+    /* Call a method of the object at path; this returns its return value and fills out, which comes empty. */
     CMPIData (*invokeMethod)(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* path,
                              const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus* rc);
 
@@ -264,7 +264,7 @@ struct _CMPIBrokerEncFT {
 #endif
 };
 
-/* Services of the operating system. Those that answer an int answer 0 or an errno value. */
+/* Services of the operating system. Those that return an int return 0 or an errno value. */
 struct _CMPIBrokerExtFT {
     int ftVersion;
 
@@ -541,7 +541,7 @@ struct _CMPIErrorFT {
  * The provider's side. The broker calls these slots, from several threads at once, with a context and a result of its
  * own. What all five tables have: the versions (see above; miVersion is the broker's version that the provider needs),
  * the provider's name, and cleanup. That comes before the library is unloaded, and alone: a provider that is not yet
- * ready for it answers CMPI_RC_DO_NOT_UNLOAD or CMPI_RC_NEVER_UNLOAD, which counts unless terminating is true.
+ * ready for it returns CMPI_RC_DO_NOT_UNLOAD or CMPI_RC_NEVER_UNLOAD, which counts unless terminating is true.
  */
 
 /* Instances of a class. */

@@ -307,7 +307,7 @@
  */
 #define CMNoHook
 
-/* A hook that calls pfx##Kind##Initialize(&mi, ctx), which answers a status; unless that is OK, the factory fails. */
+/* A hook that calls pfx##Kind##Initialize(&mi, ctx), which returns a status; unless that is OK, the factory fails. */
 #define CMInitHook(pfx, Kind)                                                                                          \
     do {                                                                                                               \
         CMPIStatus cmInit_ = pfx##Kind##Initialize(&mi, ctx);                                                          \

@@ -25,7 +25,7 @@ namespace NVLog {
 /// adds it. It is dropped where no daemon listens, or one takes nothing for a second.
 class NVLogger {
 public:
-    /// Writes one line to the log channel. `function`, `file` and `line` tell where the event happened, `category`
+    /// Writes one line to the log channel. `function`, `file` and `line` say where the event happened, `category`
     /// whose event it is, `level` how grave it is (3000 notice, 6000 failure, 4000 and others debug).
     /// The `char*` and the two integers after it are not used.
     static void logLevelMessage(const char* function, const char* file, int line, const std::string& category,

@@ -2,7 +2,7 @@
 
 namespace VK {
 
-/// The product's classes by their numbers, which ProviderUtilities::getClassId answers.
+/// The product's classes by their numbers, which ProviderUtilities::getClassId returns.
 enum class ClassId : unsigned short {
     ComputerSystem = 1,
     PhysicalPackage = 22,

@@ -19,7 +19,7 @@ struct ProductOverrides {
 /// not a simulated one (vk/HostSource.h), or its file cannot be read.
 ProductOverrides productOverrides();
 
-/// The system's UUID as this machine's or the snapshot's files tell it; empty where they do not. What a simulated
+/// The system's UUID as this machine's or the snapshot's files hold it; empty where they do not. What a simulated
 /// host's file holds of its computer does not count.
 std::string hostUuid();
 
@@ -28,7 +28,7 @@ std::string hostUuid();
 /// manufacturer with QEMU. A snapshot: the firmware's names alone.
 bool hostIsKVM();
 
-/// For people: one line for each thing that the host could not tell, and why: it lacks the source, or we may not see
+/// For people: one line for each thing that the host does not say, and why: it lacks the source, or we may not see
 /// it; then one on time, zone, daylight saving and whether the NTP daemon runs, and one where the CIM server's
 /// configuration command is missing. Nothing is thrown but std::bad_alloc.
 std::vector<std::string> hostNotes();

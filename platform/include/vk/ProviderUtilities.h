@@ -13,7 +13,7 @@ namespace VK {
 
 /// What a provider does with CMPI objects, on top of any broker.
 ///
-/// Every status and null that the broker answers is checked. A key or property that the broker refuses is left out
+/// Every status and null that the broker returns is checked. A key or property that the broker refuses is left out
 /// and logged once, at level 6000, and so is a path or an instance that it does not make. Paths, instances and arrays
 /// belong to the broker and are never freed here. Nothing is thrown but std::bad_alloc, and std::runtime_error where
 /// said: a request whose keys cannot be read must not be taken for one without them, which means all. A null path,
@@ -33,19 +33,19 @@ public:
     static bool areClassesRelated(const CMPIBroker* broker, const std::string& nameSpace, const char* className,
                                   const char* otherClassName);
 
-    /// A path's namespace; empty when it has none. Throws std::runtime_error when the broker answers an error.
+    /// A path's namespace; empty when it has none. Throws std::runtime_error when the broker returns an error.
     static std::string getNamespace(const CMPIObjectPath* objectPath);
 
     /// A new path without keys, or null.
     static CMPIObjectPath* createObjectPath(const CMPIBroker* broker, const char* className, std::string nameSpace);
 
-    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker answers an error, or
+    /// How many keys the path has; 0 for a class path. Throws std::runtime_error when the broker returns an error, or
     /// cannot be asked.
     static unsigned int getKeyCount(const CMPIObjectPath* objectPath);
 
     /// Reads a text or a reference key, its name without regard to case: true and the value, or false (no such key, of
-    /// another type, or null) with `value` untouched. Throws std::runtime_error when the broker answers an error, other
-    /// than that the key is not there, to every way of asking that it offers, and when it offers none.
+    /// another type, or null) with `value` untouched. Throws std::runtime_error when the broker offers no
+    /// way of asking, or every way that it offers returns another error than that the key is missing.
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, std::string& value);
     static bool getKeyProperty(const CMPIObjectPath* objectPath, const char* name, CMPIObjectPath** value);
 
@@ -54,7 +54,7 @@ public:
     static bool setKeyProperty(CMPIObjectPath* objectPath, const char* name, CMPIObjectPath* value);
 
     /// Appends the path's keys to the moniker, in order: text as it is, integers in decimal, booleans as `TRUE` and
-    /// `FALSE`; references, nulls and other kinds are left out. False when the broker would not tell the keys.
+    /// `FALSE`; references, nulls and other kinds are left out. False when the broker did not return the keys.
     static bool transformObjectPathToMoniker(const CMPIObjectPath* objectPath, Moniker& moniker);
     /// Adds the moniker's pairs to the path as text keys, in order; false when one was refused. The moniker's cursor
     /// stands on its first pair then; in a moniker without pairs it stays where it was.

@@ -12,7 +12,7 @@ namespace VK {
 /// Paths are absolute as the host sees them (`/etc/hostname`); a missing first slash is as good. Below a root other
 /// than `/` no path leads out of it: absolute links and `..` are taken inside the root, as if it were the process's
 /// own. Objects hold no descriptor, are not changed by use and may be used by any thread. Errors come as errno values,
-/// so that ENOENT (the host has no such file) and EACCES (we may not see it) can be told apart. Nothing is thrown but
+/// so that ENOENT (the host has no such file) differs from EACCES (we may not see it). Nothing is thrown but
 /// std::bad_alloc.
 class Root {
 public:
@@ -43,8 +43,7 @@ public:
     static constexpr std::size_t defaultLimit = std::size_t{1} << 20;
 
     /// The root at the directory `where`; a relative one is taken from the working directory of now. Where it cannot be
-    /// reached, every operation answers why. `isSnapshot` says that a root at `/` is not to be taken for the running
-    /// host.
+    /// reached, every operation returns why. With `isSnapshot`, a root at `/` is not taken for the running host.
     explicit Root(const std::string& where, bool isSnapshot = false);
 
     /// The root of the process's host (vk/HostSource.h): the snapshot's directory, else `/`.
