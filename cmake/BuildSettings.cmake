@@ -39,25 +39,17 @@ endif()
 if(VK_FUZZ)
     target_compile_options(vk_settings INTERFACE -fsanitize=fuzzer-no-link)
 endif()
+if(VK_COVERAGE)
+    # Counted by gcc, in a file beside each object; all programs and libraries that hold the object add to it. Threads
+    # count, too.
+    target_compile_options(vk_settings INTERFACE -O0 --coverage -fprofile-abs-path -fprofile-update=atomic)
+    target_compile_definitions(vk_settings INTERFACE VK_COVERAGE)
+    target_link_options(vk_settings INTERFACE --coverage)
+endif()
 if(NOT CMAKE_BUILD_TYPE STREQUAL "Debug" AND NOT VK_COVERAGE AND NOT VK_SANITIZE)
     # Some distributions' compilers set a level of their own. It wants optimisation, which test programs do without.
     target_compile_options(vk_settings INTERFACE -U_FORTIFY_SOURCE
         $<$<NOT:$<BOOL:$<TARGET_PROPERTY:VK_UNOPTIMISED>>>:-D_FORTIFY_SOURCE=2>)
-endif()
-
-# The provider's own sources, and the tests that look inside.
-add_library(vk_counted INTERFACE)
-if(VK_COVERAGE)
-    # Counted by gcc, in a file beside each object; all programs and libraries that hold the object add to it. Threads
-    # count, too.
-    target_compile_options(vk_counted INTERFACE -O0 --coverage -fprofile-abs-path -fprofile-update=atomic)
-    target_compile_definitions(vk_counted INTERFACE VK_COVERAGE)
-    target_link_options(vk_counted INTERFACE --coverage)
-    if(VK_SANITIZE MATCHES undefined)
-        # These few would be branches of the source to gcc, which no test takes. The preset tsan has them.
-        target_compile_options(vk_counted INTERFACE
-            -fno-sanitize=bool,enum,nonnull-attribute,returns-nonnull-attribute)
-    endif()
 endif()
 
 # The CMPI headers, ours or others'; the provider and the broker are written to level 200.

@@ -9,10 +9,6 @@ build_packages="cmake ninja-build g++ pkg-config libcli11-dev nlohmann-json3-dev
 # shellcheck disable=SC2034
 test_packages="python3-clang python3-jsonschema groff bubblewrap strace iproute2 util-linux procps"
 
-# The entries of ctest that mirror the provider's own directories.
-# shellcheck disable=SC2034
-provider_tests='^((provider|cmpi|Linux)_[A-Z]|include_)'
-
 die() {
     echo "$0: $*" >&2
     exit 3
