@@ -1,7 +1,7 @@
 #include "Linux/CIMServiceConfig.h"
 
 #include "Linux/CommandStream.h"
-#include "vk/MachineLock.h"
+#include "include/MachineLock.h"
 #include "vk/Product.h"
 #include "vk/ProviderUtilities.h"
 

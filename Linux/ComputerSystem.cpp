@@ -19,6 +19,12 @@ Health healthOf(unsigned int nodeStatus) {
     return Health::Unknown;
 }
 
+bool hasChassis() {
+    Instrumentation chassis;
+    chassis.selectNode(NodeLexicon::SystemChassisNode);
+    return static_cast<bool>(chassis);
+}
+
 } // namespace
 
 const TraceSource& ComputerSystem::traceSource() {
@@ -155,77 +161,65 @@ bool ComputerSystem::getDedicated(std::vector<unsigned short>& purposes) const {
     return true;
 }
 
-void ComputerSystem::makeTexts(const std::string* uuid) const {
-    constexpr std::size_t most = 6;
-    identity.descriptions.reserve(most);
-    identity.values.reserve(most);
-    const auto add = [this](std::string value, const char* description) {
-        identity.values.push_back(std::move(value));
-        identity.descriptions.emplace_back(description);
+/// Appends to the lists that are not null. Returns whether there is a chassis; where there is none, the texts are made
+/// only if they are wanted always.
+bool ComputerSystem::identify(Texts* descriptions, Texts* values, bool alwaysTexts) const {
+    const TraceScope scope(VK_SCOPE_OF(source, "getIdentifyingInfo"));
+    const auto add = [&](const std::string& value, const char* description) {
+        if (values != nullptr) values->push_back(value);
+        if (descriptions != nullptr) descriptions->emplace_back(description);
     };
 
-    if (uuid != nullptr) {
-        add(*uuid, "CIM:GUID");
+    std::string uuid;
+    const bool hasUuid = getUUID(uuid);
+    if (!alwaysTexts && !hasChassis()) return false;
+    if (hasUuid) {
+        add(uuid, "CIM:GUID");
         add(make_string(Product::getUid()), "CIM:UniqueSystemID");
     }
+    const bool chassis = hasChassis();
     std::string serial;
     std::string model;
     // On purpose: the computer's own serial number and model, not the chassis'.
-    if (*identity.hasChassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
+    if (chassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
         node().getProperty(NodeLexicon::ModelProperty, model)) {
         add(model + ":" + serial, "CIM:Model:SerialNumber");
         add(serial, "CIM:Tag");
     }
     add(make_string(Product::getArchitecture()), "CIM:Architecture");
     add("true", "CIM:SecureIndicationEnabled");
-}
-
-/// Whether there is a chassis. The texts are made where there is one, or always, unless they are made already.
-bool ComputerSystem::identify(bool alwaysTexts) const {
-    const TraceScope scope(VK_SCOPE_OF(source, "getIdentifyingInfo"));
-    std::string uuid;
-    const bool hasUuid = getUUID(uuid);
-    if (!identity.hasChassis) {
-        Instrumentation chassis;
-        chassis.selectNode(NodeLexicon::SystemChassisNode);
-        identity.hasChassis = static_cast<bool>(chassis);
-    }
-    if (identity.values.empty() && (alwaysTexts || *identity.hasChassis)) makeTexts(hasUuid ? &uuid : nullptr);
-    return *identity.hasChassis;
+    return chassis;
 }
 
 bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,
                                         std::vector<std::string>& values) const {
-    const bool hasChassis = identify(true);
-    descriptions.insert(descriptions.end(), identity.descriptions.begin(), identity.descriptions.end());
-    values.insert(values.end(), identity.values.begin(), identity.values.end());
-    return hasChassis;
-}
-
-bool ComputerSystem::handOut(const TraceLines* lines, bool alwaysTexts, Texts Identity::*list, Texts& texts) const {
-    const TraceScope scope(lines);
-    texts.clear();
-    const bool hasChassis = identify(alwaysTexts);
-    texts = identity.*list;
-    return hasChassis;
+    return identify(&descriptions, &values);
 }
 
 bool ComputerSystem::getOtherIdentifyingInfo(std::vector<std::string>& values) const {
-    return handOut(VK_SCOPE(source), true, &Identity::values, values);
+    const TraceScope scope(VK_SCOPE(source));
+    values.clear();
+    return identify(nullptr, &values);
 }
 
 bool ComputerSystem::getIdentifyingDescriptions(std::vector<std::string>& descriptions) const {
-    return handOut(VK_SCOPE(source), true, &Identity::descriptions, descriptions);
+    const TraceScope scope(VK_SCOPE(source));
+    descriptions.clear();
+    return identify(&descriptions, nullptr);
 }
 
 // The lines are those of the getters.
 
 bool ComputerSystem::supplyOtherIdentifyingInfo(std::vector<std::string>& values) const {
-    return handOut(VK_SCOPE_OF(source, "getOtherIdentifyingInfo"), false, &Identity::values, values);
+    const TraceScope scope(VK_SCOPE_OF(source, "getOtherIdentifyingInfo"));
+    values.clear();
+    return identify(nullptr, &values, false);
 }
 
 bool ComputerSystem::supplyIdentifyingDescriptions(std::vector<std::string>& descriptions) const {
-    return handOut(VK_SCOPE_OF(source, "getIdentifyingDescriptions"), false, &Identity::descriptions, descriptions);
+    const TraceScope scope(VK_SCOPE_OF(source, "getIdentifyingDescriptions"));
+    descriptions.clear();
+    return identify(&descriptions, nullptr, false);
 }
 
 } // namespace VK::BaseServerProvider

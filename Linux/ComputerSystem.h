@@ -69,25 +69,12 @@ public:
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::ComputerSystemNode;
     static constexpr bool evaluatesUnfiltered = true;
-    static constexpr bool remembersNode = true;
     bool passes(const Filter& filter) const;
-    void forgetNode() { identity = {}; }
 
 private:
     using Texts = std::vector<std::string>;
 
-    /// What identifies the computer that the cursor stands on, found out once.
-    struct Identity {
-        std::optional<bool> hasChassis;
-        Texts values; ///< empty until they are wanted, as are the descriptions
-        Texts descriptions;
-    };
-
-    bool identify(bool alwaysTexts) const;
-    void makeTexts(const std::string* uuid) const;
-    bool handOut(const TraceLines* lines, bool alwaysTexts, Texts Identity::*list, Texts& texts) const;
-
-    mutable Identity identity;
+    bool identify(Texts* descriptions, Texts* values, bool alwaysTexts = true) const;
 };
 
 } // namespace VK::BaseServerProvider

@@ -35,7 +35,6 @@ public:
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::ComputerSystemNode;
     static constexpr bool evaluatesUnfiltered = true;
-    static constexpr bool remembersNode = false;
     bool passes(const Filter& filter) const;
 };
 

@@ -13,8 +13,7 @@ namespace VK::BaseServerProvider {
 /// type that pass a list of filters.
 ///
 /// `Self` says its node type (`nodeType`), whose trace lines it writes (`traceSource()`) and what each filter compares
-/// (`passes(const Filter&)`), whether a step asks evaluate() also without a filter (`evaluatesUnfiltered`), and whether
-/// it remembers anything of the node it stands on (`remembersNode`), which `forgetNode()` then ends.
+/// (`passes(const Filter&)`), and whether a step asks evaluate() also without a filter (`evaluatesUnfiltered`).
 /// `FilterTypes` is its enumeration of filters. Filters only narrow what lies ahead: the current node is never rewound,
 /// except by initialize().
 template <class Self, class FilterTypes>
@@ -34,7 +33,6 @@ public:
     void initialize() {
         const TraceScope scope(VK_SCOPE(Self::traceSource()));
         selectFirst();
-        moved();
         filters.clear();
     }
 
@@ -64,7 +62,6 @@ public:
     NodeCursor& operator++() {
         const TraceScope scope(VK_SCOPE(Self::traceSource()));
         ++instrumentation;
-        moved();
         if (Self::evaluatesUnfiltered || !filters.empty()) skipFiltered();
         return *this;
     }
@@ -79,16 +76,8 @@ protected:
     const Instrumentation& node() const { return instrumentation; }
 
 private:
-    /// What was found out about a node goes with it.
-    void moved() {
-        if constexpr (Self::remembersNode) static_cast<Self&>(*this).forgetNode();
-    }
-
     void skipFiltered() {
-        while (instrumentation && !evaluate()) {
-            ++instrumentation;
-            moved();
-        }
+        while (instrumentation && !evaluate()) ++instrumentation;
     }
 
     std::vector<Filter> filters;

@@ -64,7 +64,6 @@ public:
     static const TraceSource& traceSource();
     static constexpr auto nodeType = NodeLexicon::SystemChassisNode;
     static constexpr bool evaluatesUnfiltered = false; // on purpose, unlike the computer
-    static constexpr bool remembersNode = false;
     bool passes(const Filter& filter) const;
 };
 

@@ -39,22 +39,12 @@ SharedText* takeSharedText() {
 LineText::LineText() {
     SharedText* const shared = takeSharedText();
     if (shared == nullptr) return;
-    try {
-        if (shared->text == nullptr) {
-            std::string& made = lastingString("");
-            made.reserve(MessageBuffer::size);
-            shared->text = &made;
-        }
-    } catch (...) {
-        shared->taken.store(false, std::memory_order_release);
-        throw;
+    taken.flag = &shared->taken;
+    if (shared->text == nullptr) {
+        shared->text = &lastingString("");
+        shared->text->reserve(MessageBuffer::size);
     }
-    taken = &shared->taken;
     text = shared->text;
-}
-
-LineText::~LineText() {
-    if (taken != nullptr) taken->store(false, std::memory_order_release);
 }
 
 } // namespace VK

@@ -12,7 +12,6 @@ namespace VK {
 class LineText {
 public:
     LineText();
-    ~LineText();
     LineText(const LineText&) = delete;
     LineText& operator=(const LineText&) = delete;
 
@@ -20,7 +19,18 @@ public:
     const std::string& operator*() const { return *text; }
 
 private:
-    std::atomic<bool>* taken = nullptr; ///< of a string for all; null where none was free
+    /// Gives a string for all back; null where none was free.
+    struct Taken {
+        Taken() = default;
+        Taken(const Taken&) = delete;
+        Taken& operator=(const Taken&) = delete;
+        ~Taken() {
+            if (flag != nullptr) flag->store(false, std::memory_order_release);
+        }
+        std::atomic<bool>* flag = nullptr;
+    };
+
+    Taken taken;
     std::string own;
     std::string* text = &own;
 };

@@ -62,12 +62,13 @@ CMPIStatus BaseServer_InvokeMethod(CMPIMethodMI*, const CMPIContext* context, co
             status.rc = static_cast<CMPIrc>(rc); // on purpose: one number is both
         }
     };
-    frame.run(work, [&](const std::exception& exception) {
-        const CMPIBroker* const theBroker = broker;
-        status.rc = CMPI_RC_ERR_FAILED;
-        if (Cmpi::hasService(theBroker, &CMPIBrokerEncFT::newString))
-            status.msg = CMNewString(theBroker, exception.what(), nullptr);
-    });
+    frame.run([&] { withinLook(work); },
+              [&](const std::exception& exception) {
+                  const CMPIBroker* const theBroker = broker;
+                  status.rc = CMPI_RC_ERR_FAILED;
+                  if (Cmpi::hasService(theBroker, &CMPIBrokerEncFT::newString))
+                      status.msg = CMNewString(theBroker, exception.what(), nullptr);
+              });
     Answer answer(frame, result);
     contained([&] { answer.add(returnCode); });
     contained([&] { answer.close(); });

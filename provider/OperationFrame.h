@@ -1,9 +1,9 @@
 #pragma once
 
 #include "provider/BaseServerProvider.h"
+#include "provider/Look.h"
 
 #include "vk/ClassId.h"
-#include "vk/HostLook.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -60,12 +60,7 @@ public:
     template <class Work>
     CMPIStatus runMarked(Work work, unsigned int line = __builtin_LINE()) const {
         CMPIStatus status = {CMPI_RC_OK, nullptr};
-        const auto lookingOnce = [&] {
-            const HostLook look;
-            work(status);
-        };
-        run(
-            lookingOnce, [](const std::exception&) {}, line);
+        run([&] { withinLook([&] { work(status); }); }, [](const std::exception&) {}, line);
         contained([&] { markProviderExit(place.lines(here(line), ENTERING)); });
         return status;
     }

@@ -44,7 +44,8 @@ std::int64_t FileStamp::now() {
 }
 
 bool FileStamp::tellsChangesFrom(std::int64_t instant) const {
-    return error != 0 || changed + clockTick < instant;
+    // A stamp that lies ahead was made before the clock was set back: a change now has an earlier one.
+    return error != 0 || changed + clockTick < instant || changed > instant + clockTick;
 }
 
 } // namespace VK

@@ -1,11 +1,10 @@
 #pragma once
 
+#include "common/HostLook.h"
 #include "common/SeenFiles.h"
-#include "vk/HostLook.h"
 #include "vk/Kept.h"
 
 #include <atomic>
-#include <cstdint>
 #include <memory>
 #include <sched.h>
 
@@ -43,25 +42,20 @@ public:
     FromFiles(const FromFiles&) = delete;
     FromFiles& operator=(const FromFiles&) = delete;
 
-    /// As the files are now, or were when the thread's look began (vk/HostLook.h). `read` makes it, and adds every file
-    /// to the list that it is given before it reads it. What was made before stays where descriptors run out.
+    /// As the files are now, or were when the thread's look (HostLook.h) asked first. `read` makes it, and adds every
+    /// file to the list that it is given before it reads it. What was made before stays where descriptors run out.
     template <class Read>
     std::shared_ptr<const T> get(const Root& root, Read read) {
-        const std::uint64_t look = HostLook::number();
-        bool current = false;
-        Pointer known = take(look, current);
-        if (current) return valueOf(known);
-        if (known && known->files.unchanged()) return keep(std::move(known), look);
-        const ShortageWatch shortage;
-        const auto fresh = std::make_shared<Made>(root);
-        fresh->value = read(fresh->files);
-        if (shortage.seen()) return valueOf(known ? known : fresh);
-        return keep(fresh, look);
+        std::shared_ptr<const void>* const ofLook = HostLook::kept(this);
+        if (ofLook != nullptr && *ofLook) return std::static_pointer_cast<const T>(*ofLook);
+        std::shared_ptr<const T> value = asked(root, read);
+        if (ofLook != nullptr) *ofLook = value;
+        return value;
     }
 
     /// To be called after a change of our own.
     void forget() {
-        if (const BriefLock lock(busy); lock) lookAt = 0;
+        if (std::shared_ptr<const void>* const ofLook = HostLook::kept(this); ofLook != nullptr) ofLook->reset();
     }
 
 private:
@@ -74,24 +68,29 @@ private:
 
     static std::shared_ptr<const T> valueOf(const Pointer& made) { return {made, &made->value}; }
 
-    Pointer take(std::uint64_t look, bool& current) {
+    template <class Read>
+    std::shared_ptr<const T> asked(const Root& root, Read read) {
+        const Pointer known = take();
+        if (known && known->files.unchanged()) return valueOf(known);
+        const ShortageWatch shortage;
+        const auto fresh = std::make_shared<Made>(root);
+        fresh->value = read(fresh->files);
+        if (shortage.seen()) return valueOf(known ? known : fresh);
+        keep(fresh);
+        return valueOf(fresh);
+    }
+
+    Pointer take() {
         const BriefLock lock(busy);
-        current = lock && made && look != 0 && look == lookAt;
         return lock ? made : nullptr;
     }
 
-    std::shared_ptr<const T> keep(Pointer known, std::uint64_t look) {
-        std::shared_ptr<const T> value = valueOf(known);
-        if (const BriefLock lock(busy); lock) {
-            made.swap(known); // what was there before goes without the lock
-            lookAt = look;
-        }
-        return value;
+    void keep(Pointer fresh) {
+        if (const BriefLock lock(busy); lock) made.swap(fresh); // what was there before goes without the lock
     }
 
     std::atomic_flag busy = ATOMIC_FLAG_INIT;
     Pointer made;
-    std::uint64_t lookAt = 0; ///< in which the files were asked last
 };
 
 } // namespace VK

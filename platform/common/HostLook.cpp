@@ -1,30 +1,38 @@
-#include "vk/HostLook.h"
+#include "common/HostLook.h"
 
 #include "vk/HostSource.h"
-
-#include <atomic>
+#include "vk/WithinLook.h"
 
 namespace VK {
 
 namespace {
 
-thread_local std::uint64_t current = 0; // without a destructor: the library can be unloaded
+thread_local HostLook* current = nullptr; // without a destructor: the library can be unloaded
 
 } // namespace
 
 HostLook::HostLook() {
-    static std::atomic<std::uint64_t> last{0};
-    if (HostSource::current().kind == HostSource::Live || current != 0) return;
+    if (HostSource::current().kind == HostSource::Live || current != nullptr) return;
     outermost = true;
-    current = ++last;
+    current = this;
 }
 
 HostLook::~HostLook() {
-    if (outermost) current = 0;
+    if (outermost) current = nullptr;
 }
 
-std::uint64_t HostLook::number() {
-    return current;
+std::shared_ptr<const void>* HostLook::kept(const void* source) {
+    if (current == nullptr) return nullptr;
+    for (Place& place : current->places) {
+        if (place.source == nullptr) place.source = source;
+        if (place.source == source) return &place.value;
+    }
+    return nullptr;
 }
 
 } // namespace VK
+
+void vkWithinLook(void (*work)(void*), void* data) {
+    const VK::HostLook look;
+    work(data);
+}

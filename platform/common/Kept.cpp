@@ -11,8 +11,12 @@ std::atomic<unsigned int> shortages{0};
 
 } // namespace
 
+bool isShortage(int error) {
+    return error == EMFILE || error == ENFILE || error == ENOMEM;
+}
+
 void noteShortage(int error) {
-    if (error == EMFILE || error == ENFILE || error == ENOMEM) ++shortages;
+    if (isShortage(error)) ++shortages;
 }
 
 ShortageWatch::ShortageWatch() : before(shortages) {}

@@ -169,6 +169,7 @@ Root::Names Root::list(const std::string& path) const {
     FileDescriptor fd(opened);
     const std::unique_ptr<DIR, int (*)(DIR*)> stream(fdopendir(fd.get()), &closedir);
     if (!stream) {
+        noteShortage(errno);
         result.error = errno;
         return result;
     }
@@ -180,6 +181,7 @@ Root::Names Root::list(const std::string& path) const {
         errno = 0;
     }
     result.error = errno;
+    noteShortage(result.error);
     if (!result) result.names.clear();
     std::sort(result.names.begin(), result.names.end());
     return result;

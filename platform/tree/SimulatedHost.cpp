@@ -1,10 +1,11 @@
 #include "tree/SimulatedHost.h"
 
+#include "common/HostLook.h"
 #include "common/Text.h"
 #include "logger/LogLine.h"
 #include "tree/TreeFile.h"
 #include "tree/TreeText.h"
-#include "vk/HostLook.h"
+#include "vk/Kept.h"
 
 #include <algorithm>
 
@@ -51,10 +52,8 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
         return changed;
     };
     const std::string problem = replaceTreeFile(file, largestFile, change);
-    {
-        const std::lock_guard<std::mutex> lock(mutex);
-        lookAt = 0; // what we wrote shows at once
-    }
+    if (std::shared_ptr<const void>* const ofLook = HostLook::kept(this); ofLook != nullptr)
+        ofLook->reset(); // what we wrote shows at once
     if (problem.empty()) return true;
     logLine(failure, "setProperty", __LINE__,
             file + ": property " + std::to_string(property) + " of " + inQuotes(node.path) +
@@ -67,15 +66,17 @@ bool SimulatedHost::isKnown(const FileStamp& at) const {
 }
 
 std::shared_ptr<const SimulatedHost::State> SimulatedHost::state() {
-    const std::uint64_t look = HostLook::number();
-    {
-        const std::lock_guard<std::mutex> lock(mutex);
-        if (look != 0 && look == lookAt) return known;
-    }
+    std::shared_ptr<const void>* const ofLook = HostLook::kept(this);
+    if (ofLook != nullptr && *ofLook) return std::static_pointer_cast<const State>(*ofLook);
+    std::shared_ptr<const State> now = asked();
+    if (ofLook != nullptr) *ofLook = now;
+    return now;
+}
+
+std::shared_ptr<const SimulatedHost::State> SimulatedHost::asked() {
     const FileStamp at = FileStamp::behind(file.c_str());
     const std::lock_guard<std::mutex> lock(mutex);
     if (!isKnown(at)) readAnew();
-    lookAt = look;
     return known;
 }
 
@@ -83,6 +84,7 @@ void SimulatedHost::readAnew() {
     const std::string before = known ? known->problem : std::string();
     const std::int64_t begin = FileStamp::now();
     const TreeFileContents contents = readTreeFile(file, largestFile);
+    if (known && isShortage(contents.error)) return; // what is known stays, and is asked for again the next time
     auto fresh = std::make_shared<State>();
     TreeText text;
     text.problem = contents.problem;

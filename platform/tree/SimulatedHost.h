@@ -4,7 +4,6 @@
 #include "tree/NodeSource.h"
 #include "vk/HostFacts.h"
 
-#include <cstdint>
 #include <mutex>
 #include <string>
 
@@ -36,6 +35,7 @@ public:
 
 private:
     bool isKnown(const FileStamp& now) const;
+    std::shared_ptr<const State> asked();
     void readAnew();
     std::string refusal(const Node& node, unsigned int property, const Value& value) const;
 
@@ -43,8 +43,7 @@ private:
     std::mutex mutex;
     std::shared_ptr<const State> known;
     FileStamp stamp;
-    bool settled = false;     ///< the stamp shows every later change
-    std::uint64_t lookAt = 0; ///< the look (vk/HostLook.h) in which the file was asked last
+    bool settled = false; ///< the stamp shows every later change
 };
 
 } // namespace VK::Tree

@@ -4,6 +4,7 @@
 #include "common/FileLock.h"
 #include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
+#include "vk/Kept.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -17,6 +18,7 @@ namespace {
 
 TreeFileContents unusable(int error) {
     TreeFileContents contents;
+    noteShortage(error);
     contents.error = error;
     contents.problem = errorText(error);
     return contents;

@@ -140,6 +140,24 @@ TEST(TracePlace, MakesItsLinesOnce) {
     quiet = false;
 }
 
+TEST(TracePlace, ThrowsWhereThereIsNoMemoryForItsLinesAndMakesThemTheNextTime) {
+    quiet = true;
+    const auto reach = [] { traceMethod(VK_METHOD(source)); };
+    bool thrown = false;
+    {
+        const support::MemoryShortage shortage;
+        try {
+            reach();
+        } catch (const std::bad_alloc&) {
+            thrown = true;
+        }
+    }
+    EXPECT_TRUE(thrown);
+    EXPECT_GT(support::allocationsDuring(reach), 0U);
+    EXPECT_EQ(support::allocationsDuring(reach), 0U);
+    quiet = false;
+}
+
 constexpr const char* names[] = {"zero", "one", "two", "three"};
 
 template <int number>

@@ -7,12 +7,14 @@
 namespace {
 
 std::atomic<std::size_t> allocations{0};
+std::atomic<bool> isShort{false};
 
 } // namespace
 
 // In place of the standard library's, in this program and the libraries that it loads.
 void* operator new(std::size_t size) {
     ++allocations;
+    if (isShort) throw std::bad_alloc();
     if (void* const memory = std::malloc(size != 0 ? size : 1)) return memory;
     throw std::bad_alloc();
 }
@@ -28,4 +30,11 @@ std::size_t support::allocationsDuring(const std::function<void()>& run) {
     const std::size_t before = allocations;
     run();
     return allocations - before;
+}
+
+support::MemoryShortage::MemoryShortage() {
+    isShort = true;
+}
+support::MemoryShortage::~MemoryShortage() {
+    isShort = false;
 }

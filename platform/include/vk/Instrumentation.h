@@ -31,7 +31,7 @@ private:
 /// node's name and status when a cursor on it is first asked. Of this host power state and memory errors may be one
 /// second old, so that a request opens no file; of a snapshot every change shows at once, and its files are read again
 /// when they have changed; a simulated host's file is as it stands when nodes are selected. Within a look
-/// (vk/HostLook.h) snapshots and simulated hosts stay as they were at its beginning. What is known stays where
+/// (vk/WithinLook.h) snapshots and simulated hosts stay as they were at its beginning. What is known stays where
 /// descriptors run out, and what could not be read for that is read again the next time. No operation throws but for
 /// std::bad_alloc. Cursors are independent of each other; one cursor belongs to one thread at a time.
 class Instrumentation {

@@ -6,6 +6,9 @@
 
 namespace VK {
 
+/// Whether an errno value says that descriptors or memory ran out.
+bool isShortage(int error);
+
 /// Notes why something could not be opened, where descriptors or memory ran out.
 void noteShortage(int error);
 

@@ -1,6 +1,7 @@
 #pragma once
 
-#include <cstdint>
+#include <array>
+#include <memory>
 
 namespace VK {
 
@@ -14,11 +15,18 @@ public:
     HostLook(const HostLook&) = delete;
     HostLook& operator=(const HostLook&) = delete;
 
-    /// The number of the thread's look, which no other has; 0 where there is none.
-    static std::uint64_t number();
+    /// What the thread's look keeps of a source, null at first; no place at all where there is no look, or where it has
+    /// too many sources.
+    static std::shared_ptr<const void>* kept(const void* source);
 
 private:
+    struct Place {
+        const void* source = nullptr;
+        std::shared_ptr<const void> value;
+    };
+
     bool outermost = false;
+    std::array<Place, 8> places;
 };
 
 } // namespace VK

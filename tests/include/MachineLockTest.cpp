@@ -1,4 +1,4 @@
-#include "vk/MachineLock.h"
+#include "include/MachineLock.h"
 
 #include "support/Isolated.h"
 #include "support/TemporaryDirectory.h"
@@ -14,6 +14,11 @@
 #include <pthread.h>
 #include <sys/stat.h>
 #include <thread>
+
+/// The address sanitizer mistakes the frames of a cancelled thread for ones in use when it takes its signal stack back.
+extern "C" const char* __asan_default_options() {
+    return "use_sigaltstack=0";
+}
 
 namespace {
 
