@@ -40,6 +40,8 @@ public:
               for (std::size_t i = 0; !ended; ++i) {
                   all[i % all.size()]();
                   done = i / all.size();
+                  // A slow reader sees each state, too.
+                  if (done >= often) std::this_thread::sleep_for(std::chrono::milliseconds(1));
               }
           }) {}
     ~Churn() {
@@ -53,7 +55,7 @@ public:
     void expectOnly(const std::set<Answer>& answers, const Read& read) const {
         const auto end = std::chrono::steady_clock::now() + std::chrono::minutes(1);
         std::set<Answer> seen;
-        while ((done < 50 || seen != answers) && std::chrono::steady_clock::now() < end) {
+        while ((done < often || seen != answers) && std::chrono::steady_clock::now() < end) {
             const Answer answer = read();
             ASSERT_THAT(answers, Contains(answer));
             seen.insert(answer);
@@ -62,6 +64,8 @@ public:
     }
 
 private:
+    static constexpr std::size_t often = 50;
+
     std::atomic<bool> ended{false};
     std::atomic<std::size_t> done{0};
     std::thread thread;
