@@ -47,9 +47,10 @@ bool waitForLock(int file) {
     struct flock whole {};
     whole.l_type = F_WRLCK;
     whole.l_whence = SEEK_SET;
-    while (fcntl(file, F_SETLKW, &whole) != 0)
-        if (errno != EINTR) return false;
-    return true;
+    int result = 0;
+    do result = fcntl(file, F_SETLKW, &whole);
+    while (result != 0 && errno == EINTR);
+    return result == 0;
 }
 
 } // namespace

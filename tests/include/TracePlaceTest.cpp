@@ -140,6 +140,19 @@ TEST(TracePlace, MakesItsLinesOnce) {
     quiet = false;
 }
 
+void reachARacedPlace() {
+    traceMethod(VK_METHOD_OF(source, "raced"));
+}
+
+TEST(TracePlace, TakesTheLinesOfAnotherThatWasFirstMeanwhile) {
+    events.clear();
+    events.reserve(4);
+    support::atNextAllocation(reachARacedPlace);
+    reachARacedPlace();
+    ASSERT_THAT(events, SizeIs(4)) << "two calls to two channels";
+    for (const Event& event : events) EXPECT_EQ(event.handed, events[0].handed);
+}
+
 TEST(TracePlace, ThrowsWhereThereIsNoMemoryForItsLinesAndMakesThemTheNextTime) {
     quiet = true;
     const auto reach = [] { traceMethod(VK_METHOD(source)); };
