@@ -35,6 +35,11 @@ function(vk_test name)
     set_target_properties(${name} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/tests)
     if(TARGET test_headers)
         target_precompile_headers(${name} REUSE_FROM test_headers)
+        # The product's sources are read by clang-tidy too, as they are compiled, and it reads no headers precompiled by gcc.
+        set(of_product ${ARG_UNPARSED_ARGUMENTS})
+        list(FILTER of_product INCLUDE REGEX "^/")
+        list(FILTER of_product EXCLUDE REGEX "^${CMAKE_SOURCE_DIR}/tests/")
+        set_source_files_properties(${of_product} PROPERTIES SKIP_PRECOMPILE_HEADERS ON)
     endif()
     # An empty value would vanish on the way, and the next property's name be taken for it.
     set(properties TIMEOUT 300)
