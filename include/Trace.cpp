@@ -161,15 +161,18 @@ void markProviderExit(const std::string& logger, const char* file, const char* f
 }
 
 void markProviderEntry(const TraceLines* lines) {
-    writeEntry(existing(lines).category, lines->first);
+    const TraceLines& made = existing(lines);
+    writeEntry(made.category, made.first);
 }
 
 void markProviderExit(const TraceLines* lines) {
-    writeExit(existing(lines).category, lines->last);
+    const TraceLines& made = existing(lines);
+    writeExit(made.category, made.last);
 }
 
 void traceMethod(const TraceLines* lines, int level) {
-    hand(existing(lines), level, lines->first);
+    const TraceLines& made = existing(lines);
+    hand(made, level, made.first);
 }
 
 void traceMessage(const TracePoint& at, const char* message, int level) {
@@ -192,7 +195,8 @@ void traceDestructor(const TraceLines* lines) {
 }
 
 TraceScope::TraceScope(const TraceLines* theLines, int entryLevel) : lines(theLines) {
-    hand(existing(lines), entryLevel, lines->first);
+    const TraceLines& made = existing(lines);
+    hand(made, entryLevel, made.first);
 }
 
 TraceScope::~TraceScope() noexcept(false) {
@@ -204,7 +208,10 @@ DestructorTraceScope::DestructorTraceScope(const TraceLines* theLines) : lines(t
 }
 
 DestructorTraceScope::~DestructorTraceScope() noexcept(false) {
-    swallowing([&] { hand(existing(lines), DebugLevel, lines->last); });
+    swallowing([&] {
+        const TraceLines& made = existing(lines);
+        hand(made, DebugLevel, made.last);
+    });
 }
 
 void Parameter::addTo(TextBuffer<MessageBuffer::size + 1>& buffer) const {

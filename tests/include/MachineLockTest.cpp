@@ -16,7 +16,7 @@
 #include <thread>
 
 /// The address sanitizer mistakes the frames of a cancelled thread for ones in use when it takes its signal stack back.
-extern "C" const char* __asan_default_options() {
+extern "C" __attribute__((visibility("default"))) const char* __asan_default_options() {
     return "use_sigaltstack=0";
 }
 
