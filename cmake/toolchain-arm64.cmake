@@ -14,3 +14,6 @@ set(CMAKE_FIND_ROOT_PATH_MODE_LIBRARY ONLY)
 set(CMAKE_FIND_ROOT_PATH_MODE_INCLUDE ONLY)
 set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
 set(CMAKE_CROSSCOMPILING_EMULATOR qemu-aarch64;-L;/usr/aarch64-linux-gnu;-E;LD_LIBRARY_PATH=${VK_ARM64_SYSROOT}/usr/lib/aarch64-linux-gnu)
+
+# Libraries of libraries are found there, too.
+set(CMAKE_EXE_LINKER_FLAGS_INIT "-Wl,-rpath-link,${VK_ARM64_SYSROOT}/usr/lib/aarch64-linux-gnu")
