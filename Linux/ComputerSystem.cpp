@@ -3,6 +3,8 @@
 #include "vk/Product.h"
 #include "vk/make_string.h"
 
+#include <optional>
+
 namespace VK::BaseServerProvider {
 
 static const std::string& loggerComputerSystem = lastingString("Norvane.BaseServerProvider");
@@ -172,23 +174,27 @@ bool ComputerSystem::identify(Texts* descriptions, Texts* values, bool alwaysTex
 
     std::string uuid;
     const bool hasUuid = getUUID(uuid);
-    if (!alwaysTexts && !hasChassis()) return false;
+    std::optional<bool> chassis;
+    if (!alwaysTexts) {
+        chassis = hasChassis();
+        if (!*chassis) return false;
+    }
     if (hasUuid) {
         add(uuid, "CIM:GUID");
         add(make_string(Product::getUid()), "CIM:UniqueSystemID");
     }
-    const bool chassis = hasChassis();
+    if (!chassis) chassis = hasChassis();
     std::string serial;
     std::string model;
     // On purpose: the computer's own serial number and model, not the chassis'.
-    if (chassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
+    if (*chassis && node().getProperty(NodeLexicon::SerialNumberProperty, serial) &&
         node().getProperty(NodeLexicon::ModelProperty, model)) {
         add(model + ":" + serial, "CIM:Model:SerialNumber");
         add(serial, "CIM:Tag");
     }
     add(make_string(Product::getArchitecture()), "CIM:Architecture");
     add("true", "CIM:SecureIndicationEnabled");
-    return chassis;
+    return *chassis;
 }
 
 bool ComputerSystem::getIdentifyingInfo(std::vector<std::string>& descriptions,

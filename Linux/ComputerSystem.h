@@ -2,7 +2,6 @@
 
 #include "Linux/NodeCursor.h"
 
-#include <optional>
 #include <string>
 #include <vector>
 

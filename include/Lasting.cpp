@@ -31,8 +31,9 @@ namespace {
 constinit LastingObjects lastingObjects;
 constinit std::atomic<bool> processEnds{false};
 
-/// exit() destroys the static objects first, those of all libraries, and runs the libraries' own end afterwards. Where
-/// a library is unloaded, its end comes first and destroys its static objects.
+/// exit() destroys the static objects of libraries that were loaded while the process ran first, and runs the
+/// libraries' own end afterwards. Where a library is unloaded, its end comes first and destroys its static objects; and
+/// so it does at exit where the program was linked with the library, as no object manager is with a provider.
 struct EndOfProcess {
     ~EndOfProcess() { processEnds = true; }
 };

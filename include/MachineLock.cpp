@@ -5,7 +5,6 @@
 #include <new>
 #include <pthread.h>
 #include <sys/stat.h>
-#include <unistd.h>
 #include <utility>
 
 namespace VK {
@@ -24,23 +23,11 @@ bool onlyRootWrites(int directory) {
     return fstat(directory, &status) == 0 && status.st_uid == 0 && (status.st_mode & (S_IWGRP | S_IWOTH)) == 0;
 }
 
-/// A descriptor, or -1. A cancellation waits for the next chance while it is closed: close is one, and a destructor
-/// that a thread is unwound from ends the process.
-struct Closing {
-    ~Closing() {
-        int before = PTHREAD_CANCEL_ENABLE;
-        pthread_setcancelstate(PTHREAD_CANCEL_DISABLE, &before);
-        ::close(descriptor);
-        pthread_setcancelstate(before, nullptr);
-    }
-    int descriptor;
-};
-
-/// -1 where it may not be used.
-int openLockFile(const std::string& directory, const std::string& name) {
-    const Closing where{::open(directory.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)};
-    if (where.descriptor < 0 || !onlyRootWrites(where.descriptor)) return -1;
-    return openat(where.descriptor, name.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600);
+/// None where it may not be used.
+FileDescriptor openLockFile(const std::string& directory, const std::string& name) {
+    const FileDescriptor where(::open(directory.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+    if (!where || !onlyRootWrites(where.get())) return FileDescriptor();
+    return FileDescriptor(openat(where.get(), name.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
 }
 
 bool waitForLock(int file) {
@@ -57,12 +44,12 @@ bool waitForLock(int file) {
 
 MachineLock::MachineLock(const std::string& name, const std::string& directory)
     : threads(amongThreads), holder(getpid()) {
-    Closing opened{openLockFile(directory, name)};
-    if (opened.descriptor >= 0 && waitForLock(opened.descriptor)) file = std::exchange(opened.descriptor, -1);
+    FileDescriptor opened = openLockFile(directory, name);
+    if (opened && waitForLock(opened.get())) file = std::move(opened);
 }
 
 MachineLock::~MachineLock() {
-    const Closing closed{file}; // before other threads go on: members are destroyed later
+    const FileDescriptor closed = std::move(file); // before other threads go on: members are destroyed later
     if (getpid() != holder) threads.release();
 }
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "vk/FileDescriptor.h"
+
 #include <mutex>
 #include <string>
 #include <sys/types.h>
@@ -23,11 +25,11 @@ public:
     MachineLock& operator=(const MachineLock&) = delete;
 
     /// Whether other processes are kept out as well.
-    bool keepsProcessesOut() const { return file >= 0; }
+    bool keepsProcessesOut() const { return static_cast<bool>(file); }
 
 private:
     std::unique_lock<std::mutex> threads;
-    int file = -1;
+    FileDescriptor file;
     pid_t holder; ///< a child of a fork has a copy of this object, but not the lock
 };
 

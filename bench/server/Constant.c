@@ -213,41 +213,48 @@ static CMPIStatus benchInvoke(CMPIMethodMI* mi ignored, const CMPIContext* conte
     CMReturn(CMPI_RC_ERR_METHOD_NOT_AVAILABLE);
 }
 
-CMPIInstanceMI* VKRef_Create_InstanceMI(const CMPIBroker* theBroker, const CMPIContext* context ignored,
-                                        CMPIStatus* status) {
-    static CMPIInstanceMIFT table = {.ftVersion = 200, .miVersion = 200, .miName = "instanceVKRef"};
-    static CMPIInstanceMI mi = {NULL, &table};
-    table.cleanup = benchCleanup;
-    table.enumerateInstanceNames = benchNames;
-    table.enumerateInstances = benchInstances;
-    table.getInstance = benchGet;
+static void start(const CMPIBroker* theBroker, CMPIStatus* status) {
     broker = theBroker;
     readAnswers();
     CMSetStatus(status, CMPI_RC_OK);
+}
+
+CMPIInstanceMI* VKRef_Create_InstanceMI(const CMPIBroker* theBroker, const CMPIContext* context ignored,
+                                        CMPIStatus* status) {
+    static CMPIInstanceMIFT table = {.ftVersion = 200,
+                                     .miVersion = 200,
+                                     .miName = "instanceVKRef",
+                                     .cleanup = benchCleanup,
+                                     .enumerateInstanceNames = benchNames,
+                                     .enumerateInstances = benchInstances,
+                                     .getInstance = benchGet};
+    static CMPIInstanceMI mi = {NULL, &table};
+    start(theBroker, status);
     return &mi;
 }
 
 CMPIAssociationMI* VKRef_Create_AssociationMI(const CMPIBroker* theBroker, const CMPIContext* context ignored,
                                               CMPIStatus* status) {
-    static CMPIAssociationMIFT table = {.ftVersion = 200, .miVersion = 200, .miName = "associationVKRef"};
+    static CMPIAssociationMIFT table = {.ftVersion = 200,
+                                        .miVersion = 200,
+                                        .miName = "associationVKRef",
+                                        .cleanup = benchAssociationCleanup,
+                                        .associators = benchAssociators,
+                                        .associatorNames = benchAssociatorNames};
     static CMPIAssociationMI mi = {NULL, &table};
-    table.cleanup = benchAssociationCleanup;
-    table.associators = benchAssociators;
-    table.associatorNames = benchAssociatorNames;
-    broker = theBroker;
-    readAnswers();
-    CMSetStatus(status, CMPI_RC_OK);
+    start(theBroker, status);
     return &mi;
 }
 
 /* Registered because classes have methods; none is measured. */
 CMPIMethodMI* VKRef_Create_MethodMI(const CMPIBroker* theBroker, const CMPIContext* context ignored,
                                     CMPIStatus* status) {
-    static CMPIMethodMIFT table = {.ftVersion = 200, .miVersion = 200, .miName = "methodVKRef"};
+    static CMPIMethodMIFT table = {.ftVersion = 200,
+                                   .miVersion = 200,
+                                   .miName = "methodVKRef",
+                                   .cleanup = benchMethodCleanup,
+                                   .invokeMethod = benchInvoke};
     static CMPIMethodMI mi = {NULL, &table};
-    table.cleanup = benchMethodCleanup;
-    table.invokeMethod = benchInvoke;
-    broker = theBroker;
-    CMSetStatus(status, CMPI_RC_OK);
+    start(theBroker, status);
     return &mi;
 }

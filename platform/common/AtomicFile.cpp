@@ -1,6 +1,6 @@
 #include "common/AtomicFile.h"
 
-#include "logger/FileDescriptor.h"
+#include "vk/FileDescriptor.h"
 
 #include <cerrno>
 #include <csignal>

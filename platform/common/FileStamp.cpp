@@ -1,16 +1,25 @@
 #include "common/FileStamp.h"
 
+#include <algorithm>
+#include <array>
 #include <cerrno>
 #include <ctime>
+#include <linux/magic.h>
+#include <sys/vfs.h>
 
 namespace VK {
 
 namespace {
 
-constexpr std::int64_t clockTick = 20'000'000;
+constexpr std::int64_t second = 1'000'000'000;
+
+/// Of the clock that made a stamp, with a margin.
+std::int64_t clockTick(std::int64_t stamp) {
+    return stamp % second == 0 ? 2 * second : second / 50;
+}
 
 std::int64_t nanoseconds(const timespec& time) {
-    return std::int64_t{time.tv_sec} * 1'000'000'000 + time.tv_nsec;
+    return std::int64_t{time.tv_sec} * second + time.tv_nsec;
 }
 
 FileStamp stampOf(int result, const struct stat& status) {
@@ -45,7 +54,19 @@ std::int64_t FileStamp::now() {
 
 bool FileStamp::tellsChangesFrom(std::int64_t instant) const {
     // A stamp that lies ahead was made before the clock was set back: a change now has an earlier one.
-    return error != 0 || changed + clockTick < instant || changed > instant + clockTick;
+    const std::int64_t tick = clockTick(changed);
+    return error != 0 || changed + tick < instant || changed > instant + tick;
+}
+
+bool hasExactStamps(const std::string& file) {
+    constexpr std::array<decltype(statfs::f_type), 8> exact{EXT4_SUPER_MAGIC,      BTRFS_SUPER_MAGIC, XFS_SUPER_MAGIC,
+                                                            F2FS_SUPER_MAGIC,      TMPFS_MAGIC,       SQUASHFS_MAGIC,
+                                                            OVERLAYFS_SUPER_MAGIC, 0x2FC12FC1 /* ZFS */};
+    struct statfs status {};
+    const std::string directory = file.substr(0, file.rfind('/') + 1);
+    const bool found =
+        statfs(file.c_str(), &status) == 0 || statfs(directory.empty() ? "." : directory.c_str(), &status) == 0;
+    return found && std::find(exact.begin(), exact.end(), status.f_type) != exact.end();
 }
 
 } // namespace VK

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <string>
 #include <sys/stat.h>
 #include <tuple>
 
@@ -19,7 +20,8 @@ struct FileStamp {
     /// Now, on the clock of `changed`.
     static std::int64_t now();
     /// Whether it shows every change from `instant` on. Two changes within one tick of the file system's clock leave
-    /// the same stamp: a stamp that young may still be followed by a change that it does not show.
+    /// the same stamp: a stamp that young may still be followed by a change that it does not show. A file system whose
+    /// stamps are whole seconds ticks once in a second.
     bool tellsChangesFrom(std::int64_t instant) const;
 
     friend bool operator==(const FileStamp& a, const FileStamp& b) {
@@ -30,5 +32,9 @@ struct FileStamp {
     std::int64_t changed = 0; ///< nanoseconds since 1970; set by the kernel alone, with every change
     int error = 0;            ///< why there is no file, instead of all else
 };
+
+/// Whether a file lies, or would lie, in a file system whose stamps show each change at once: a local one on disks or
+/// in memory. Those of the kernel, of other hosts and of programs show some changes late, or not at all.
+bool hasExactStamps(const std::string& file);
 
 } // namespace VK

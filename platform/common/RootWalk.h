@@ -1,6 +1,6 @@
 #pragma once
 
-#include "logger/FileDescriptor.h"
+#include "vk/FileDescriptor.h"
 
 #include <string>
 #include <sys/types.h>

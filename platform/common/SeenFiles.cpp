@@ -6,21 +6,8 @@
 #include <algorithm>
 #include <cerrno>
 #include <fcntl.h>
-#include <linux/magic.h>
-#include <sys/vfs.h>
 
 namespace VK {
-
-namespace {
-
-/// Whether a file's stamp says nothing of its contents.
-bool isOfKernel(const std::string& file) {
-    struct statfs status {};
-    if (statfs(file.c_str(), &status) != 0) return false;
-    return status.f_type == PROC_SUPER_MAGIC || status.f_type == SYSFS_MAGIC;
-}
-
-} // namespace
 
 void SeenFiles::follow(const std::string& path, bool withEnd) {
     FileDescriptor directory(::open(root.getDirectory().c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
@@ -42,7 +29,7 @@ void SeenFiles::look(const std::string& path) {
     const std::string file = directory == "/" ? path : directory + path;
     if (std::any_of(files.begin(), files.end(), [&file](const Seen& seen) { return seen.file == file; })) return;
     const FileStamp stamp = FileStamp::of(file.c_str());
-    settled = settled && stamp.tellsChangesFrom(begin) && !isOfKernel(file);
+    settled = settled && stamp.tellsChangesFrom(begin) && hasExactStamps(file);
     files.push_back({file, stamp});
 }
 

@@ -23,7 +23,7 @@ public:
     void addLinks(const std::string& path) { follow(path, false); }
 
     /// Whether nothing was made, changed or removed since. False also where that cannot be known: a file is as young as
-    /// the file system's clock is coarse, or lies in a file system of the kernel, whose files change without a trace.
+    /// the file system's clock is coarse, or lies in a file system whose stamps do not show each change.
     bool unchanged() const;
 
 private:

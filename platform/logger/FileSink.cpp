@@ -1,7 +1,7 @@
 #include "logger/FileSink.h"
 
-#include "logger/FileDescriptor.h"
 #include "logger/Write.h"
+#include "vk/FileDescriptor.h"
 
 #include <atomic>
 #include <cerrno>

@@ -1,7 +1,7 @@
 #include "logger/SyslogSink.h"
 
-#include "logger/FileDescriptor.h"
 #include "logger/Line.h"
+#include "vk/FileDescriptor.h"
 
 #include <atomic>
 #include <cerrno>

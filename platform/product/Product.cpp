@@ -22,8 +22,8 @@ struct Facts {
 /// A file's text up to the first blank or line end.
 std::string readWord(const std::string& path) {
     const std::string text = Root::host().read(path).text;
-    constexpr std::string_view END(" \t\r\n\0", 5);
-    return text.substr(0, text.find_first_of(END));
+    constexpr std::string_view ends(" \t\r\n\0", 5);
+    return text.substr(0, text.find_first_of(ends));
 }
 
 std::string readMachineId() {

@@ -60,7 +60,7 @@ bool HostNow::hasUncorrectableMemoryErrors() {
 
 std::shared_ptr<const Zone::TimeZone> HostNow::zone() {
     return zoneInForce.get(root, [this](SeenFiles& files) {
-        Zone::addZoneFiles(files);
+        Zone::addZoneFiles(root, files);
         return Zone::zoneInForce(root);
     });
 }

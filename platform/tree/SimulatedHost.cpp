@@ -52,8 +52,7 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
         return changed;
     };
     const std::string problem = replaceTreeFile(file, largestFile, change);
-    if (std::shared_ptr<const void>* const ofLook = HostLook::kept(this); ofLook != nullptr)
-        ofLook->reset(); // what we wrote shows at once
+    HostLook::forget(this); // what we wrote shows at once
     if (problem.empty()) return true;
     logLine(failure, "setProperty", __LINE__,
             file + ": property " + std::to_string(property) + " of " + inQuotes(node.path) +
@@ -61,43 +60,45 @@ bool SimulatedHost::write(const Node& node, unsigned int property, const Value& 
     return false;
 }
 
-bool SimulatedHost::isKnown(const FileStamp& at) const {
-    return known && settled && at == stamp;
-}
-
 std::shared_ptr<const SimulatedHost::State> SimulatedHost::state() {
-    std::shared_ptr<const void>* const ofLook = HostLook::kept(this);
-    if (ofLook != nullptr && *ofLook) return std::static_pointer_cast<const State>(*ofLook);
-    std::shared_ptr<const State> now = asked();
-    if (ofLook != nullptr) *ofLook = now;
-    return now;
+    return HostLook::once<State>(this, [this] { return asked(); });
 }
 
 std::shared_ptr<const SimulatedHost::State> SimulatedHost::asked() {
     const FileStamp at = FileStamp::behind(file.c_str());
-    const std::lock_guard<std::mutex> lock(mutex);
-    if (!isKnown(at)) readAnew();
-    return known;
+    ReadPointer read = known.get();
+    if (!read || !read->settled || at != read->stamp) {
+        Read fresh = readAnew();
+        // At a shortage what is known stays, and is asked for again the next time.
+        if (!read || !isShortage(fresh.error)) read = keep(std::move(fresh));
+    }
+    return {read, &read->state};
 }
 
-void SimulatedHost::readAnew() {
-    const std::string before = known ? known->problem : std::string();
+SimulatedHost::Read SimulatedHost::readAnew() const {
+    Read fresh;
     const std::int64_t begin = FileStamp::now();
     const TreeFileContents contents = readTreeFile(file, largestFile);
-    if (known && isShortage(contents.error)) return; // what is known stays, and is asked for again the next time
-    auto fresh = std::make_shared<State>();
     TreeText text;
     text.problem = contents.problem;
     if (text.problem.empty()) text = readTreeText(contents.text);
-    fresh->tree = std::make_shared<const NodeTree>(std::move(text.nodes));
-    fresh->product = std::move(text.product);
-    fresh->problem = std::move(text.problem);
-    if (!fresh->problem.empty() && fresh->problem != before)
-        logLine(failure, "readAnew", __LINE__, file + ": " + fresh->problem);
-    stamp = contents.error != 0 ? FileStamp() : FileStamp(contents.status);
-    stamp.error = contents.error;
-    settled = stamp.tellsChangesFrom(begin);
-    known = std::move(fresh);
+    fresh.state.tree = std::make_shared<const NodeTree>(std::move(text.nodes));
+    fresh.state.product = std::move(text.product);
+    fresh.state.problem = std::move(text.problem);
+    fresh.error = contents.error;
+    fresh.stamp = contents.error != 0 ? FileStamp() : FileStamp(contents.status);
+    fresh.stamp.error = contents.error;
+    fresh.settled = fresh.stamp.tellsChangesFrom(begin) && hasExactStamps(file);
+    return fresh;
+}
+
+SimulatedHost::ReadPointer SimulatedHost::keep(Read fresh) {
+    const auto now = std::make_shared<const Read>(std::move(fresh));
+    const ReadPointer before = known.exchange(now);
+    const std::string& problem = now->state.problem;
+    if (!problem.empty() && (!before || problem != before->state.problem))
+        logLine(failure, "readAnew", __LINE__, file + ": " + problem);
+    return now;
 }
 
 } // namespace VK::Tree

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "common/FileStamp.h"
+#include "common/Published.h"
 #include "tree/NodeSource.h"
 #include "vk/HostFacts.h"
 
-#include <mutex>
 #include <string>
 
 namespace VK::Tree {
@@ -34,16 +34,22 @@ public:
     std::shared_ptr<const State> state();
 
 private:
-    bool isKnown(const FileStamp& now) const;
+    /// A state, and what the file was like then.
+    struct Read {
+        State state;
+        FileStamp stamp;
+        bool settled = false; ///< the stamp shows every later change
+        int error = 0;
+    };
+    using ReadPointer = Published<Read>::Pointer;
+
     std::shared_ptr<const State> asked();
-    void readAnew();
+    Read readAnew() const;
+    ReadPointer keep(Read fresh);
     std::string refusal(const Node& node, unsigned int property, const Value& value) const;
 
     const std::string file;
-    std::mutex mutex;
-    std::shared_ptr<const State> known;
-    FileStamp stamp;
-    bool settled = false; ///< the stamp shows every later change
+    Published<Read> known;
 };
 
 } // namespace VK::Tree

@@ -2,8 +2,8 @@
 
 #include "common/AtomicFile.h"
 #include "common/FileLock.h"
-#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
+#include "vk/FileDescriptor.h"
 #include "vk/Kept.h"
 
 #include <algorithm>

@@ -1,8 +1,8 @@
 #include "zone/Clock.h"
 
 #include "common/Text.h"
-#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
+#include "vk/FileDescriptor.h"
 #include "zone/ZoneInForce.h"
 
 #include <cerrno>

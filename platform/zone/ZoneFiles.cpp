@@ -1,8 +1,8 @@
 #include "zone/ZoneFiles.h"
 
 #include "common/FileLock.h"
-#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
+#include "vk/FileDescriptor.h"
 #include "zone/ZoneInForce.h"
 #include "zone/ZoneMemory.h"
 

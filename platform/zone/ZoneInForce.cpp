@@ -34,10 +34,13 @@ TimeZone zoneInForce(const Root& root) {
     return zoneOfFile(root, localTimeFile).value_or(TimeZone());
 }
 
-void addZoneFiles(SeenFiles& files) {
+void addZoneFiles(const Root& root, SeenFiles& files) {
     files.add(localTimeFile);
     files.addLinks(zoneDirectory); // both decide whether the file is trusted
     files.addLinks("/etc");
+    // A file that is not trusted becomes so where its directory's name takes the zone directory's place.
+    if (const Root::Contents real = root.resolve(localTimeFile); real && !isTrusted(root, real.text))
+        files.add(zoneDirectory);
 }
 
 int offsetInForce(const TimeZone& zone) {

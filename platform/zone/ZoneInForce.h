@@ -30,7 +30,7 @@ int offsetInForce(const Root& root);
 bool hasDaylightSaving(const Root& root);
 
 /// Adds the files that make the zone in force.
-void addZoneFiles(SeenFiles& files);
+void addZoneFiles(const Root& root, SeenFiles& files);
 
 /// The same of a zone that was read before; and the present time in it, as a CIM date-time with microseconds.
 int offsetInForce(const TimeZone& zone);

@@ -1,8 +1,8 @@
 #include "tools/check/Surroundings.h"
 
 #include "common/Text.h"
-#include "logger/FileDescriptor.h"
 #include "logger/LogLine.h"
+#include "vk/FileDescriptor.h"
 
 #include <cerrno>
 #include <cstdlib>

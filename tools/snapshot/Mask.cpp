@@ -59,6 +59,13 @@ std::string digitsOf(const std::string& text) {
 
 } // namespace
 
+std::string bytesOfDigits(std::string_view digits) {
+    std::string bytes;
+    for (std::size_t i = 0; i + 1 < digits.size(); i += digits[i] == '-' ? 1 : 2)
+        if (digits[i] != '-') bytes += static_cast<char>(std::stoul(std::string(digits.substr(i, 2)), nullptr, 16));
+    return bytes;
+}
+
 std::string Mask::stream(std::string_view text, std::size_t count, unsigned int turn) const {
     std::string made;
     while (made.size() < count) {
@@ -102,10 +109,7 @@ std::string Mask::uuid(const std::string& text) const {
     const std::string digits = digitsOf(text);
     if (digits.empty()) return name(text);
     if (VK::Host::isSharedUuid(digits)) return text;
-    std::string bytes;
-    for (std::size_t i = 0; i < digits.size(); i += 2)
-        bytes += static_cast<char>(std::stoul(digits.substr(i, 2), nullptr, 16));
-    bytes = stream(bytes, bytes.size(), 0);
+    const std::string bytes = stream(bytesOfDigits(digits), digits.size() / 2, 0);
 
     const bool isUpper = std::none_of(text.begin(), text.end(), [](char c) { return c >= 'a' && c <= 'z'; });
     const char* const hex = isUpper ? "0123456789ABCDEF" : "0123456789abcdef";

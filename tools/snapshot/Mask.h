@@ -6,6 +6,9 @@
 
 namespace snapshot {
 
+/// The bytes that a UUID's digits stand for, in their order; dashes between them are passed over.
+std::string bytesOfDigits(std::string_view digits);
+
 /// Replaces what identifies a machine. Equal texts are replaced equally, so that what belongs together still does.
 class Mask {
 public:

@@ -55,14 +55,6 @@ Kept keptOf(const SmbiosStructure& structure) {
     }
 }
 
-/// The bytes of a uuidAt's text, in its order.
-std::string bytesOf(const std::string& uuid) {
-    std::string bytes;
-    for (std::size_t i = 0; i + 1 < uuid.size(); i += uuid[i] == '-' ? 1 : 2)
-        if (uuid[i] != '-') bytes += static_cast<char>(std::stoul(uuid.substr(i, 2), nullptr, 16));
-    return bytes;
-}
-
 class MaskedTable {
 public:
     MaskedTable(const std::string& table, SmbiosVersion tableVersion, Mask& ofRun)
@@ -114,8 +106,8 @@ private:
     }
 
     std::string maskedUuid(std::string_view stored) const {
-        const std::string inOrder = bytesOf(mask.uuid(VK::Host::uuidFromBytes(stored, version)));
-        return bytesOf(VK::Host::uuidFromBytes(inOrder, version)); // back by the same exchange of bytes
+        const std::string inOrder = bytesOfDigits(mask.uuid(VK::Host::uuidFromBytes(stored, version)));
+        return bytesOfDigits(VK::Host::uuidFromBytes(inOrder, version)); // back by the same exchange of bytes
     }
 
     void addRest(std::string_view rest) {

@@ -7,7 +7,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <filesystem>
 #include <memory>
+#include <unistd.h>
 
 namespace VK::Tree {
 
@@ -147,6 +149,18 @@ TEST_F(RealHostTest, LetsOnlyTheZoneOfASnapshotBeWritten) {
     files.write("etc/timezone", "Etc/UTC\n");
     EXPECT_TRUE(host().write(computer, 127, Value(4294966996U))); // -300
     EXPECT_EQ(host().read(computer, 127), Value(4294966996U));
+}
+
+TEST_F(RealHostTest, TrustsAZoneFromWhenItsDirectoryIsTheZoneDirectory) {
+    files.write("usr/share/zoneinfo/Etc/UTC", "");
+    std::filesystem::create_directories(files.path("opt/zones"));
+    std::filesystem::copy_file("/usr/share/zoneinfo/Asia/Kolkata", files.path("opt/zones/Kolkata"));
+    files.link("/opt/zones/Kolkata", "etc/localtime");
+    usleep(50'000); // until the stamps show every change
+    EXPECT_EQ(read("/computer/0", 127), Value(0U));
+    std::filesystem::remove_all(files.path("usr/share/zoneinfo"));
+    files.link("/opt/zones", "usr/share/zoneinfo");
+    EXPECT_EQ(read("/computer/0", 127), Value(330U));
 }
 
 TEST_F(RealHostTest, NothingOfAChassisCanBeWritten) {

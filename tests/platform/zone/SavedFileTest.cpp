@@ -1,8 +1,8 @@
 #include "zone/SavedFile.h"
 
-#include "logger/FileDescriptor.h"
 #include "support/Synchronised.h"
 #include "support/TemporaryDirectory.h"
+#include "vk/FileDescriptor.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -6,9 +6,10 @@
 
 namespace VK {
 
-/// Owns a descriptor; -1 is none.
+/// Owns a file descriptor and closes it at its end; -1 is none. It may be moved, not copied. Nothing is thrown.
 class FileDescriptor {
 public:
+    /// Takes over `descriptor`, as open(2) and its like return it: -1 for a failure is none.
     explicit FileDescriptor(int descriptor = -1) noexcept : fd(descriptor) {}
     FileDescriptor(FileDescriptor&& other) noexcept : fd(other.release()) {}
     FileDescriptor& operator=(FileDescriptor&& other) noexcept {
@@ -19,8 +20,11 @@ public:
         if (fd >= 0) closeWithoutEnd(fd);
     }
 
+    /// The descriptor, or -1; it stays owned.
     int get() const noexcept { return fd; }
+    /// The descriptor, or -1, which the caller closes from now on.
     int release() noexcept { return std::exchange(fd, -1); }
+    /// Whether there is a descriptor.
     explicit operator bool() const noexcept { return fd >= 0; }
 
 private:
