@@ -25,7 +25,7 @@ std::string reason(const Fact& fact, const std::string& untold) {
 }
 
 void noteMissing(std::vector<std::string>& notes, const char* what, const Fact& fact) {
-    if (!fact) notes.push_back(std::string("no ") + what + ": " + reason(fact, "the host does not tell it"));
+    if (!fact) notes.push_back(std::string("no ") + what + ": " + reason(fact, "the host has none"));
 }
 
 } // namespace
@@ -41,7 +41,7 @@ std::vector<std::string> notesOn(const HardwareFacts& facts) {
     noteMissing(notes, "manufacturer", facts.manufacturer);
     noteMissing(notes, "model", facts.model);
     if (facts.chassis.empty())
-        notes.push_back("no chassis: " + reason(facts.noChassis, "the host does not tell of one"));
+        notes.push_back("no chassis: " + reason(facts.noChassis, "the host has none"));
     noteMissing(notes, "primary owner", facts.ownerName);
     return notes;
 }

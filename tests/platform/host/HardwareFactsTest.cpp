@@ -149,8 +149,8 @@ TEST_F(HardwareFactsTest, NothingTellsOfNothing) {
     EXPECT_TRUE(facts.chassis.empty());
     EXPECT_EQ(facts.model.error, ENOENT);
     EXPECT_THAT(notesOn(facts), Contains(StartsWith("no SMBIOS tables: the firmware provides none")));
-    EXPECT_THAT(notesOn(facts), Contains("no serial number: the host does not tell it"));
-    EXPECT_THAT(notesOn(facts), Contains("no chassis: the host does not tell of one"));
+    EXPECT_THAT(notesOn(facts), Contains("no serial number: the host has none"));
+    EXPECT_THAT(notesOn(facts), Contains("no chassis: the host has none"));
 }
 
 TEST_F(HardwareFactsTest, ASnapshotTellsItsOwnArchitecture) {
