@@ -64,6 +64,10 @@ vk_configured(docs/man/vk-host-snapshot.8.in ${CMAKE_INSTALL_MANDIR}/man8 tools 
 vk_configured(docs/man/vkcim.1.in ${CMAKE_INSTALL_MANDIR}/man1 tools FILES)
 install(FILES ${VK_SCHEMA_DIR}/vkcim.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
     RENAME vkcim COMPONENT tools)
+foreach(program IN ITEMS vk-provider-check vk-host-snapshot) # bash-completion looks for each by its name
+    install(FILES tools/vk-tools.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
+        RENAME ${program} COMPONENT tools)
+endforeach()
 install(FILES ${VK_SCHEMA_DIR}/vkcim.schema.json docs/json/vk-provider-check.schema.json
     DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/vk-baseserver-tools COMPONENT tools)
 install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/examples COMPONENT tools)
