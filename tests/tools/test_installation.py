@@ -37,6 +37,9 @@ class Contents(unittest.TestCase):
                      "share/doc/vk-baseserver-tools/vkcim.schema.json",
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
         expected += [f"share/vk-baseserver/register/{path.name}" for path in (SOURCE / "tools/register").glob("*.py")]
+        expected += [f"lib/pkgconfig/{name}.pc" for name in LIBRARIES[:-1] + ["vk-cmpi"]]
+        expected += [f"lib/cmake/vk-baseserver/vk-baseserver-config{part}.cmake"
+                     for part in ("", "-relwithdebinfo", "-version")]
         headers = (SOURCE / "platform/include").rglob("*.h")
         expected += [f"include/vk-baseserver/{h.relative_to(SOURCE / 'platform/include')}" for h in headers]
         self.assertEqual([str(p.relative_to(PREFIX)) for p in files_below(PREFIX)], sorted(expected))
