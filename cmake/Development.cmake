@@ -28,6 +28,7 @@ install(FILES ${version_file} DESTINATION ${package} COMPONENT development)
 # They name places from where they lie themselves, so that they are right below every prefix.
 set(pkgconfig_directory ${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig)
 file(RELATIVE_PATH VK_PKGCONFIG_TO_PREFIX ${pkgconfig_directory} ${CMAKE_INSTALL_PREFIX})
+string(REGEX REPLACE "/$" "" VK_PKGCONFIG_TO_PREFIX ${VK_PKGCONFIG_TO_PREFIX})
 file(RELATIVE_PATH VK_PREFIX_TO_LIBDIR ${CMAKE_INSTALL_PREFIX} ${CMAKE_INSTALL_FULL_LIBDIR})
 file(RELATIVE_PATH VK_PREFIX_TO_HEADERS ${CMAKE_INSTALL_PREFIX} ${CMAKE_INSTALL_FULL_INCLUDEDIR}/vk-baseserver)
 
