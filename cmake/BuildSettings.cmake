@@ -54,5 +54,5 @@ endif()
 
 # The CMPI headers, ours or others'; the provider and the broker are written to level 200.
 add_library(vk_cmpi INTERFACE)
-target_include_directories(vk_cmpi SYSTEM INTERFACE ${CMPI_INCLUDE_DIR})
+target_include_directories(vk_cmpi SYSTEM INTERFACE "$<BUILD_INTERFACE:${CMPI_INCLUDE_DIR}>")
 target_compile_definitions(vk_cmpi INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU CMPI_VERSION=200)

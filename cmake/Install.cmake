@@ -1,6 +1,7 @@
-# What is installed where. Components: provider (libraries, schema, registration), tools, development.
+# What is installed where. Components: provider (libraries, schema, registration), tools; Development.cmake has the third.
 
-set(runtime_libraries vknabaseserverprofileprovider nvlog vkcommon vkproduct vkinstrumentation vkproviderutilities)
+set(public_libraries nvlog vkcommon vkproduct vkinstrumentation vkproviderutilities)
+set(runtime_libraries vknabaseserverprofileprovider ${public_libraries})
 
 # An object manager may load the provider through a link in a directory of its own, and $ORIGIN is that directory then; so the
 # installed libraries name their own directory as well. Which one that is becomes known when installing (--prefix): room for
@@ -20,7 +21,9 @@ if(NOT VK_COVERAGE)
     endforeach()
 endif()
 
-install(TARGETS ${runtime_libraries}
+install(TARGETS vknabaseserverprofileprovider
+    LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT provider NAMELINK_COMPONENT development)
+install(TARGETS ${public_libraries} EXPORT vk-baseserver
     LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT provider NAMELINK_COMPONENT development)
 foreach(library IN LISTS runtime_libraries)
     install(CODE "
@@ -39,11 +42,6 @@ install(CODE "
 
 install(TARGETS vkcim RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
 install(TARGETS vk-host-snapshot vk-provider-check RUNTIME DESTINATION ${CMAKE_INSTALL_SBINDIR} COMPONENT tools)
-
-install(DIRECTORY platform/include/nvlog platform/include/vk
-    DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/vk-baseserver COMPONENT development)
-install(DIRECTORY platform/include/cmpi
-    DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/vk-baseserver COMPONENT development)
 
 install(FILES ${VK_SCHEMA_DIR}/vk-baseserver.mof ${VK_SCHEMA_DIR}/vk-baseserver-registration.mof
     ${VK_SCHEMA_DIR}/vk-baseserver.reg DESTINATION ${VK_SHARE_DIR} COMPONENT provider)
@@ -64,6 +62,10 @@ vk_configured(docs/man/vk-host-snapshot.8.in ${CMAKE_INSTALL_MANDIR}/man8 tools 
 vk_configured(docs/man/vkcim.1.in ${CMAKE_INSTALL_MANDIR}/man1 tools FILES)
 install(FILES ${VK_SCHEMA_DIR}/vkcim.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
     RENAME vkcim COMPONENT tools)
+foreach(program IN ITEMS vk-provider-check vk-host-snapshot) # bash-completion looks for each by its name
+    install(FILES tools/vk-tools.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
+        RENAME ${program} COMPONENT tools)
+endforeach()
 install(FILES ${VK_SCHEMA_DIR}/vkcim.schema.json docs/json/vk-provider-check.schema.json
     DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/vk-baseserver-tools COMPONENT tools)
 install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/examples COMPONENT tools)

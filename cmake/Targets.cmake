@@ -6,7 +6,8 @@ function(vk_platform_library name)
     add_library(${name} SHARED ${ARG_UNPARSED_ARGUMENTS})
     set_target_properties(${name} PROPERTIES VERSION 1 SOVERSION 1)
     target_compile_options(${name} PRIVATE -fvisibility=default)
-    target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/platform/include PRIVATE ${CMAKE_SOURCE_DIR}/platform)
+    target_include_directories(${name} PUBLIC "$<BUILD_INTERFACE:${CMAKE_SOURCE_DIR}/platform/include>"
+        PRIVATE ${CMAKE_SOURCE_DIR}/platform)
     target_link_libraries(${name} PRIVATE vk_settings ${ARG_LINK})
 endfunction()
 

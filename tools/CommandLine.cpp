@@ -1,5 +1,7 @@
 #include "tools/CommandLine.h"
 
+#include <filesystem>
+
 namespace tools {
 
 void addCommonOptions(CLI::App& app) {
@@ -17,6 +19,13 @@ std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, O
     } catch (const CLI::Error& error) {
         return refuse(app, error.what(), output);
     }
+}
+
+std::optional<std::string> problemOfDirectory(const std::string& path) {
+    std::error_code error;
+    if (std::filesystem::is_directory(path, error)) return std::nullopt;
+    if (error && error != std::errc::no_such_file_or_directory) return path + ": " + error.message();
+    return path + " is no directory";
 }
 
 int refuse(const CLI::App& app, const std::string& problem, Output output) {

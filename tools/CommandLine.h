@@ -23,6 +23,9 @@ void addCommonOptions(CLI::App& app);
 /// Reads the words behind the program's name: nothing, or the exit status where an answer was printed already.
 std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, Output output);
 
+/// Why what was named cannot be looked into as a directory; nothing where it can.
+std::optional<std::string> problemOfDirectory(const std::string& path);
+
 /// Says why arguments cannot be used, and returns the exit status.
 int refuse(const CLI::App& app, const std::string& problem, Output output);
 

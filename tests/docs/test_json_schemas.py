@@ -177,11 +177,13 @@ class Check(unittest.TestCase):
     VALIDATOR = jsonschema.Draft202012Validator(schema(SOURCE / "docs/json/vk-provider-check.schema.json"))
 
     def test_what_it_prints(self):
-        for directory in ("/", str(SOURCE)):
-            code, output, error = run(str(CHECK), "--root", directory, "--format", "json")
+        for directory, part in (("/", "reading"), (str(SOURCE), "reading"), (str(SOURCE), "setting")):
+            code, output, error = run(str(CHECK), part, "--root", directory, "--format", "json")
             document = json.loads(output)
             self.VALIDATOR.validate(document)
             self.assertEqual(code, 1 if document["missing"] else 0, error)
+            self.assertEqual(document["asked"], part)
+            self.assertEqual({c["part"] for c in document["checks"]}, {"reading", "setting"})
 
     def test_anything_else_is_refused(self):
         right = json.loads(run(str(CHECK), "--format", "json")[1])
@@ -190,7 +192,7 @@ class Check(unittest.TestCase):
         for key in right["checks"][0]:
             for wrong in ({k: v for k, v in right["checks"][0].items() if k != key}, {**right["checks"][0], key: 1.5}):
                 self.assertFalse(self.VALIDATOR.is_valid({**right, "checks": [wrong]}), key)
-        for wrong in ({"missing": -1}, {"missing": "none"}, {"checks": []}, {"extra": 1}):
+        for wrong in ({"missing": -1}, {"missing": "none"}, {"asked": "writing"}, {"checks": []}, {"extra": 1}):
             self.assertFalse(self.VALIDATOR.is_valid({**right, **wrong}), wrong)
 
 

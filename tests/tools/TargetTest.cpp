@@ -51,6 +51,17 @@ TEST_F(TargetTest, TakesAwayAllThatItMade) {
     EXPECT_FALSE(fs::exists(place));
 }
 
+TEST_F(TargetTest, TakesAwayItsOwnBelowADirectoryThatOthersUse) {
+    fs::create_directory(place);
+    fs::permissions(place, fs::perms::all);
+    Target target(place);
+    EXPECT_EQ(target.getPath().parent_path(), place);
+    target.write("etc/hostname", "node7");
+    EXPECT_TRUE(fs::exists(target.getPath() / "etc/hostname"));
+    EXPECT_TRUE(target.remove());
+    EXPECT_TRUE(fs::is_empty(place));
+}
+
 TEST_F(TargetTest, SaysThatSomethingStaysOfIt) {
     Target target(place);
     target.write("etc/hostname", "node7");

@@ -2,13 +2,13 @@
 
 import json
 import os
+import re
 import unittest
 from pathlib import Path
 
-from support import BUILD, directory, run
+from support import BUILD, NOBODY, directory, run, run_as_nobody
 
 CHECK = BUILD / "installed/vk-provider-check"
-NOBODY = 65534
 
 
 def make_host(without=()):
@@ -33,8 +33,8 @@ def check(root, *words, **env):
     return run(CHECK, "--root", root, "--format", "json", *words, env={"PATH": "/bin", **env})
 
 
-def missing(done):
-    return {c["name"]: c for c in json.loads(done.stdout)["checks"] if not c["found"]}
+def missing(done, part=None):
+    return {c["name"]: c for c in json.loads(done.stdout)["checks"] if not c["found"] and part in (None, c["part"])}
 
 
 class Check(unittest.TestCase):
@@ -42,27 +42,37 @@ class Check(unittest.TestCase):
     RIGHTS = {"right to set the clock", "right to change the zone"}
 
     def test_finds_everything(self):
-        done = check(make_host())
-        self.assertEqual(set(missing(done)) - self.RIGHTS, set())
-        answer = json.loads(done.stdout)
-        self.assertEqual(answer["missing"], len(missing(done)))
-        self.assertEqual(done.returncode, 1 if answer["missing"] else 0)
-        self.assertEqual({k for c in answer["checks"] for k in c}, {"name", "found", "detail", "without"})
+        for asked in ("reading", "setting"):
+            done = check(make_host(), asked)
+            self.assertEqual(set(missing(done)) - self.RIGHTS, set())
+            answer = json.loads(done.stdout)
+            self.assertEqual((answer["asked"], answer["missing"]), (asked, len(missing(done, asked))))
+            self.assertEqual(done.returncode, 1 if answer["missing"] else 0)
+            self.assertEqual({k for c in answer["checks"] for k in c}, {"part", "name", "found", "detail", "without"})
 
     def test_names_each_thing_that_is_missing_and_what_fails_then(self):
-        for file, name, effect in [
-                ("sys/firmware/dmi/tables/DMI", "hardware tables", "VESKA_PhysicalPackage"),
-                ("etc/machine-id", "machine id", "unique identifier"), ("etc/localtime", "time zone", "UTC"),
-                ("usr/share/zoneinfo/Etc/GMT", "time zones", "file of its own"),
-                ("bin/ps", "ps", "not running"), ("bin/ntpd", "ntpd", "ManageTime"),
-                ("etc/init.d/ntp", "/etc/init.d/ntp", "ManageTime"),
-                ("usr/sbin/cimconfig", "cimconfig", "VESKA_CIMServiceConfig")]:
+        for part, file, name, effect in [
+                ("reading", "sys/firmware/dmi/tables/DMI", "hardware tables", "VESKA_PhysicalPackage"),
+                ("reading", "etc/machine-id", "machine id", "unique identifier"),
+                ("reading", "etc/localtime", "time zone", "UTC"),
+                ("reading", "usr/sbin/cimconfig", "cimconfig", "VESKA_CIMServiceConfig"),
+                ("setting", "usr/sbin/cimconfig", "cimconfig", "SetCIMconfig"),
+                ("setting", "usr/share/zoneinfo/Etc/GMT", "time zones", "file of its own"),
+                ("setting", "bin/ps", "ps", "not running"), ("setting", "bin/ntpd", "ntpd", "ManageTime"),
+                ("setting", "etc/init.d/ntp", "/etc/init.d/ntp", "ManageTime")]:
             with self.subTest(file):
-                done = check(make_host(without=[file]))
+                done = check(make_host(without=[file]), part)
                 self.assertEqual(done.returncode, 1)
-                found = missing(done)
-                self.assertEqual(set(found) - self.RIGHTS, {name})
-                self.assertIn(effect, found[name]["without"])
+                self.assertEqual(set(missing(done)) - self.RIGHTS, {name})
+                self.assertIn(effect, missing(done, part)[name]["without"])
+
+    def test_ends_by_what_the_part_that_was_asked_for_lacks(self):
+        no_daemon, no_tables = make_host(without=["bin/ntpd"]), make_host(without=["sys/firmware/dmi/tables/DMI"])
+        self.assertEqual([check(no_daemon, *words).returncode for words in ([], ["reading"], ["setting"])], [0, 0, 1])
+        self.assertEqual([check(no_tables, *words).returncode for words in ([], ["reading"])], [1, 1])
+        done = check(no_tables, "setting")
+        self.assertEqual(done.returncode, 1 if set(missing(done)) & self.RIGHTS else 0)
+        self.assertIn("hardware tables", missing(done))
 
     def test_tells_a_file_without_use_from_one_that_is_there(self):
         root = make_host()
@@ -94,11 +104,31 @@ class Check(unittest.TestCase):
     def missing_for_nobody(self, root):
         """What is missing for a user without rights."""
         root.chmod(0o755)
-        done = run("setpriv", f"--reuid={NOBODY}", f"--regid={NOBODY}", "--clear-groups", "--inh-caps=-all", CHECK,
-                   "--root", root, "--format", "json", env={"PATH": "/bin:/usr/bin"})
-        if not done.stdout:
-            self.skipTest(f"the program cannot be run as another user here: {done.stderr}")
-        return missing(done)
+        return missing(run_as_nobody(CHECK, "--root", root, "--format", "json", env={"PATH": "/bin:/usr/bin"}))
+
+    @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
+    def test_passes_over_directories_in_path_that_may_not_be_entered(self):
+        root = make_host()
+        for name in ("closed", "gone/below"):
+            (root / name).mkdir(parents=True)
+            (root / name / "ntpd").write_bytes(b"")
+            (root / name / "ntpd").chmod(0o755)
+        (root / "closed").chmod(0o700)
+        (root / "gone").chmod(0o000)
+        path = "/closed:/gone/below::/nonexistent:/etc/machine-id:/bin"
+        root.chmod(0o755)
+        done = run_as_nobody(CHECK, "--root", root, "--format", "json", "reading", env={"PATH": path})
+        self.assertEqual((done.returncode, done.stderr), (0, ""))
+        found = {c["name"]: c["detail"] for c in json.loads(done.stdout)["checks"] if c["found"]}
+        self.assertEqual((found["ntpd"], found["ps"]), ("/bin/ntpd", "/bin/ps"))
+
+    @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
+    def test_a_root_that_may_not_be_entered_is_refused(self):
+        closed = directory()
+        (closed / "host").mkdir()
+        done = run_as_nobody(CHECK, "--root", closed / "host")
+        self.assertEqual(done.returncode, 2, done.stderr)
+        self.assertIn(f"vk-provider-check: {closed}/host: Permission denied\n", done.stderr)
 
     @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
     def test_knows_what_a_user_without_rights_cannot_do(self):
@@ -133,12 +163,17 @@ class Check(unittest.TestCase):
 
     def test_prints_for_people(self):
         done = run(CHECK, "--root", make_host(without=["bin/ntpd"]), env={"PATH": "/bin"})
+        self.assertEqual(re.findall(r"(?m)^For (.*):$", done.stdout), ["reading", "setting"])
+        self.assertLess(done.stdout.index("machine id"), done.stdout.index("For setting:"))
         self.assertRegex(done.stdout, r"(?m)^MISSING  ntpd +not in PATH$")
         self.assertRegex(done.stdout, r"(?m)^found    ps +/bin/ps$")
         self.assertIn("without it: ManageTime", done.stdout)
 
     def test_refuses_unusable_arguments(self):
         self.assertEqual(run(CHECK, "--format", "xml").returncode, 2)
+        done = run(CHECK, "writing")
+        self.assertEqual(done.returncode, 2)
+        self.assertIn("reading,setting", done.stderr)
         self.assertEqual(run(CHECK, "--root", "/nonexistent").returncode, 2)
         self.assertIn("Example:", run(CHECK, "--help").stdout)
 

@@ -29,12 +29,17 @@ class Contents(unittest.TestCase):
                      "share/man/man1/vkcim.1", "share/man/man7/libvknabaseserverprofileprovider.7",
                      "share/man/man8/vk-provider-register.8", "share/man/man8/vk-provider-check.8",
                      "share/man/man8/vk-host-snapshot.8", "share/bash-completion/completions/vkcim",
+                     "share/bash-completion/completions/vk-provider-check",
+                     "share/bash-completion/completions/vk-host-snapshot",
                      "share/vk-baseserver/vk-baseserver.mof", "share/vk-baseserver/vk-baseserver-registration.mof",
                      "share/vk-baseserver/vk-baseserver.reg",
                      "share/vk-baseserver/examples/rack-server.json",
                      "share/doc/vk-baseserver-tools/vkcim.schema.json",
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
         expected += [f"share/vk-baseserver/register/{path.name}" for path in (SOURCE / "tools/register").glob("*.py")]
+        expected += [f"lib/pkgconfig/{name}.pc" for name in LIBRARIES[:-1] + ["vk-cmpi"]]
+        expected += [f"lib/cmake/vk-baseserver/vk-baseserver-config{part}.cmake"
+                     for part in ("", "-relwithdebinfo", "-version")]
         headers = (SOURCE / "platform/include").rglob("*.h")
         expected += [f"include/vk-baseserver/{h.relative_to(SOURCE / 'platform/include')}" for h in headers]
         self.assertEqual([str(p.relative_to(PREFIX)) for p in files_below(PREFIX)], sorted(expected))
@@ -171,6 +176,32 @@ class Completion(unittest.TestCase):
                          {"VESKA_TimeService", "VESKA_TimeServiceAffectsElement"})
 
 
-if __name__ == "__main__":
+class ToolCompletion(unittest.TestCase):
+    """Of the administrators' programs."""
 
+    def complete(self, program, *words, cwd="/"):
+        script = '. "$1"; shift; COMP_WORDS=("$@"); COMP_CWORD=$(($# - 1)); _vk_tools "$1"; printf "%s\\n" "${COMPREPLY[@]}"'
+        done = run("bash", "-c", script, "-", PREFIX / "share/bash-completion/completions" / program, program, *words, cwd=cwd)
+        self.assertEqual(done.stderr, "")
+        return set(done.stdout.split())
+
+    def test_knows_the_options_of_each_program(self):
+        for program in ("vk-provider-check", "vk-host-snapshot"):
+            text = run(PREFIX / "sbin" / program, "--help").stdout
+            options = set(re.findall(r"(?m)^ +(?:-\w,)?(--[a-z-]+)", text))
+            self.assertGreater(len(options), 3)
+            self.assertEqual(self.complete(program, "--"), options)
+
+    def test_knows_what_they_are_asked_for(self):
+        self.assertEqual(self.complete("vk-provider-check", "s"), {"setting"})
+        self.assertEqual(self.complete("vk-provider-check", "--format", ""), {"text", "json"})
+        self.assertEqual(self.complete("vk-provider-check", "--format", "=", "j"), {"json"})
+        place = directory()
+        (place / "snapshots").mkdir()
+        (place / "some-file").write_bytes(b"")
+        for words in (["s"], ["--root", "s"]):
+            self.assertEqual(self.complete("vk-host-snapshot", *words, cwd=place), {"snapshots"})
+
+
+if __name__ == "__main__":
     unittest.main()

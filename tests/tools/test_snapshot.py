@@ -6,13 +6,13 @@ import shutil
 import unittest
 
 from hosts import SNAPSHOT, make_host, properties, take
-from support import directory, run, snapshot_of
+from support import NOBODY, directory, run, run_as_nobody, snapshot_of
 
 
 class Plain(unittest.TestCase):
     def test_copies_what_the_provider_reads(self):
         root = make_host()
-        target, done = take(root)
+        target, done = take(root, "--with-serials")
         self.assertEqual(done.returncode, 0, done.stderr)
         for name in ("sys/firmware/dmi/tables/DMI", "sys/firmware/dmi/tables/smbios_entry_point", "etc/machine-id",
                      "sys/class/dmi/id/product_uuid", "etc/hostname", "usr/share/zoneinfo/Europe/Berlin",
@@ -24,7 +24,7 @@ class Plain(unittest.TestCase):
 
     def test_tells_the_same_as_the_host(self):
         root = make_host()
-        target, _ = take(root)
+        target, _ = take(root, "--with-serials")
         for name in ("VESKA_ComputerSystem", "VESKA_PhysicalPackage"):
             self.assertEqual(properties(target, name), properties(root, name))
 
@@ -32,21 +32,28 @@ class Plain(unittest.TestCase):
         target, _ = take(make_host(**{"proc/sys/kernel/arch": b"s390x\n"}))
         self.assertEqual((target / "proc/sys/kernel/arch").read_bytes(), b"s390x\n")
 
-    def test_a_directory_that_holds_something_is_refused(self):
-        root = make_host()
-        self.assertEqual(run(SNAPSHOT, "--root", root, root).returncode, 2)
+    def test_a_call_without_a_directory_is_refused(self):
         self.assertEqual(run(SNAPSHOT).returncode, 2)
+
+    def test_says_whether_serial_numbers_are_in_it(self):
+        for words, said in [([], ", masked"), (["--mask"], ", masked"),
+                            (["--with-serials"], ", NOT masked: with serial numbers, UUIDs and the machine id")]:
+            target, done = take(make_host(), *words)
+            self.assertRegex(done.stdout, rf"^\d+ files in {target}{said}\n$")
+
+    def test_both_ways_at_once_are_refused(self):
+        target, done = take(make_host(), "--mask", "--with-serials")
+        self.assertEqual((done.returncode, target.exists()), (2, False))
+        self.assertIn("--mask and --with-serials exclude each other", done.stderr)
 
     @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
     def test_what_cannot_be_read_is_named(self):
         root = make_host()
         root.chmod(0o755)
         target = directory()
-        os.chown(target, 65534, 65534)
+        os.chown(target, NOBODY, NOBODY)
         (root / "sys/firmware/dmi/tables/DMI").chmod(0o400)
-        done = run("setpriv", "--reuid=65534", "--regid=65534", "--clear-groups", SNAPSHOT, "--root", root, target)
-        if "vk-host-snapshot" not in done.stderr:
-            self.skipTest(f"the program cannot be run as another user here: {done.stderr}")
+        done = run_as_nobody(SNAPSHOT, "--root", root, target)
         self.assertEqual(done.returncode, 1)
         self.assertIn("/sys/firmware/dmi/tables/DMI: Permission denied", done.stderr)
 
@@ -60,19 +67,58 @@ class Directory(unittest.TestCase):
         for text in said:
             self.assertIn(text, done.stderr)
 
-    @unittest.skipIf(os.geteuid() != 0, "takes root to give a directory to somebody else")
-    def test_somebody_elses_is_refused(self):
-        target = directory()
-        os.chown(target, 65534, 65534)
-        self.refused(target, f"{target} belongs to somebody else")
-        self.assertEqual(list(target.iterdir()), [])
+    def made_below(self, target, done):
+        """The one directory below that was made for the snapshot, which is closed to others and named."""
+        self.assertEqual((done.returncode, done.stderr), (0, ""))
+        [made] = [p for p in target.iterdir() if p.name.startswith("vk-host-snapshot-")]
+        self.assertIn(f" files in {made}, masked\n", done.stdout)
+        self.assertEqual(made.stat().st_mode & 0o777, 0o700)
+        self.assertTrue((made / "etc/machine-id").exists())
+        return made
 
-    def test_one_open_to_others_is_refused(self):
-        for mode in (0o755, 0o750, 0o701, 0o733):
+    def test_below_one_that_others_use_a_new_one_is_made(self):
+        for mode in (0o755, 0o750, 0o701, 0o733, 0o1777):
             target = directory()
             target.chmod(mode)
-            self.refused(target, f"{target} is open to others", "chmod 700")
-            self.assertEqual((list(target.iterdir()), target.stat().st_mode & 0o777), ([], mode))
+            (target / "theirs").mkdir()
+            self.made_below(target, run(SNAPSHOT, "--root", make_host(), target))
+            self.assertEqual(target.stat().st_mode & 0o7777, mode)
+            self.assertEqual((len(list(target.iterdir())), list((target / "theirs").iterdir())), (2, []))
+
+    def test_two_below_the_same_do_not_meet(self):
+        target = directory()
+        target.chmod(0o1777)
+        for _ in range(2):
+            done = run(SNAPSHOT, "--root", make_host(), f"{target}/")
+            self.assertEqual(done.returncode, 0, done.stderr)
+        self.assertEqual(len(list(target.iterdir())), 2)
+
+    @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
+    def test_below_somebody_elses_a_new_one_is_made_where_that_is_allowed(self):
+        root = make_host()
+        root.chmod(0o755)
+        shared = directory()
+        shared.chmod(0o1777)
+        made = self.made_below(shared, run_as_nobody(SNAPSHOT, "--root", root, shared))
+        self.assertEqual(made.stat().st_uid, NOBODY)
+        closed = directory()
+        closed.chmod(0o755)
+        done = run_as_nobody(SNAPSHOT, "--root", root, closed)
+        self.assertEqual((done.returncode, list(closed.iterdir())), (2, []))
+        self.assertIn(f"vk-host-snapshot: {closed}: Permission denied\n", done.stderr)
+
+    def test_one_of_its_own_that_holds_something_is_refused(self):
+        target = directory()
+        (target / "something").write_bytes(b"")
+        self.refused(target, f"{target} is not empty: name one in it that is not there yet")
+        self.assertEqual([p.name for p in target.iterdir()], ["something"])
+
+    def test_never_advises_to_close_a_directory(self):
+        target = directory()
+        target.chmod(0o1777)
+        done = run(SNAPSHOT, "--root", make_host(), target)
+        for text in (done.stdout, done.stderr, run(SNAPSHOT, "--help").stdout):
+            self.assertNotIn("chmod", text)
 
     def test_a_link_is_refused(self):
         elsewhere, link = directory(), directory() / "link"
@@ -123,7 +169,12 @@ class Failure(unittest.TestCase):
                 self.assertEqual(snapshot_of(parent.parent if parent.name == "deep" else parent), before)
 
     def test_a_write_error_leaves_a_directory_that_was_there(self):
+        for mode in (0o700, 0o755):
+            self.leaves_as_it_was(mode)
+
+    def leaves_as_it_was(self, mode):
         target = directory()
+        target.chmod(mode)
         done = run(SNAPSHOT, "--root", make_host(), target,
                    preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_FSIZE, (0, 0)))
         self.assertEqual((done.returncode, list(target.iterdir())), (1, []))

@@ -1,4 +1,4 @@
-"""vk-host-snapshot --mask: a masked copy gives the same answers but for what names the machine."""
+"""vk-host-snapshot masks: a copy gives the same answers but for what names the machine."""
 
 import os
 import struct
@@ -12,7 +12,7 @@ class Masked(unittest.TestCase):
                str(SYSTEM_UUID).encode(), str(SYSTEM_UUID).upper().encode(), b"0123456789abcdef0123456789abcdef"]
 
     def test_holds_nothing_that_names_the_machine(self):
-        target, done = take(make_host(), "--mask")
+        target, done = take(make_host())
         self.assertEqual(done.returncode, 0, done.stderr)
         for path in target.rglob("*"):
             if path.is_file():
@@ -21,7 +21,7 @@ class Masked(unittest.TestCase):
 
     def test_keeps_lengths_shapes_and_checksums(self):
         root = make_host()
-        target, _ = take(root, "--mask")
+        target, _ = take(root)
         directory_of_tables = "sys/firmware/dmi/tables"
         before, after = ((r / directory_of_tables / "DMI").read_bytes() for r in (root, target))
         self.assertEqual(len(before), len(after))
@@ -32,7 +32,7 @@ class Masked(unittest.TestCase):
 
     def test_tells_the_same_but_for_serial_numbers_and_uuids(self):
         root = make_host()
-        target, _ = take(root, "--mask")
+        target, _ = take(root)
         for name, changed in [("VESKA_ComputerSystem", {"UUID", "OtherIdentifyingInfo"}),
                               ("VESKA_PhysicalPackage", {"Tag", "SerialNumber"})]:
             before, after = properties(root, name), properties(target, name)
@@ -41,7 +41,7 @@ class Masked(unittest.TestCase):
 
     def test_masks_the_same_by_the_same_in_every_source(self):
         for version, data in [((2, 7), table()), ((2, 5), table(uuid_bytes=SYSTEM_UUID.bytes))]:
-            target, _ = take(make_host(data, version), "--mask")
+            target, _ = take(make_host(data, version))
             told = properties(target, "VESKA_ComputerSystem")["UUID"]
             in_file = (target / "sys/class/dmi/id/product_uuid").read_text(encoding="ascii").strip()
             self.assertEqual(in_file, told.upper(), version)
@@ -51,7 +51,7 @@ class Masked(unittest.TestCase):
     def test_leaves_what_says_nothing(self):
         data = table(chassis_serial="To Be Filled By O.E.M.", system_serial="0123456789", uuid_bytes=b"\xff" * 16)
         root = make_host(data, **{"sys/class/dmi/id/product_serial": b"0123456789\n"})
-        target, _ = take(root, "--mask")
+        target, _ = take(root)
         told = properties(target, "VESKA_PhysicalPackage")
         self.assertNotIn("SerialNumber", told)
         copy = (target / "sys/firmware/dmi/tables/DMI").read_bytes()
@@ -62,7 +62,7 @@ class Masked(unittest.TestCase):
     def test_survives_damaged_tables(self):
         whole = table()
         for cut in range(0, len(whole), 7):
-            target, done = take(make_host(whole[:cut]), "--mask")
+            target, done = take(make_host(whole[:cut]))
             self.assertEqual(done.returncode, 0, done.stderr)
             self.assertEqual((target / "sys/firmware/dmi/tables/DMI").stat().st_size, cut)
 
@@ -79,7 +79,7 @@ class Tables(unittest.TestCase):
     def masked(self, data):
         """The masked copy of a table. The provider must answer the same from it, but for serial numbers and UUID."""
         root = make_host(data)
-        target, done = take(root, "--mask")
+        target, done = take(root)
         self.assertEqual(done.returncode, 0, done.stderr)
         for name, own in [("VESKA_ComputerSystem", {"UUID", "OtherIdentifyingInfo"}),
                           ("VESKA_PhysicalPackage", {"Tag", "SerialNumber"})]:
@@ -193,7 +193,7 @@ class Tables(unittest.TestCase):
 
 class Texts(unittest.TestCase):
     def of_file(self, name, content):
-        target, done = take(make_host(**{name: content}), "--mask")
+        target, done = take(make_host(**{name: content}))
         self.assertEqual(done.returncode, 0, done.stderr)
         return (target / name).read_bytes()
 
@@ -206,7 +206,7 @@ class Texts(unittest.TestCase):
             secret = serial.split()[-1]
             self.assertNotIn(secret, masked)
             root = make_host(table(chassis_serial=serial))
-            target, _ = take(root, "--mask")
+            target, _ = take(root)
             told = [properties(r, "VESKA_PhysicalPackage")["SerialNumber"] for r in (root, target)]
             self.assertEqual(told[0], serial)
             self.assertNotIn(secret, told[1])
@@ -223,7 +223,7 @@ class Texts(unittest.TestCase):
         text = "To be filled by O.E.M. SN-778899"
         root = make_host(table(text, "None"))
         (root / "sys/class/dmi/id/product_serial").unlink()
-        target, _ = take(root, "--mask")
+        target, _ = take(root)
         copy = (target / "sys/firmware/dmi/tables/DMI").read_bytes()
         self.assertNotIn(b"778899", copy)
         for each in (root, target):
@@ -246,7 +246,7 @@ class Texts(unittest.TestCase):
         root = make_host(**{"proc/sysinfo": text.encode(), "proc/device-tree/compatible": b"x AB1C7 00000000000AB1C7\0"})
         for name in ("sys/firmware/dmi/tables/DMI", "sys/class/dmi/id/product_serial"):
             (root / name).unlink()
-        target, done = take(root, "--mask")
+        target, done = take(root)
         self.assertEqual(done.returncode, 0, done.stderr)
         copy = (target / "proc/sysinfo").read_text(encoding="ascii")
         for secret in ("AB1C7", "PROD0815", "Payroll", "82038f2a", "2a7250be2076", "LINUX042", "ZSPECIAL", "acme",
@@ -273,7 +273,7 @@ class RealMachines(unittest.TestCase):
         for name in sorted(os.listdir(os.environ["VK_TEST_HOSTS"])):
             with self.subTest(name):
                 root = os.path.join(os.environ["VK_TEST_HOSTS"], name)
-                target, done = take(root, "--mask")
+                target, done = take(root)
                 self.assertEqual(done.returncode, 0, done.stderr)
                 for kind, own in [("VESKA_ComputerSystem", {"UUID", "OtherIdentifyingInfo"}),
                                   ("VESKA_PhysicalPackage", {"Tag", "SerialNumber"})]:

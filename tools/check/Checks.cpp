@@ -20,7 +20,7 @@ std::string withProblem(const std::string& file, const Problem& problem) {
 }
 
 Finding hardware(const Root& root) {
-    Finding finding{"hardware tables", true, VK::Host::tablesDirectory,
+    Finding finding{Part::Reading, "hardware tables", true, VK::Host::tablesDirectory,
                     "VESKA_PhysicalPackage and the computer's UUID, model and serial number come from elsewhere, are "
                     "incomplete, or are missing"};
     for (const std::string& table : {VK::Host::entryPointFile, VK::Host::tableFile}) {
@@ -38,43 +38,45 @@ Finding hardware(const Root& root) {
     return finding;
 }
 
-Finding readable(const Root& root, const std::string& name, const std::string& file, const std::string& without) {
+Finding readable(const Root& root, Part part, const std::string& name, const std::string& file,
+                 const std::string& without) {
     Problem problem = problemOf(root, file);
     if (!problem && isEmpty(root, file)) problem = "empty";
-    return {name, !problem, withProblem(file, problem), without};
+    return {part, name, !problem, withProblem(file, problem), without};
 }
 
 Finding timeZone(const Root& root) {
     Problem problem = problemOf(root, VK::Zone::localTimeFile);
     if (!problem && !root.read(VK::Zone::localTimeFile).text.starts_with("TZif")) problem = "no time zone file";
-    return {"time zone", !problem, withProblem(VK::Zone::localTimeFile, problem), "the host's zone counts as UTC"};
+    return {Part::Reading, "time zone", !problem, withProblem(VK::Zone::localTimeFile, problem),
+            "the host's zone counts as UTC"};
 }
 
 Finding command(const Root& root, const std::string& name, const std::string& without) {
     const std::optional<std::string> found = findCommand(root, name);
-    return {name, found.has_value(), found.value_or("not in PATH"), without};
+    return {Part::Setting, name, found.has_value(), found.value_or("not in PATH"), without};
 }
 
 Finding ntpService(const Root& root) {
     const std::string file = "/etc/init.d/ntp";
     const bool found = isProgram(root, file);
-    return {file, found, found ? file : file + " is not there or not executable",
+    return {Part::Setting, file, found, found ? file : file + " is not there or not executable",
             "ManageTime cannot stop and start a running NTP daemon, and fails"};
 }
 
-Finding cimconfig(const Root& root) {
+Finding cimconfig(const Root& root, Part part, const std::string& without) {
     const bool kvm = VK::Host::isKvmGuest(root, VK::Host::readHardware(root));
     const std::string file = VK::Host::commandDirectory(VK_ROOT_DIRECTORY, kvm) + "cimconfig";
     const bool found = isProgram(root, file);
-    return {"cimconfig", found,
+    return {part, "cimconfig", found,
             file + (kvm ? " (a KVM guest's place)" : "") +
                 (found ? "" : " is not there or not executable; see vk-provider-register(8)"),
-            "VESKA_CIMServiceConfig shows 0 for both settings, and SetCIMconfig fails"};
+            without};
 }
 
 Finding rightToSetClock() {
     const bool found = maySetClock();
-    return {"right to set the clock", found, found ? "CAP_SYS_TIME" : "CAP_SYS_TIME is missing",
+    return {Part::Setting, "right to set the clock", found, found ? "CAP_SYS_TIME" : "CAP_SYS_TIME is missing",
             "ManageTime cannot set the time"};
 }
 
@@ -84,25 +86,27 @@ Finding rightToChangeZone(const Root& root) {
     const bool etc = mayWriteIn(root, "/etc");
     const bool memory = mayWriteIn(root, VK::Zone::ZoneMemory::stateDirectory);
     const std::string closed = etc == memory ? both : etc ? VK::Zone::ZoneMemory::stateDirectory : "/etc";
-    return {"right to change the zone", etc && memory, closed + (etc && memory ? " can" : " cannot") + " be written",
+    return {Part::Setting, "right to change the zone", etc && memory,
+            closed + (etc && memory ? " can" : " cannot") + " be written",
             "ManageTime cannot set the time, and AutomaticDSTAdjustment cannot be changed"};
 }
 
 } // namespace
 
 std::vector<Finding> findings(const Root& root) {
-    return {
-        hardware(root),
-        readable(root, "machine id", "/etc/machine-id", "the host's unique identifier is made of its UUID, or missing"),
-        timeZone(root),
-        readable(root, "time zones", VK::Zone::zoneDirectory + "Etc/GMT",
-                 "an offset set by ManageTime becomes a file of its own, not a link to a zone that has a name"),
-        command(root, "ps", "the NTP daemon always counts as not running"),
-        command(root, "ntpd", "ManageTime sets the time and then fails, since the clock cannot be synchronised"),
-        ntpService(root),
-        cimconfig(root),
-        rightToSetClock(),
-        rightToChangeZone(root)};
+    return {hardware(root),
+            readable(root, Part::Reading, "machine id", "/etc/machine-id",
+                     "the host's unique identifier is made of its UUID, or missing"),
+            timeZone(root),
+            cimconfig(root, Part::Reading, "VESKA_CIMServiceConfig shows 0 for both settings"),
+            readable(root, Part::Setting, "time zones", VK::Zone::zoneDirectory + "Etc/GMT",
+                     "an offset set by ManageTime becomes a file of its own, not a link to a zone that has a name"),
+            command(root, "ps", "the NTP daemon always counts as not running"),
+            command(root, "ntpd", "ManageTime sets the time and then fails, since the clock cannot be synchronised"),
+            ntpService(root),
+            cimconfig(root, Part::Setting, "SetCIMconfig fails"),
+            rightToSetClock(),
+            rightToChangeZone(root)};
 }
 
 } // namespace check

@@ -7,8 +7,12 @@
 
 namespace check {
 
+/// What the provider needs a thing for: to say what the host is, or to change it.
+enum class Part { Reading, Setting };
+
 /// One thing outside the provider that its classes need.
 struct Finding {
+    Part part;
     std::string name;
     bool found;
     std::string detail;  ///< where it is, or why it is not there

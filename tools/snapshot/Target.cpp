@@ -3,6 +3,7 @@
 #include "logger/LogLine.h"
 
 #include <cerrno>
+#include <cstdlib>
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -14,6 +15,7 @@ namespace fs = std::filesystem;
 namespace {
 
 constexpr mode_t closedDirectory = 0700;
+constexpr mode_t forOthers = 077;
 constexpr mode_t closedFile = 0600;
 
 /// A final slash would follow a link.
@@ -32,6 +34,13 @@ VK::FileDescriptor openDirectory(int at, const std::string& name) {
     return VK::FileDescriptor(openat(at, name.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
 }
 
+/// A link is not followed: it may be somebody else's.
+bool othersUse(const fs::path& directory) {
+    struct stat status {};
+    return lstat(directory.c_str(), &status) == 0 && S_ISDIR(status.st_mode) &&
+           (status.st_uid != geteuid() || (status.st_mode & forOthers) != 0);
+}
+
 bool writeAll(int fd, std::string_view bytes) {
     while (!bytes.empty()) {
         const ssize_t count = ::write(fd, bytes.data(), bytes.size());
@@ -48,6 +57,7 @@ Failure::Failure(const fs::path& path, int error) : std::runtime_error(path.stri
 Target::Target(const fs::path& directory) : path(withoutFinalSlash(directory)) {
     try {
         makeMissing(path);
+        if (othersUse(path)) makeOwnBelow();
         openItself();
     } catch (const Failure&) {
         removeMade();
@@ -63,15 +73,25 @@ void Target::makeMissing(const fs::path& directory) {
     made.push_back(directory);
 }
 
-/// Nobody else may have put anything there, be able to do so, or be able to read it.
+/// Under a name that nobody can have taken before.
+void Target::makeOwnBelow() {
+    std::string own = path / "vk-host-snapshot-XXXXXX";
+    if (mkdtemp(own.data()) == nullptr) throw Failure(path, errno);
+    path = own;
+    made.push_back(path);
+}
+
+/// Nobody else may have put anything there, be able to do so, or be able to read it: in a directory that others use,
+/// they may have put another in place of the one made.
 void Target::openItself() {
     VK::FileDescriptor fd = openDirectory(AT_FDCWD, path);
     struct stat status {};
     if (!fd || fstat(fd.get(), &status) != 0) throw Failure(path, errno);
-    if (status.st_uid != geteuid()) throw Failure(path.string() + " belongs to somebody else");
-    if ((status.st_mode & 077) != 0) throw Failure(path.string() + " is open to others: chmod 700 closes it");
+    if (status.st_uid != geteuid() || (status.st_mode & forOthers) != 0)
+        throw Failure(path.string() + " is somebody else's");
     std::error_code error;
-    if (!fs::is_empty(path, error) || error) throw Failure(path.string() + " is not empty");
+    if (!fs::is_empty(path, error) || error)
+        throw Failure(path.string() + " is not empty: name one in it that is not there yet");
     directories.emplace(std::string(), std::move(fd));
 }
 

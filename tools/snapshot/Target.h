@@ -21,8 +21,8 @@ public:
 /// The directory of a snapshot: no path is followed below it that this run did not make.
 class Target {
 public:
-    /// Makes the directory where it is missing. One that exists must be empty, its user's own and closed to others.
-    /// Nothing is left of it where that fails.
+    /// Makes the directory where it is missing. One that exists is taken if it is empty, its user's own and closed to
+    /// others. Below one that others use a new one is made. Nothing is left of it where that fails.
     explicit Target(const std::filesystem::path& directory);
 
     void write(const std::string& name, std::string_view bytes);
@@ -36,6 +36,7 @@ public:
 private:
     void openItself();
     void makeMissing(const std::filesystem::path& directory);
+    void makeOwnBelow();
     bool removeMade();
     int open(const std::string& directory, const std::string& forName);
     [[noreturn]] void fail(const std::string& name) const;
