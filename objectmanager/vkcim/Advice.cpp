@@ -1,6 +1,6 @@
 #include "objectmanager/vkcim/Advice.h"
 
-#include "objectmanager/vkcim/Names.h"
+#include "objectmanager/vkcim/SchemaText.h"
 #include "objectmanager/vkcim/Suggestion.h"
 
 #include <fmt/format.h>
@@ -64,18 +64,12 @@ void remarkOnMethod(const om::Request& request, const om::ClassDeclaration& decl
     }
 }
 
-std::string parameterText(const om::ParameterDeclaration& parameter) {
-    const std::string to = parameter.referenceClass.empty() ? "" : " to " + parameter.referenceClass;
-    const char* way = !parameter.out ? "in" : parameter.in ? "in and out" : "out";
-    return fmt::format("{} ({}{}, {})", parameter.name, typeName(parameter.type), to, way);
-}
-
 /// The parameters of the method that was called, with their types, and which of them were not given.
 std::vector<std::string> adviceOnArguments(const om::Request& request, const om::MethodDeclaration& method) {
     std::vector<std::string> all;
     std::vector<std::string> missing;
     for (const om::ParameterDeclaration& parameter : method.parameters) {
-        all.push_back(parameterText(parameter));
+        all.push_back(fmt::format("{} ({})", parameter.name, parameterText(parameter)));
         if (parameter.in && !om::findValue(request.values, parameter.name)) missing.push_back(parameter.name);
     }
     std::vector<std::string> advice = {fmt::format("{} takes {}", method.name, fmt::join(all, ", "))};

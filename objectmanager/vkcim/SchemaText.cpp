@@ -39,16 +39,12 @@ std::string propertyText(const om::PropertyDeclaration& property) {
            explanation(property.qualifiers, "      ");
 }
 
-std::string parameterText(const om::ParameterDeclaration& parameter) {
-    const char* way = !parameter.out ? "in" : parameter.in ? "in and out" : "out";
-    return fmt::format("    {}: {}, {}\n", parameter.name, typeText(parameter), way) +
-           explanation(parameter.qualifiers, "      ");
-}
-
 std::string methodText(const om::MethodDeclaration& method) {
     std::string text = fmt::format("  {}(): {}\n", method.name, typeName(method.returnType)) +
                        explanation(method.qualifiers, "      ");
-    for (const om::ParameterDeclaration& parameter : method.parameters) text += parameterText(parameter);
+    for (const om::ParameterDeclaration& parameter : method.parameters)
+        text += fmt::format("    {}: {}\n", parameter.name, parameterText(parameter)) +
+                explanation(parameter.qualifiers, "      ");
     return text;
 }
 
@@ -78,6 +74,11 @@ std::string derived(const om::ClassDeclaration& declared, const om::Schema& sche
 }
 
 } // namespace
+
+std::string parameterText(const om::ParameterDeclaration& parameter) {
+    const char* direction = !parameter.out ? "in" : parameter.in ? "in and out" : "out";
+    return typeText(parameter) + ", " + direction;
+}
 
 std::string classesText(const om::Schema& schema) {
     const std::vector<std::string> names = schema.served();

@@ -7,6 +7,9 @@
 /// The schema for people to read.
 namespace vkcim {
 
+/// A parameter's type and direction: `boolean, in`.
+std::string parameterText(const om::ParameterDeclaration& parameter);
+
 /// A line for each class that a provider serves: name, kind and superclass.
 std::string classesText(const om::Schema& schema);
 
