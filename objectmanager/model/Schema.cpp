@@ -26,9 +26,7 @@ Schema::Schema(std::vector<ClassDeclaration> classes) : classes_(std::move(class
 }
 
 void Schema::inherit(ResolvedClass& resolved) const {
-    // The count bounds the walk, should a class be its own ancestor.
-    std::size_t left = classes_.size();
-    for (const ClassDeclaration* c = resolved.declaration; c != nullptr && left > 0; c = find(c->superclass), --left) {
+    for (const ClassDeclaration* c : line(resolved.declaration->name)) {
         for (const PropertyDeclaration& property : c->properties) {
             const bool nearest = resolved.properties.emplace(property.name, &property).second;
             if (nearest && property.key) resolved.keys.push_back(&property);
@@ -81,8 +79,22 @@ const MethodDeclaration* Schema::findMethod(std::string_view className, std::str
     return resolved == nullptr ? nullptr : resolved->findMethod(method);
 }
 
+std::vector<std::string_view> Schema::wordsFor(std::string_view className, const NamedValue& property) const {
+    const PropertyDeclaration* declared = findProperty(className, property.first);
+    return declared == nullptr ? std::vector<std::string_view>() : om::wordsFor(declared->qualifiers, property.second);
+}
+
+std::vector<const ClassDeclaration*> Schema::line(std::string_view className) const {
+    std::vector<const ClassDeclaration*> found;
+    // The count bounds the walk, should a class be its own ancestor.
+    for (const ClassDeclaration* c = find(className); c != nullptr && found.size() < classes_.size();
+         c = find(c->superclass))
+        found.push_back(c);
+    return found;
+}
+
 bool Schema::isA(std::string_view className, std::string_view ancestor) const {
-    std::size_t left = classes_.size();
+    std::size_t left = classes_.size(); // without a list: providers ask this in every request
     for (const ClassDeclaration* c = find(className); c != nullptr && left > 0; c = find(c->superclass), --left) {
         if (sameName(c->name, ancestor)) return true;
     }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "objectmanager/model/Names.h"
+#include "objectmanager/model/Qualifiers.h"
 
 #include <cmpidt.h>
 
@@ -17,6 +18,7 @@ struct PropertyDeclaration {
     CMPIType type = CMPI_null; ///< with CMPI_ARRAY for arrays
     bool key = false;
     std::string referenceClass = {}; ///< for CMPI_ref only
+    Qualifiers qualifiers = {};
 };
 
 struct ParameterDeclaration : PropertyDeclaration {
@@ -28,6 +30,7 @@ struct MethodDeclaration {
     std::string name;
     CMPIType returnType = CMPI_null;
     std::vector<ParameterDeclaration> parameters;
+    Qualifiers qualifiers = {};
 };
 
 struct ClassDeclaration {
@@ -36,6 +39,7 @@ struct ClassDeclaration {
     bool association = false;
     std::vector<PropertyDeclaration> properties; ///< its own, without inherited ones
     std::vector<MethodDeclaration> methods;
+    Qualifiers qualifiers = {};
 };
 
 /// A class with all that it inherits, for look-ups by name.
@@ -74,6 +78,10 @@ public:
     const ResolvedClass* resolve(std::string_view className) const;
     const PropertyDeclaration* findProperty(std::string_view className, std::string_view property) const;
     const MethodDeclaration* findMethod(std::string_view className, std::string_view method) const;
+    /// The words that a class's declaration has for a property's value (om::wordsFor).
+    std::vector<std::string_view> wordsFor(std::string_view className, const NamedValue& property) const;
+    /// A class and its superclasses, nearest first; empty for an unknown class.
+    std::vector<const ClassDeclaration*> line(std::string_view className) const;
     /// Whether `className` is `ancestor` or derives from it; false for unknown classes.
     bool isA(std::string_view className, std::string_view ancestor) const;
 

@@ -1,8 +1,9 @@
 #include "objectmanager/vkcim/Arguments.h"
 
-#include "objectmanager/vkcim/Commands.h"
 #include "objectmanager/vkcim/FaultText.h"
 #include "objectmanager/vkcim/PathText.h"
+#include "objectmanager/vkcim/Suggestion.h"
+#include "objectmanager/vkcim/Utf8.h"
 
 #include <CLI/CLI.hpp>
 
@@ -45,11 +46,23 @@ std::vector<std::string> splitEmpty(const std::vector<std::string>& words) {
     return split;
 }
 
+std::vector<std::string> commandNames() {
+    std::vector<std::string> names;
+    for (const Command& command : commands) names.emplace_back(command.name);
+    return names;
+}
+
+const Command* findCommand(const std::string& name) {
+    const auto* found =
+        std::find_if(std::begin(commands), std::end(commands), [&](const Command& each) { return name == each.name; });
+    return found == std::end(commands) ? nullptr : found;
+}
+
 class CommandLine {
 public:
     CommandLine() : app("Asks a CMPI provider library and prints what it answers.", "vkcim") {
-        app.set_version_flag("--version", "vkcim " VKCIM_VERSION, "Print the version and exit");
-        app.set_help_flag("--help", "Print this and exit");
+        app.set_version_flag("-V,--version", "vkcim " VKCIM_VERSION, "Print the version and exit");
+        app.set_help_flag("-h,--help", "Print this and exit");
         app.require_subcommand(1, 1);
         app.fallthrough();
         app.get_formatter()->label("SUBCOMMAND", "COMMAND");
@@ -57,8 +70,9 @@ public:
         app.footer(
             "PATH is a class name or CLASS.KEY=\"TEXT\",KEY=NUMBER; - reads it from the first line of standard input.\n"
             "VALUE is TYPE:TEXT, null:TYPE, or TEXT alone with the type that the schema declares.\n"
-            "'vkcim COMMAND --help' shows an example. Exit status: 0 done, 1 the provider answered an\n"
-            "error, 2 unusable arguments, 3 the provider library cannot be used.");
+            "'vkcim help COMMAND' shows an example. Exit status: 0 done; 1 the provider answered an error; 2 unusable "
+            "arguments; 3 the provider library cannot be used; 4 nothing was found or changed, or the host cannot be "
+            "read.");
         addOptions();
         for (const Command& command : commands) addCommand(command);
     }
@@ -69,17 +83,23 @@ public:
             // CLI11 takes them from the back.
             app.parse(std::vector<std::string>(words.rbegin(), words.rend()));
             finish();
+            if (arguments.command->action == Action::Help) return {{}, 0, CommandLine().help(arguments.subject), {}};
             return {std::move(arguments), 0, {}, {}};
         } catch (const CLI::Success& success) { // --help and --version
             std::ostringstream output;
             app.exit(success, output, output);
             return {std::nullopt, 0, output.str(), {}};
         } catch (const CLI::Error& error) {
-            return {std::nullopt, unusable, {}, "vkcim: " + explain(error) + "\nTry 'vkcim --help'.\n"};
+            return {std::nullopt, unusable, {}, "vkcim: " + shortened(explain(error)) + "\nTry 'vkcim --help'.\n"};
         }
     }
 
 private:
+    /// The help on a command, or on the program for an empty name; of a command line that has parsed nothing yet.
+    std::string help(const std::string& command) const {
+        return command.empty() ? app.help() : app.get_subcommand(command)->help(app.get_name());
+    }
+
     void addOptions() {
         const CLI::Validator notEmpty([](const std::string& text) { return text.empty() ? "is empty" : ""; }, "");
         app.add_option("--library", arguments.library, "Provider library (the one beside vkcim)")
@@ -112,33 +132,49 @@ private:
                       ->capture_default_str()
                       ->type_name("T")
                       ->check(CLI::Range(std::size_t{1}, mostThreads).description(""));
-        app.add_flag("--timing", arguments.timing, "Print how long the runs took, as JSON on standard error");
+        timing = app.add_flag("--timing", arguments.timing, "Print how long the runs took, as JSON on standard error");
+        verbose =
+            app.add_flag("--verbose", arguments.verbose, "For report: show what commands print on standard error");
+        dryRun = app.add_flag("--dry-run", arguments.dryRun,
+                              "For modify and invoke: say what would be asked of which host, and do not ask");
         addFaults();
     }
 
     void addFaults() {
-        fault =
-            app.add_option("--fault", faultText,
-                           "Let the N-th call of a broker operation fail in each run; N+ lets all from the N-th on\n"
-                           "fail, and :null behind it leaves the status OK")
-                ->type_name("KIND:N");
+        fault = app.add_option("--fault", faultText,
+                               "Let the N-th call of a broker operation fail in each run; N+ lets all from the N-th on "
+                               "fail, and :null behind it leaves the status OK")
+                    ->type_name("KIND:N");
         app.add_flag_callback(
             "--list-faults", [] { throw CLI::CallForVersion(faultList(), 0); }, "Print every KIND and exit");
     }
 
+    std::vector<std::string> optionNames() const {
+        std::vector<std::string> names;
+        for (const CLI::Option* option : app.get_options()) names.push_back(option->get_name());
+        return names;
+    }
+
     std::string explain(const CLI::Error& error) const {
+        for (const std::string& word : app.remaining(true)) {
+            if (word.size() > 1 && word.front() == '-')
+                return "there is no option '" + word + "'" + didYouMean(nearestName(word, optionNames()));
+        }
         if (!app.get_subcommands().empty() ||
             error.get_exit_code() != static_cast<int>(CLI::ExitCodes::RequiredError)) {
             return error.what();
         }
         const std::vector<std::string> unknown = app.remaining();
-        return unknown.empty() ? "a command is missing" : "there is no command or option '" + unknown.front() + "'";
+        if (unknown.empty()) return "a command is missing";
+        return "there is no command '" + unknown.front() + "'" +
+               didYouMean(nearestName(unknown.front(), commandNames()));
     }
 
     void addCommand(const Command& command) {
         CLI::App* sub = app.add_subcommand(command.name, command.about);
         sub->group("Commands");
-        sub->footer(std::string("Example:\n  ") + command.example + "\nOptions of every command: vkcim --help");
+        const std::string warning = *command.warning ? command.warning + std::string("\n\n") : "";
+        sub->footer(warning + "Example:\n  " + command.example + "\nOptions of every command: vkcim --help");
         const auto add = [&](const char* name, auto& text, bool required, const char* about) {
             sub->add_option(name, text, about)->required(required)->type_name("");
         };
@@ -146,7 +182,8 @@ private:
         if (command.takes == Takes::Path)
             add("PATH", arguments.subject, true, "Path; - reads it from the first line of standard input");
         if (command.takes == Takes::Query) add("TEXT", arguments.subject, true, "The query");
-        if (command.method) add("METHOD", arguments.method, true, "Name of the method");
+        if (command.takes == Takes::Command) add("COMMAND", arguments.subject, false, "Name of a command");
+        if (command.member) add(command.member, arguments.member, true, "Its name");
         if (command.assignments) {
             add("NAME=VALUE", arguments.assignments, command.needsAssignments,
                 "Names and values, as many as there are");
@@ -155,14 +192,10 @@ private:
 
     void finish() {
         const std::string name = app.get_subcommands().front()->get_name();
-        const auto* command = std::find_if(std::begin(commands), std::end(commands),
-                                           [&](const Command& each) { return name == each.name; });
-        arguments.operation = command->operation;
+        arguments.command = findCommand(name);
         arguments.format = formats.at(formatName);
         if (properties) arguments.properties = splitNames(*properties);
-        if (!command->operation && repeat->count() + threads->count() + fault->count() > 0) {
-            throw CLI::ValidationError("report", "--repeat, --threads and --fault do not go with it");
-        }
+        refuseMisplacedOptions();
         if (arguments.timing && arguments.repeat > mostTimes / arguments.threads) {
             throw CLI::ValidationError("--timing", "at most " + std::to_string(mostTimes) + " runs can be timed");
         }
@@ -170,9 +203,36 @@ private:
         if (const auto problem = nameSpaceProblem(arguments.nameSpace)) {
             throw CLI::ValidationError("--namespace", *problem);
         }
-        if (command->takes != Takes::Nothing && arguments.subject.empty()) {
+        if (arguments.command->takes == Takes::Command) return checkHelp();
+        if (arguments.command->takes != Takes::Nothing && arguments.subject.empty()) {
             throw CLI::ValidationError(name, "what it works on is empty");
         }
+    }
+
+    void checkHelp() const {
+        if (arguments.subject.empty() || findCommand(arguments.subject) != nullptr) return;
+        throw CLI::ValidationError("help", "there is no command '" + arguments.subject + "'" +
+                                               didYouMean(nearestName(arguments.subject, commandNames())));
+    }
+
+    /// Options that would be ignored might hide a mistake; a dry run above all.
+    void refuseMisplacedOptions() const {
+        const Command& command = *arguments.command;
+        const auto refuse = [&](bool fits, std::initializer_list<const CLI::Option*> options) {
+            for (const CLI::Option* option : options) {
+                if (!fits && option->count() > 0)
+                    throw CLI::ValidationError(command.name, option->get_name() + " does not go with it");
+            }
+        };
+        const bool operates = command.action == Action::Operate;
+        const bool answers = operates || command.action == Action::Report;
+        refuse(operates, {repeat, threads, fault});
+        refuse(answers, {timing});
+        refuse(command.action == Action::Report, {verbose});
+        refuse(command.operation == om::Operation::ModifyInstance || command.operation == om::Operation::InvokeMethod,
+               {dryRun});
+        if (arguments.format != Format::Text && (!answers || arguments.dryRun))
+            throw CLI::ValidationError(arguments.dryRun ? "--dry-run" : command.name, "its output is text alone");
     }
 
     om::Fault readFault() const {
@@ -191,6 +251,9 @@ private:
     CLI::Option* threads = nullptr;
     std::string faultText;
     CLI::Option* fault = nullptr;
+    CLI::Option* timing = nullptr;
+    CLI::Option* verbose = nullptr;
+    CLI::Option* dryRun = nullptr;
 };
 
 } // namespace

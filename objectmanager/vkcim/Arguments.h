@@ -1,6 +1,6 @@
 #pragma once
 
-#include "objectmanager/broker/ObjectManager.h"
+#include "objectmanager/vkcim/Commands.h"
 
 #include <cstddef>
 #include <optional>
@@ -13,9 +13,9 @@ enum class Format { Text, Mof, Json };
 
 /// What the user asked for, its texts not yet read.
 struct Arguments {
-    std::optional<om::Operation> operation; ///< none: `report`
-    std::string subject;                    ///< CLASS, PATH or TEXT
-    std::string method;
+    const Command* command = nullptr;     ///< never null in what was parsed
+    std::string subject;                  ///< CLASS, PATH or TEXT
+    std::string member;                   ///< METHOD or PROPERTY
     std::vector<std::string> assignments; ///< NAME=VALUE…
 
     std::string library; ///< empty: the default one
@@ -27,6 +27,8 @@ struct Arguments {
     std::size_t repeat = 1;
     std::size_t threads = 1;
     bool timing = false;
+    bool verbose = false;
+    bool dryRun = false;
     std::optional<om::Fault> fault;
 };
 

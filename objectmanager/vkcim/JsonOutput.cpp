@@ -34,7 +34,9 @@ public:
     }
 
     std::string report(const Report& report) const {
-        return object({member("classes", answers(report.classes)), member("associations", answers(report.associations)),
+        return object({member("host", string(report.host)), member("version", string(report.version)),
+                       member("time", string(report.time)), member("classes", answers(report.classes)),
+                       member("associations", answers(report.associations)),
                        member("notes", list(report.notes, [](const std::string& note) { return string(note); }))});
     }
 
@@ -66,8 +68,19 @@ private:
         return joined('{', values, '}', [this](const auto& each) { return member(each.first, typed(each.second)); });
     }
 
-    std::string typed(const om::Value& value) const {
-        return object({member("type", string(typeName(value.type))), member("value", bare(value))});
+    std::string typed(const om::Value& value, const std::vector<std::string_view>& words = {}) const {
+        std::vector<std::string> members = {member("type", string(typeName(value.type))), member("value", bare(value))};
+        if (!words.empty())
+            members.push_back(member("words", list(words, [](std::string_view word) {
+                                         return word.empty() ? std::string("null") : string(word);
+                                     })));
+        return object(members);
+    }
+
+    std::string properties(const om::Instance& instance) const {
+        return joined('{', instance.properties, '}', [&](const auto& each) {
+            return member(each.first, typed(each.second, schema.wordsFor(instance.path.className, each)));
+        });
     }
 
     std::string result(const std::variant<om::ObjectPath, om::Instance>& either) const {
@@ -75,9 +88,7 @@ private:
         return instance(std::get<om::Instance>(either));
     }
 
-    std::string instance(const om::Instance& instance) const {
-        return element(instance.path, named(instance.properties));
-    }
+    std::string instance(const om::Instance& instance) const { return element(instance.path, properties(instance)); }
 
     std::string element(const om::ObjectPath& path, const std::string& properties) const {
         return object({member("path", string(pathText(path, nameSpace, schema))),

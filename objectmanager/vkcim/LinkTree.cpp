@@ -9,7 +9,7 @@ namespace {
 
 class Drawing {
 public:
-    explicit Drawing(const std::vector<Link>& links) {
+    Drawing(const std::vector<Link>& links, const Look& wanted) : look(wanted) {
         std::set<std::string> below;
         for (const Link& link : links) {
             children[link.above].push_back(&link);
@@ -28,27 +28,41 @@ private:
     void drawFrom(const std::string& root) {
         if (drawn.count(root) != 0) return;
         lines.push_back(root);
-        drawBelow(root, "");
+        drawBelow(root, "", 0);
     }
 
-    void drawBelow(const std::string& thing, const std::string& indent) {
+    void drawBelow(const std::string& thing, const std::string& indent, std::size_t depth) {
         if (!drawn.insert(thing).second) return;
         const std::vector<const Link*>& mine = children[thing];
         for (const Link* link : mine) {
             const bool last = link == mine.back();
-            lines.push_back(indent + (last ? "└─ " : "├─ ") + link->below + "  (" + link->association + ')');
-            drawBelow(link->below, indent + (last ? "   " : "│  "));
+            const std::string below = indent + (last ? "   " : look.boxes ? "│  " : "|  ");
+            drawLink(*link, indent + branch(last), below, 3 * (depth + 1));
+            drawBelow(link->below, below, depth + 1);
         }
     }
 
+    const char* branch(bool last) const {
+        if (!look.boxes) return last ? "`- " : "|- ";
+        return last ? "└─ " : "├─ ";
+    }
+
+    void drawLink(const Link& link, const std::string& before, const std::string& below, std::size_t indent) {
+        const std::string association = "  (" + link.association + ')';
+        const bool fits = look.width == 0 || indent + link.below.size() + association.size() <= look.width;
+        lines.push_back(before + link.below + (fits ? association : ""));
+        if (!fits) lines.push_back(below + association);
+    }
+
+    const Look& look;
     std::map<std::string, std::vector<const Link*>> children;
     std::set<std::string> drawn;
 };
 
 } // namespace
 
-std::vector<std::string> drawLinks(const std::vector<Link>& links) {
-    return Drawing(links).lines;
+std::vector<std::string> drawLinks(const std::vector<Link>& links, const Look& look) {
+    return Drawing(links, look).lines;
 }
 
 } // namespace vkcim

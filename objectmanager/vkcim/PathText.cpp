@@ -1,8 +1,10 @@
 #include "objectmanager/vkcim/PathText.h"
 
 #include "objectmanager/vkcim/Characters.h"
+#include "objectmanager/vkcim/Names.h"
 #include "objectmanager/vkcim/NumberText.h"
 #include "objectmanager/vkcim/ParseError.h"
+#include "objectmanager/vkcim/Suggestion.h"
 
 #include <fmt/format.h>
 
@@ -19,10 +21,29 @@ bool isNameSpaceByte(char c) {
     return isNameByte(c) || c == '/' || c == '-';
 }
 
+/// The kind of key that a type is written as in a path: all integers are one.
+const char* kindOf(CMPIType type) {
+    switch (type) {
+    case CMPI_boolean:
+        return "TRUE or FALSE";
+    case CMPI_ref:
+        return "a path in quotes";
+    case CMPI_string:
+    case CMPI_chars:
+    case CMPI_dateTime:
+    case CMPI_real32:
+    case CMPI_real64:
+        return "text in quotes";
+    default:
+        return "a number";
+    }
+}
+
 class PathParser {
 public:
-    PathParser(const SourceText& source, const std::string& nameSpace, const om::Schema& knownClasses)
-        : text(source), schema(knownClasses) {
+    PathParser(const SourceText& source, const std::string& nameSpace, const om::Schema& knownClasses,
+               std::vector<std::string>* remarksOut)
+        : text(source), schema(knownClasses), remarks(remarksOut) {
         path.nameSpace = nameSpace;
     }
 
@@ -76,7 +97,26 @@ private:
         if (atEnd() || text[at] != '=') fail(at, fmt::format("'=' is missing after key {}", name));
         ++at;
         if (atEnd() || text[at] == ',') fail(at, fmt::format("key {} has no value", name));
+        const std::size_t value = at;
         path.keys.emplace_back(name, readValue(name));
+        const om::ResolvedClass* known = remarks != nullptr ? schema.resolve(path.className) : nullptr;
+        if (known != nullptr && !known->keys.empty()) check(*known, path.keys.back(), first, value);
+    }
+
+    void check(const om::ResolvedClass& known, const om::NamedValue& key, std::size_t first, std::size_t value) {
+        const om::PropertyDeclaration* declared = known.findProperty(key.first);
+        std::string remark;
+        if (declared == nullptr || !declared->key) {
+            std::vector<std::string> keys;
+            for (const om::PropertyDeclaration* each : known.keys) keys.push_back(each->name);
+            const auto nearest = nearestName(key.first, keys);
+            remark = fmt::format("{} has no key {}{}", known.declaration->name, key.first,
+                                 nearest ? didYouMean(nearest) : fmt::format("; its keys: {}", fmt::join(keys, ", ")));
+        } else if (std::string_view(kindOf(declared->type)) != kindOf(key.second.type)) {
+            first = value;
+            remark = fmt::format("key {} of {} is {}", declared->name, known.declaration->name, kindOf(declared->type));
+        }
+        if (!remark.empty()) remarks->push_back(ParseError(text.offsetOf(first), remark).what());
     }
 
     om::Value readValue(const std::string& key) {
@@ -93,7 +133,7 @@ private:
     }
 
     om::Value referenceTo(const SourceText& quoted) const {
-        return {CMPI_ref, std::make_shared<const om::ObjectPath>(parsePath(quoted, path.nameSpace, schema))};
+        return {CMPI_ref, std::make_shared<const om::ObjectPath>(parsePath(quoted, path.nameSpace, schema, remarks))};
     }
 
     SourceText readQuoted() {
@@ -133,6 +173,7 @@ private:
 
     const SourceText& text;
     const om::Schema& schema;
+    std::vector<std::string>* const remarks;
     std::size_t at = 0;
     om::ObjectPath path;
 };
@@ -174,12 +215,14 @@ std::optional<std::string> nameSpaceProblem(std::string_view name) {
     return std::nullopt;
 }
 
-om::ObjectPath parsePath(const SourceText& text, const std::string& nameSpace, const om::Schema& schema) {
-    return PathParser(text, nameSpace, schema).parse();
+om::ObjectPath parsePath(const SourceText& text, const std::string& nameSpace, const om::Schema& schema,
+                         std::vector<std::string>* remarks) {
+    return PathParser(text, nameSpace, schema, remarks).parse();
 }
 
-om::ObjectPath parsePath(std::string_view text, const std::string& nameSpace, const om::Schema& schema) {
-    return parsePath(SourceText(text), nameSpace, schema);
+om::ObjectPath parsePath(std::string_view text, const std::string& nameSpace, const om::Schema& schema,
+                         std::vector<std::string>* remarks) {
+    return parsePath(SourceText(text), nameSpace, schema, remarks);
 }
 
 std::string pathText(const om::ObjectPath& path, const std::string& nameSpace, const om::Schema& schema) {

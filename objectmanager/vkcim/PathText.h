@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// Paths as texts: `root/cimv2:VESKA_ComputerSystem.Name="node7",Index=3,Active=TRUE`.
 namespace vkcim {
@@ -14,9 +15,12 @@ namespace vkcim {
 /// Reads a path without host. A path that names no namespace, and each reference in it that names none, gets
 /// `nameSpace` or that of the path around it. The schema says which quoted keys are references; for a class or key
 /// that it lacks they are strings unless written `KEY=ref:"…"`. Integers are sint64, those above its range uint64.
-/// Throws ParseError.
-om::ObjectPath parsePath(std::string_view text, const std::string& nameSpace, const om::Schema& schema);
-om::ObjectPath parsePath(const SourceText& text, const std::string& nameSpace, const om::Schema& schema);
+/// Throws ParseError. What may be asked all the same goes to `remarks`, each with its place: keys that a class of the
+/// schema lacks, or has with another type.
+om::ObjectPath parsePath(std::string_view text, const std::string& nameSpace, const om::Schema& schema,
+                         std::vector<std::string>* remarks = nullptr);
+om::ObjectPath parsePath(const SourceText& text, const std::string& nameSpace, const om::Schema& schema,
+                         std::vector<std::string>* remarks = nullptr);
 
 /// Why no object can lie in a namespace of that name; nothing where one can.
 std::optional<std::string> nameSpaceProblem(std::string_view name);

@@ -1,11 +1,13 @@
 #include "objectmanager/vkcim/Report.h"
 
 #include "objectmanager/model/Names.h"
+#include "objectmanager/vkcim/HostNotes.h"
 #include "objectmanager/vkcim/PathText.h"
 
 #include <algorithm>
-
-#include <sys/utsname.h>
+#include <array>
+#include <ctime>
+#include <string_view>
 
 namespace vkcim {
 namespace {
@@ -18,11 +20,6 @@ struct Direction {
 
 constexpr Direction directions[] = {
     {"Antecedent", "Dependent"}, {"ManagedElement", "Capabilities"}, {"AffectingElement", "AffectedElement"}};
-
-std::string kernelsHostName() {
-    utsname names{};
-    return uname(&names) == 0 ? names.nodename : "";
-}
 
 /// The name of the described host: of a snapshot or a simulated host it is not the kernel's. A provider that
 /// does not serve computer systems describes no other host: there it is the kernel's.
@@ -42,12 +39,30 @@ std::string hostName(const Report::Answers& classes) {
     return "without a name";
 }
 
+std::string timeNow() {
+    const std::time_t now = std::time(nullptr);
+    std::tm parts{};
+    gmtime_r(&now, &parts);
+    std::array<char, 32> text;
+    return {text.data(), std::strftime(text.data(), text.size(), "%Y-%m-%dT%H:%M:%SZ", &parts)};
+}
+
+om::ObjectPath withoutClassNames(om::ObjectPath path) {
+    constexpr std::string_view end = "CreationClassName";
+    const auto namesClass = [&](const om::NamedValue& key) {
+        const std::string_view name = key.first;
+        return name.size() >= end.size() && om::sameName(name.substr(name.size() - end.size()), end);
+    };
+    path.keys.erase(std::remove_if(path.keys.begin(), path.keys.end(), namesClass), path.keys.end());
+    return path;
+}
+
 std::string referenceText(const om::Instance& instance, const char* name, const std::string& nameSpace,
                           const om::Schema& schema) {
     for (const om::NamedValue& property : instance.properties) {
         if (!om::sameName(property.first, name)) continue;
         const auto* path = std::get_if<std::shared_ptr<const om::ObjectPath>>(&property.second.data);
-        if (path && *path) return qualifiedPathText(**path, nameSpace, schema);
+        if (path && *path) return qualifiedPathText(withoutClassNames(**path), nameSpace, schema);
     }
     return {};
 }
@@ -75,6 +90,8 @@ Report makeReport(const om::Schema& schema, const std::string& nameSpace,
     report.host = hostName(report.classes);
     report.associations = ask(schema.servedAssociations());
     report.notes = notes();
+    report.version = VKCIM_VERSION;
+    report.time = timeNow();
     return report;
 }
 

@@ -17,6 +17,8 @@ struct Report {
     Answers classes;
     Answers associations;
     std::vector<std::string> notes;
+    std::string version; ///< of this program
+    std::string time;    ///< of the end, in UTC: `2026-11-21T06:00:00Z`
 };
 
 /// Asks every class and then every association that the schema says is served for its instances. `run` runs one
@@ -33,7 +35,7 @@ struct Link {
     std::string association;
 };
 
-/// The associations among what was answered, each end as its path's text.
+/// The associations among what was answered, each end as its path's text without the keys that name a class only.
 std::vector<Link> links(const Report::Answers& associations, const std::string& nameSpace, const om::Schema& schema);
 
 } // namespace vkcim

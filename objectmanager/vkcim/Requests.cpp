@@ -1,7 +1,7 @@
 #include "objectmanager/vkcim/Requests.h"
 
+#include "objectmanager/vkcim/Advice.h"
 #include "objectmanager/vkcim/Characters.h"
-#include "objectmanager/vkcim/Commands.h"
 #include "objectmanager/vkcim/ParseError.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/ValueText.h"
@@ -12,12 +12,6 @@
 
 namespace vkcim {
 namespace {
-
-Takes taken(om::Operation operation) {
-    return std::find_if(std::begin(commands), std::end(commands),
-                        [&](const Command& each) { return each.operation == operation; })
-        ->takes;
-}
 
 std::string readLine(std::istream& input) {
     std::string line;
@@ -30,11 +24,17 @@ std::string readLine(std::istream& input) {
     return line;
 }
 
-om::ObjectPath readPath(const std::string& text, const Arguments& arguments, const om::Schema& schema) {
+/// Reads a text of the user and puts it before what is said of it.
+template <typename Read>
+auto readText(const std::string& what, std::vector<std::string>* remarks, const Read& read) {
+    std::vector<std::string> found;
     try {
-        return parsePath(text, arguments.nameSpace, schema);
+        auto result = read(&found);
+        for (const std::string& remark : found)
+            if (remarks != nullptr) remarks->push_back(what + ": " + remark);
+        return result;
     } catch (const ParseError& error) {
-        throw std::runtime_error(fmt::format("path {}: {}", text, error.what()));
+        throw std::runtime_error(what + ": " + error.what());
     }
 }
 
@@ -70,35 +70,39 @@ DeclaredType declaredType(const om::Request& request, const om::Schema& schema) 
     };
 }
 
-void readAssignments(const Arguments& arguments, const om::Schema& schema, om::Request& request) {
+void readAssignments(const Arguments& arguments, const om::Schema& schema, om::Request& request,
+                     std::vector<std::string>* remarks) {
     const DeclaredType declared = declaredType(request, schema);
     for (const std::string& text : arguments.assignments) {
-        try {
-            om::NamedValue value = parseAssignment(text, declared, {request.path.nameSpace, schema});
-            for (const om::NamedValue& known : request.values) {
-                if (om::sameName(known.first, value.first)) throw ParseError(0, value.first + " is given twice");
-            }
-            request.values.push_back(std::move(value));
-        } catch (const ParseError& error) {
-            throw std::runtime_error(fmt::format("{}: {}", text, error.what()));
-        }
+        request.values.push_back(readText(text, remarks, [&](std::vector<std::string>* found) {
+            om::NamedValue value = parseAssignment(text, declared, {request.path.nameSpace, schema, found});
+            if (om::findValue(request.values, value.first)) throw ParseError(0, value.first + " is given twice");
+            return value;
+        }));
     }
+}
+
+/// `value` asks all instances of a class, or the one at a path.
+om::Operation operationOf(const Command& command, const om::ObjectPath& path) {
+    if (command.operation) return *command.operation;
+    return path.keys.empty() ? om::Operation::EnumInstances : om::Operation::GetInstance;
 }
 
 } // namespace
 
-om::Request makeRequest(const Arguments& arguments, const om::Schema& schema, std::istream& input) {
+om::Request makeRequest(const Arguments& arguments, const om::Schema& schema, std::istream& input,
+                        std::vector<std::string>* remarks) {
     om::Request request;
-    request.operation = arguments.operation.value();
     request.propertyList = arguments.properties;
     request.assocClass = arguments.assocClass;
     request.resultClass = arguments.resultClass;
     request.role = arguments.role;
     request.resultRole = arguments.resultRole;
-    request.method = arguments.method;
+    request.method = arguments.member;
     request.fault = arguments.fault;
-    const Takes takes = taken(request.operation);
+    const Takes takes = arguments.command->takes;
     if (takes == Takes::Query) {
+        request.operation = om::Operation::ExecQuery;
         request.query = arguments.subject;
         request.language = "WQL";
         request.path.nameSpace = arguments.nameSpace;
@@ -106,11 +110,20 @@ om::Request makeRequest(const Arguments& arguments, const om::Schema& schema, st
         return request;
     }
     const bool piped = takes == Takes::Path && arguments.subject == "-";
-    request.path = readPath(piped ? readLine(input) : arguments.subject, arguments, schema);
+    const std::string text = piped ? readLine(input) : arguments.subject;
+    request.path = readText("path " + text, remarks, [&](std::vector<std::string>* found) {
+        return parsePath(text, arguments.nameSpace, schema, found);
+    });
+    request.operation = operationOf(*arguments.command, request.path);
     if (takes == Takes::Class && !request.path.keys.empty()) {
         throw std::runtime_error(fmt::format("{}: a class name has no keys", arguments.subject));
     }
-    readAssignments(arguments, schema, request);
+    readAssignments(arguments, schema, request, remarks);
+    if (remarks == nullptr) return request;
+    for (std::string& remark : remarksOn(request, schema)) remarks->push_back(std::move(remark));
+    if (arguments.command->action == Action::Value)
+        if (std::string remark = remarkOnProperty(request.path.className, arguments.member, schema); !remark.empty())
+            remarks->push_back(std::move(remark));
     return request;
 }
 

@@ -1,15 +1,22 @@
 #include "objectmanager/vkcim/Run.h"
 
+#include "objectmanager/vkcim/Advice.h"
 #include "objectmanager/vkcim/DefaultLibrary.h"
+#include "objectmanager/vkcim/Effect.h"
 #include "objectmanager/vkcim/HostNotes.h"
 #include "objectmanager/vkcim/JsonOutput.h"
 #include "objectmanager/vkcim/MofOutput.h"
 #include "objectmanager/vkcim/Names.h"
+#include "objectmanager/vkcim/PathText.h"
+#include "objectmanager/vkcim/QuietErrors.h"
 #include "objectmanager/vkcim/Repetition.h"
 #include "objectmanager/vkcim/Requests.h"
-#include "objectmanager/vkcim/Suggestion.h"
+#include "objectmanager/vkcim/SchemaText.h"
 #include "objectmanager/vkcim/TextOutput.h"
 #include "objectmanager/vkcim/Utf8.h"
+#include "objectmanager/vkcim/ValueText.h"
+
+#include <fmt/format.h>
 
 #include <istream>
 #include <ostream>
@@ -20,79 +27,161 @@ namespace {
 constexpr int answeredError = 1;
 constexpr int unusableArguments = 2;
 constexpr int unusableLibrary = 3;
-
-bool isAssociation(om::Operation operation) {
-    return operation == om::Operation::Associators || operation == om::Operation::AssociatorNames;
-}
+constexpr int nothingDone = 4;
 
 class Runner {
 public:
     Runner(const Arguments& given, const Streams& where)
         : arguments(given), streams(where), schema(om::Schema::builtin()) {}
 
-    int report() {
-        Timing timing;
-        const auto started = std::chrono::steady_clock::now();
-        const Report report = askEverything(timing);
-        timing.wall = std::chrono::steady_clock::now() - started;
-        print(arguments.format == Format::Json  ? jsonText(report, arguments.nameSpace, schema) + '\n'
-              : arguments.format == Format::Mof ? mofText(report, arguments.nameSpace, schema)
-                                                : plainReport(report, {arguments.nameSpace, schema, streams.colours}));
-        printTiming(timing);
-        return written(0);
-    }
-
-    int operation() {
-        const om::Request request = makeRequest(arguments, schema, streams.input);
-        const Repeated repeated = ask(request);
-        const std::string& nameSpace = request.path.nameSpace;
-        print(arguments.format == Format::Json  ? jsonText(repeated.answer, nameSpace, schema) + '\n'
-              : arguments.format == Format::Mof ? mofText(repeated.answer, nameSpace, schema)
-                                                : plainAnswer(repeated.answer, {nameSpace, schema, streams.colours}));
-        if (repeated.worst != 0) complain(repeated, request);
-        if (request.fault && !repeated.answer.faulted)
-            streams.error << "vkcim: the fault did not happen, as there were fewer such calls\n";
-        printTiming(repeated.timing);
-        return written(repeated.worst == 0 ? 0 : answeredError);
+    int run() {
+        switch (arguments.command->action) {
+        case Action::Report:
+            return report();
+        case Action::Classes:
+            return show(classesText(schema));
+        case Action::Describe:
+            return describe();
+        default:
+            return operation();
+        }
     }
 
 private:
+    /// What an operation was answered, and what is known of it afterwards.
+    struct Outcome {
+        Repeated repeated;
+        std::string hostProblem;
+        std::vector<std::string> unchanged; ///< of a modification: notChanged
+    };
+
+    int report() {
+        Timing timing;
+        std::string problem;
+        const auto started = std::chrono::steady_clock::now();
+        const Report report = askEverything(timing, problem);
+        timing.wall = std::chrono::steady_clock::now() - started;
+        print(arguments.format == Format::Json  ? jsonText(report, arguments.nameSpace, schema) + '\n'
+              : arguments.format == Format::Mof ? mofText(report, arguments.nameSpace, schema)
+                                                : plainReport(report, style(arguments.nameSpace)));
+        if (!problem.empty()) complain(cannotRead(problem));
+        printTiming(timing);
+        return written(problem.empty() ? 0 : nothingDone);
+    }
+
+    int describe() {
+        const om::Request request = makeRequest(arguments, schema, streams.input);
+        if (const om::ClassDeclaration* declared = schema.find(request.path.className))
+            return show(classText(*declared, schema));
+        for (const std::string& line : adviceOn(request, CMPI_RC_ERR_INVALID_CLASS, schema)) complain(line);
+        return unusableArguments;
+    }
+
+    int operation() {
+        std::vector<std::string> remarks;
+        const om::Request request = makeRequest(arguments, schema, streams.input, &remarks);
+        for (const std::string& remark : remarks) complain(remark);
+        if (arguments.dryRun) return show(dryRunText(request));
+        const Outcome outcome = ask(request);
+        const Repeated& repeated = outcome.repeated;
+        const std::vector<std::string> missing = lackOf(request, outcome);
+        print(answerText(repeated.answer, request, !missing.empty()));
+        if (repeated.worst != 0) explain(repeated, request);
+        for (const std::string& line : missing) complain(line);
+        if (request.fault && !repeated.answer.faulted)
+            complain("the fault did not happen, as there were fewer such calls");
+        printTiming(repeated.timing);
+        return written(repeated.worst != 0 ? answeredError : missing.empty() ? 0 : nothingDone);
+    }
+
     std::string library() const {
         return arguments.library.empty() ? defaultLibrary(programDirectory()) : libraryPath(arguments.library);
     }
 
+    TextStyle style(const std::string& nameSpace) const { return {nameSpace, schema, streams.look}; }
+
+    static std::string cannotRead(const std::string& problem) { return "the host cannot be read: " + problem; }
+
     // In both, the provider has cleaned up and is unloaded before anything is printed.
-    Repeated ask(const om::Request& request) const {
+    Outcome ask(const om::Request& request) const {
         om::ObjectManager manager(library(), arguments.provider, request.path.nameSpace, schema);
-        return repeatedly([&](Nanoseconds& elapsed) { return manager.run(request, &elapsed); }, arguments.repeat,
-                          arguments.threads, arguments.timing);
+        const LastFailure failure;
+        Outcome outcome;
+        outcome.repeated = repeatedly([&](Nanoseconds& elapsed) { return manager.run(request, &elapsed); },
+                                      arguments.repeat, arguments.threads, arguments.timing);
+        if (request.operation == om::Operation::ModifyInstance && outcome.repeated.worst == 0) {
+            const std::string reason = failure.text();
+            om::Request again;
+            again.operation = om::Operation::GetInstance;
+            again.path = request.path;
+            outcome.unchanged = notChanged(request, manager.run(again), reason, schema);
+        }
+        outcome.hostProblem = hostProblem(arguments.provider);
+        return outcome;
     }
 
-    Report askEverything(Timing& timing) const {
+    Report askEverything(Timing& timing, std::string& problem) const {
         om::ObjectManager manager(library(), arguments.provider, arguments.nameSpace, schema);
+        std::optional<QuietErrors> quiet;
+        if (!arguments.verbose) quiet.emplace();
         return makeReport(
             schema, arguments.nameSpace, arguments.properties,
             [&](const om::Request& request) { return manager.run(request, &timing.runs.emplace_back()); },
-            [&] { return hostNotes(arguments.provider); });
+            [&] {
+                problem = hostProblem(arguments.provider);
+                return hostNotes(arguments.provider);
+            });
     }
 
-    void complain(const Repeated& repeated, const om::Request& request) const {
-        streams.error << "vkcim: " << statusName(repeated.worst) << " (" << repeated.worst << ')';
-        if (repeated.worstMessage) streams.error << ": " << printable(*repeated.worstMessage);
-        streams.error << '\n';
-        if (repeated.worst != CMPI_RC_ERR_INVALID_CLASS) return;
-        for (const std::string& className : {request.path.className, request.assocClass.value_or("")}) {
-            if (className.empty() || schema.find(className)) continue;
-            const auto nearest = nearestClass(className, schema);
-            streams.error << "vkcim: there is no class " << printable(className)
-                          << (nearest ? "; did you mean " + *nearest + "?\n" : " in the schema\n");
-            return;
-        }
-        if (isAssociation(request.operation) && !request.assocClass)
-            streams.error << "vkcim: the association's class may have to be named: --assoc-class\n";
+    /// What an operation that was answered with OK did not find or did not do, a line each.
+    std::vector<std::string> lackOf(const om::Request& request, const Outcome& outcome) const {
+        if (!outcome.hostProblem.empty()) return {cannotRead(outcome.hostProblem)};
+        if (outcome.repeated.worst != 0) return {};
+        const om::Answer& answer = outcome.repeated.answer;
+        const std::string path = qualifiedPathText(request.path, arguments.nameSpace, schema);
+        if (request.operation == om::Operation::GetInstance && answer.results.empty())
+            return {"no such instance: " + path};
+        if (arguments.command->action == Action::Value &&
+            plainValues(answer, arguments.member, style(request.path.nameSpace)).empty())
+            return {fmt::format("{} of {} has no value", arguments.member, path)};
+        return outcome.unchanged;
     }
+
+    std::string answerText(const om::Answer& answer, const om::Request& request, bool lacks) const {
+        const std::string& nameSpace = request.path.nameSpace;
+        if (arguments.command->action == Action::Value) return plainValues(answer, arguments.member, style(nameSpace));
+        if (arguments.format == Format::Json) return jsonText(answer, nameSpace, schema) + '\n';
+        if (arguments.format == Format::Mof) return mofText(answer, nameSpace, schema);
+        // What was not found or done is said on standard error.
+        return lacks && answer.results.empty() ? "" : plainAnswer(answer, style(nameSpace));
+    }
+
+    std::string dryRunText(const om::Request& request) const {
+        const om::ObjectManager manager(library(), arguments.provider, request.path.nameSpace, schema);
+        const bool calls = request.operation == om::Operation::InvokeMethod;
+        std::string text =
+            fmt::format("host      {}\nprovider  {} in {}\npath      {}\n{}\n", hostDescribed(arguments.provider),
+                        arguments.provider, library(), qualifiedPathText(request.path, arguments.nameSpace, schema),
+                        calls ? "invoke    " + request.method : std::string("modify"));
+        for (const auto& [name, value] : request.values)
+            text += fmt::format("  {}={}\n", name, valueText(value, {request.path.nameSpace, schema}));
+        return text + "Nothing was asked.\n";
+    }
+
+    void explain(const Repeated& repeated, const om::Request& request) const {
+        const std::string message = repeated.worstMessage ? ": " + *repeated.worstMessage : "";
+        complain(fmt::format("{} ({}){}", statusName(repeated.worst), repeated.worst, message));
+        for (const std::string& line : adviceOn(request, repeated.worst, schema)) complain(line);
+    }
+
+    void complain(const std::string& line) const { streams.error << "vkcim: " << shortened(line) << '\n'; }
 
     void print(const std::string& text) const { streams.output << text << std::flush; }
+
+    int show(const std::string& text) const {
+        print(wrapped(text, streams.look.width));
+        return written(0);
+    }
 
     void printTiming(const Timing& timing) const {
         if (arguments.timing) streams.error << timingText(timing) << '\n' << std::flush;
@@ -100,7 +189,7 @@ private:
 
     int written(int status) const {
         if (streams.output.good()) return status;
-        streams.error << "vkcim: the answer cannot be written\n";
+        complain("the answer cannot be written");
         return answeredError;
     }
 
@@ -109,18 +198,20 @@ private:
     const om::Schema& schema;
 };
 
+int failed(const Streams& streams, const std::exception& error, int status) {
+    streams.error << "vkcim: " << shortened(error.what()) << '\n';
+    return status;
+}
+
 } // namespace
 
 int run(const Arguments& arguments, const Streams& streams) {
     try {
-        Runner runner(arguments, streams);
-        return arguments.operation ? runner.operation() : runner.report();
+        return Runner(arguments, streams).run();
     } catch (const om::LoadError& error) {
-        streams.error << "vkcim: " << printable(error.what()) << '\n';
-        return unusableLibrary;
+        return failed(streams, error, unusableLibrary);
     } catch (const std::exception& error) {
-        streams.error << "vkcim: " << printable(error.what()) << '\n';
-        return unusableArguments;
+        return failed(streams, error, unusableArguments);
     }
 }
 

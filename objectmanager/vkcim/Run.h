@@ -1,6 +1,7 @@
 #pragma once
 
 #include "objectmanager/vkcim/Arguments.h"
+#include "objectmanager/vkcim/Terminal.h"
 
 #include <iosfwd>
 
@@ -11,11 +12,12 @@ struct Streams {
     std::istream& input;
     std::ostream& output;
     std::ostream& error;
-    bool colours = false; ///< whether the output may be coloured
+    Look look = {}; ///< of the output
 };
 
 /// Does what the arguments say and returns the exit status: 0 status OK, 1 another status (or the output cannot be
-/// written), 2 a path or value that cannot be read, 3 a library that cannot be used.
+/// written), 2 a path or value that cannot be read, 3 a library that cannot be used, 4 status OK, but nothing was found
+/// or changed, or the host cannot be read.
 int run(const Arguments& arguments, const Streams& streams);
 
 } // namespace vkcim

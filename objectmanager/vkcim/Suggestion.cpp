@@ -33,20 +33,31 @@ std::string_view withoutPrefix(std::string_view name) {
 
 } // namespace
 
-std::optional<std::string> nearestClass(std::string_view className, const om::Schema& schema) {
-    if (className.size() > longest || schema.find(className)) return std::nullopt;
+std::optional<std::string> nearestName(std::string_view name, const std::vector<std::string>& known) {
+    if (name.size() > longest) return std::nullopt;
     std::optional<std::string> nearest;
-    std::size_t best = className.size() / 4 + 1;
-    for (const om::ClassDeclaration& known : schema.classes()) {
-        // A common mistake is the name alone, without the schema's prefix.
-        const bool bare = om::sameName(className, withoutPrefix(known.name));
-        const std::size_t away = bare ? 1 : distance(className, known.name);
-        if (away < best || (away == best && !nearest)) {
-            best = away;
-            nearest = known.name;
-        }
+    std::size_t best = name.size() / 4 + 2;
+    for (const std::string& each : known) {
+        const std::size_t away = distance(name, each);
+        if (away >= best) continue;
+        best = away;
+        nearest = each;
     }
     return nearest;
+}
+
+std::optional<std::string> nearestClass(std::string_view className, const om::Schema& schema) {
+    if (className.size() > longest || schema.find(className)) return std::nullopt;
+    std::vector<std::string> names = schema.served();
+    for (const om::ClassDeclaration& known : schema.classes()) names.push_back(known.name);
+    // A common mistake is the name alone, without the schema's prefix.
+    for (const std::string& known : names)
+        if (om::sameName(className, withoutPrefix(known))) return known;
+    return nearestName(className, names);
+}
+
+std::string didYouMean(const std::optional<std::string>& name) {
+    return name ? "; did you mean " + *name + "?" : "";
 }
 
 } // namespace vkcim

@@ -48,4 +48,11 @@ std::string printable(std::string_view text) {
     return line;
 }
 
+std::string shortened(std::string_view text) {
+    constexpr std::size_t head = 240;
+    constexpr std::size_t tail = 160;
+    if (text.size() <= 2 * (head + tail)) return printable(text);
+    return printable(text.substr(0, head)) + " ... " + printable(text.substr(text.size() - tail));
+}
+
 } // namespace vkcim

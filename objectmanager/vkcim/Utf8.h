@@ -12,4 +12,7 @@ std::string cleanUtf8(std::string_view text);
 /// steer a terminal.
 std::string printable(std::string_view text);
 
+/// printable, for messages: of a text that is longer than a few lines only its beginning and its end.
+std::string shortened(std::string_view text);
+
 } // namespace vkcim

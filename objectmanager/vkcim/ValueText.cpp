@@ -45,7 +45,8 @@ om::Value parseScalar(const SourceText& source, CMPIType type, const ValueContex
         }
         return {type, std::string(text)};
     case CMPI_ref:
-        return {type, std::make_shared<const om::ObjectPath>(parsePath(source, context.nameSpace, context.schema))};
+        return {type, std::make_shared<const om::ObjectPath>(
+                          parsePath(source, context.nameSpace, context.schema, context.remarks))};
     default:
         return parseNumber(text, type, offset);
     }

@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// Values as texts: `TYPE:TEXT` or TEXT alone, `null:TYPE`.
 namespace vkcim {
@@ -15,6 +16,7 @@ namespace vkcim {
 struct ValueContext {
     const std::string& nameSpace;
     const om::Schema& schema;
+    std::vector<std::string>* remarks = nullptr; ///< receives those of parsePath on references
 };
 
 /// Reads a value. Without a type of its own it takes `declared`; without that its look decides. The empty text is

@@ -1,11 +1,14 @@
 #include "nvlog/NVLogger.h"
 
+#include "nvlog/LogWatch.h"
+
 #include "logger/FileSink.h"
 #include "logger/Line.h"
 #include "logger/Settings.h"
 #include "logger/SyslogSink.h"
 #include "logger/Write.h"
 
+#include <atomic>
 #include <cerrno>
 #include <pthread.h>
 #include <syslog.h>
@@ -14,6 +17,8 @@
 namespace NVLog {
 
 namespace {
+
+std::atomic<const NVLogWatch*> watching{nullptr};
 
 /// What a call must leave as it found it: errno, and the thread's cancelability (a cancellation in here could not be
 /// thrown out of a function that throws nothing).
@@ -70,22 +75,46 @@ __attribute__((noinline)) void write(Channel channel, const char* function, cons
     const Settings& settings = currentSettings();
     const Event event = {channel, function, file, line, category, level, text};
     const CallerState state;
+    if (const NVLogWatch* const watch = watching.load(); watch != nullptr && channel == Channel::Log)
+        watch->take(watch->context, level, text.c_str());
     if (writeToSink(settings, event)) return;
     if (event.channel == Channel::Log || settings.sink == Settings::Syslog || settings.traceInSyslog)
         writeToSyslog(event);
+}
+
+/// Whoever reads the settings first writes one line on what of them cannot be used, whatever levels and channels are
+/// kept: a typing error must not hide the lines that somebody waits for.
+__attribute__((noinline)) const Settings& firstSettings() noexcept {
+    const Settings& settings = readSettings();
+    static std::atomic_flag announced = ATOMIC_FLAG_INIT;
+    if (settings.unknown[0] == 0 || settings.sink == Settings::None || announced.test_and_set()) return settings;
+    try {
+        write(Channel::Log, "readSettings", "Settings", __LINE__, "Norvane.Logger", 6000,
+              std::string("not understood: ") + settings.unknown.data());
+    } catch (...) { // without memory there is no line
+    }
+    return settings;
+}
+
+bool isKept(Channel channel, int level) noexcept {
+    const bool known = knownSettings.known.load(std::memory_order_acquire);
+    return (known ? knownSettings.settings : firstSettings()).keeps(channel, level);
 }
 
 } // namespace
 
 void NVLogger::logLevelMessage(const char* function, const char* file, int line, const std::string& category, int level,
                                char*, int, int, const std::string& text) {
-    if (currentSettings().keeps(Channel::Log, level)) write(Channel::Log, function, file, line, category, level, text);
+    if (isKept(Channel::Log, level)) write(Channel::Log, function, file, line, category, level, text);
 }
 
 void NVLogger::traceLevelMessage(const char* function, const char* file, int line, const std::string& category,
                                  int level, char*, int, int, const std::string& text) {
-    if (currentSettings().keeps(Channel::Trace, level))
-        write(Channel::Trace, function, file, line, category, level, text);
+    if (isKept(Channel::Trace, level)) write(Channel::Trace, function, file, line, category, level, text);
 }
 
 } // namespace NVLog
+
+void nvLogWatch(const NVLogWatch* watch) {
+    NVLog::watching.store(watch);
+}

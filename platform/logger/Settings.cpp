@@ -29,15 +29,30 @@ void forEachEntry(std::string_view list, Use use) noexcept {
     }
 }
 
+/// Keeps of what cannot be used as much as there is room for, of a long entry its beginning.
+void noteUnknown(Settings& settings, std::string_view name, std::string_view entry) noexcept {
+    constexpr std::size_t longest = 40;
+    char* at = settings.unknown.data() + std::char_traits<char>::length(settings.unknown.data());
+    const char* const end = settings.unknown.data() + settings.unknown.size() - 1; // the last byte stays 0
+    for (const std::string_view part : {std::string_view(settings.unknown[0] != 0 ? ", " : ""), name,
+                                        std::string_view("="), entry.substr(0, longest)})
+        at = std::copy_n(part.data(), std::min<std::size_t>(part.size(), static_cast<std::size_t>(end - at)), at);
+}
+
 void setSink(Settings& settings, std::string_view text) noexcept {
     constexpr std::string_view filePrefix = "file:";
-    if (text == "stderr") settings.sink = Settings::Stderr;
-    if (text == "none") settings.sink = Settings::None;
-    if (text.substr(0, filePrefix.size()) != filePrefix) return;
-    text.remove_prefix(filePrefix.size());
-    if (text.empty() || text.size() >= settings.path.size()) return;
-    settings.sink = Settings::File;
-    std::copy(text.begin(), text.end(), settings.path.begin());
+    if (text.empty() || text == "syslog") return;
+    const std::string_view file = text.substr(0, filePrefix.size()) == filePrefix ? text.substr(filePrefix.size()) : "";
+    if (text == "stderr") {
+        settings.sink = Settings::Stderr;
+    } else if (text == "none") {
+        settings.sink = Settings::None;
+    } else if (!file.empty() && file.size() < settings.path.size()) {
+        settings.sink = Settings::File;
+        std::copy(file.begin(), file.end(), settings.path.begin());
+    } else {
+        noteUnknown(settings, "NVLOG_SINK", text);
+    }
 }
 
 void addLevel(Settings& settings, int level) noexcept {
@@ -50,11 +65,15 @@ void addLevel(Settings& settings, int level) noexcept {
 
 void setLevels(Settings& settings, std::string_view list) noexcept {
     forEachEntry(list, [&settings](std::string_view entry) {
-        if (entry == "all") settings.allLevels = true;
         int level = 0;
         const char* const end = entry.data() + entry.size();
         const auto [rest, error] = std::from_chars(entry.data(), end, level);
-        if (error == std::errc() && rest == end) addLevel(settings, level);
+        if (entry == "all")
+            settings.allLevels = true;
+        else if (error == std::errc() && rest == end)
+            addLevel(settings, level);
+        else if (!entry.empty())
+            noteUnknown(settings, "NVLOG_LEVELS", entry);
     });
     if (settings.allLevels || settings.levelCount > 0) return;
     addLevel(settings, 3000);
@@ -67,6 +86,7 @@ void setChannels(Settings& settings, std::string_view list) noexcept {
     forEachEntry(list, [&](std::string_view entry) {
         log = log || entry == "log";
         trace = trace || entry == "trace";
+        if (!entry.empty() && entry != "log" && entry != "trace") noteUnknown(settings, "NVLOG_CHANNELS", entry);
     });
     const bool chosen = log || trace;
     settings.log = log || !chosen;

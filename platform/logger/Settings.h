@@ -22,6 +22,7 @@ struct Settings {
     std::size_t levelCount = 0;
     std::array<int, maxLevels> levels{};
     std::array<char, PATH_MAX> path{}; ///< of the File sink; behind what is looked at for every line
+    std::array<char, 240> unknown{};   ///< what of the texts cannot be used, `NAME=ENTRY` each; empty where all can
 
     bool keeps(Channel channel, int level) const noexcept {
         if (!(channel == Channel::Log ? log : trace)) return false;
@@ -34,8 +35,8 @@ struct Settings {
 };
 
 /// Reads the three variables' texts; null and empty ones mean the defaults. Entries of a list that cannot be used
-/// are passed over, and a list without any usable entry means the default: a typing error must not hide failures.
-/// More than maxLevels levels keep all.
+/// are passed over and noted, and a list without any usable entry means the default: a typing error must not hide
+/// failures. More than maxLevels levels keep all.
 Settings parseSettings(const char* sink, const char* levels, const char* channels) noexcept;
 
 /// This process's settings, once they are read.

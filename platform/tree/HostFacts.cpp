@@ -5,6 +5,7 @@
 #include "host/ServiceNotes.h"
 #include "tree/CurrentHost.h"
 #include "tree/Cursor.h"
+#include "vk/HostNotes.h"
 #include "vk/HostSource.h"
 #include "vk/Kept.h"
 #include "vk/NodeLexicon.h"
@@ -39,14 +40,17 @@ bool hostIsKVM() {
 
 namespace {
 
+std::string hostProblem() {
+    Tree::SimulatedHost* const host = Tree::simulatedHost();
+    if (host == nullptr) return Tree::problemOf(Root::host());
+    const std::string problem = host->state()->problem;
+    return problem.empty() ? std::string() : HostSource::current().location + ": " + problem;
+}
+
 std::vector<std::string> missingFacts() {
-    if (Tree::SimulatedHost* host = Tree::simulatedHost(); host != nullptr) {
-        const std::string problem = host->state()->problem;
-        if (problem.empty()) return {};
-        return {HostSource::current().location + ": " + problem};
-    }
-    const auto reading = Tree::realHost().reading();
-    return reading->problem.empty() ? Host::notesOn(reading->facts) : std::vector<std::string>{reading->problem};
+    if (const std::string problem = hostProblem(); !problem.empty()) return {problem};
+    if (Tree::simulatedHost() != nullptr) return {};
+    return Host::notesOn(Tree::realHost().reading()->facts);
 }
 
 std::string timeServiceNote() {
@@ -74,3 +78,14 @@ std::vector<std::string> hostNotes() {
 }
 
 } // namespace VK
+
+void vkHostProblem(VkHostNote take, void* context) {
+    if (const std::string problem = VK::hostProblem(); !problem.empty()) take(context, problem.c_str());
+}
+
+void vkHostSource(VkHostNote take, void* context) {
+    const VK::HostSource& source = VK::HostSource::current();
+    if (source.kind == VK::HostSource::Live) return;
+    const char* what = source.kind == VK::HostSource::Snapshot ? "the snapshot in " : "the simulated host in ";
+    take(context, (what + source.location).c_str());
+}

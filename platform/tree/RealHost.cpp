@@ -12,9 +12,8 @@ namespace {
 RealHost::Reading readOnce(const Root& root) {
     RealHost::Reading reading;
     std::vector<Node> all;
-    if (const Root::Names top = root.list("/"); !top) {
-        reading.problem = root.getDirectory() + ": " + errorText(top.error);
-    } else {
+    reading.problem = problemOf(root);
+    if (reading.problem.empty()) {
         reading.facts = Host::readHardware(root);
         all = hostNodes(reading.facts);
     }
@@ -32,6 +31,11 @@ void logProblems(const RealHost::Reading& reading) {
 }
 
 } // namespace
+
+std::string problemOf(const Root& root) {
+    const Root::Names top = root.list("/");
+    return top ? std::string() : root.getDirectory() + ": " + errorText(top.error);
+}
 
 std::shared_ptr<const RealHost::Reading> RealHost::reading() {
     return known.get([this] { return readOnce(root); }, logProblems);

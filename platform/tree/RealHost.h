@@ -10,6 +10,9 @@
 
 namespace VK::Tree {
 
+/// Why the directory of a root cannot be read, with its name; empty where it can.
+std::string problemOf(const Root& root);
+
 /// This host, or a snapshot of one below another root. What cannot change while a host runs is read once.
 class RealHost final : public NodeSource {
 public:

@@ -16,6 +16,7 @@ def _texts(schema: Schema, ours: List[Class]) -> Dict[str, str]:
         "CLASS_LIST": json.dumps(classes), "ASSOCIATION_LIST": json.dumps(associations),
         "CLASS_WORDS": " ".join(classes), "ASSOCIATION_WORDS": " ".join(associations), "ROLE_WORDS": " ".join(roles),
         "METHOD_WORDS": " ".join(f"{c.name}={m.name}" for c in ours for m in c.methods),
+        "PROPERTY_WORDS": " ".join(f"{c.name}={p.name}" for c in ours for p in c.properties),
     }
 
 

@@ -12,33 +12,42 @@ def _code(kind: Type) -> str:
     return f"CMPI_{'ref' if kind.reference else _CODES.get(kind.name, kind.name)}{'A' if kind.array else ''}"
 
 
-def _printed(value: Union[str, bool]) -> str:
-    return json.dumps(value)  # our names need no more than C++ and JSON have in common
+def _printed(value: Union[str, bool, int, List[str]]) -> str:
+    if isinstance(value, list):
+        return "{" + ", ".join(map(_printed, value)) + "}"
+    return json.dumps(value)  # our texts need no more than C++ and JSON have in common
 
 
-def _declaration(name: str, kind: Type, key: bool) -> str:
-    return f"{{{_printed(name)}, {_code(kind)}, {_printed(key)}, {_printed(kind.name if kind.reference else '')}}}"
+def _qualifiers(feature: Feature) -> str:
+    each = [f"{{{_printed(q.name)}, qualifierValue({_printed(q.value)})}}" for q in feature.qualifiers.values()]
+    return "{" + ", ".join(each) + "}"
+
+
+def _declaration(feature: Feature, key: bool) -> str:
+    kind = feature.type
+    return (f"{{{_printed(feature.name)}, {_code(kind)}, {_printed(key)}, "
+            f"{_printed(kind.name if kind.reference else '')}, {_qualifiers(feature)}}}")
 
 
 def _parameter(parameter: Feature) -> str:
     is_in = parameter.qualifier("In") is not False
-    return (f"{{{_declaration(parameter.name, parameter.type, False)}, {_printed(is_in)}, "
-            f"{_printed(parameter.is_marked('Out'))}}}")
+    return f"{{{_declaration(parameter, False)}, {_printed(is_in)}, {_printed(parameter.is_marked('Out'))}}}"
 
 
 def _method(method: Feature) -> str:
-    parameters = ", ".join(_parameter(p) for p in method.parameters)
-    return f"{{{_printed(method.name)}, {_code(method.type)}, {{{parameters}}}}}"
+    parameters = ", ".join(map(_parameter, method.parameters))
+    return f"{{{_printed(method.name)}, {_code(method.type)}, {{{parameters}}}, {_qualifiers(method)}}}"
 
 
 def _class(schema: Schema, declared: Class) -> List[str]:
     def listed(items: List[str]) -> str:
         return "{" + "".join(f"\n         {item}," for item in items) + "}"
-    properties = [_declaration(p.name, p.type, schema.is_key(declared, p)) for p in declared.properties]
+    properties = [_declaration(p, schema.is_key(declared, p)) for p in declared.properties]
     head = ", ".join(map(_printed, (declared.name, declared.superclass or "", declared.association)))
     return [f"    {{{head},",
             f"     {listed(properties)},",
-            f"     {listed([_method(m) for m in declared.methods])}}},"]
+            f"     {listed([_method(m) for m in declared.methods])},",
+            f"     {_qualifiers(declared)}}},"]
 
 
 def cpp(schema: Schema) -> str:

@@ -63,7 +63,7 @@ class Vkcim(unittest.TestCase):
 
     def test_a_report_of_a_host_that_tells_nothing(self):
         code, output, _ = run(VKCIM, "--format", "json", "report", VK_INSTRUMENTATION_TREE="/dev/null")
-        self.assertEqual(code, 0)
+        self.assertEqual(code, 4)
         report = json.loads(output)
         VALIDATOR.validate(report)
         self.assertEqual(report["classes"]["VESKA_ComputerSystem"]["results"], [])
@@ -86,7 +86,7 @@ class Vkcim(unittest.TestCase):
             self.assertEqual(ask(*words, status=1)["status"]["name"], "CMPI_RC_ERR_NOT_SUPPORTED", words)
 
     def test_modify(self):
-        answer = echo("modify", "Echo_Quiet", "A=1")
+        answer = echo("modify", "Echo_Quiet", "A=1", status=4)
         self.assertEqual((answer["results"], answer["returnValue"], answer["out"]), ([], None, {}))
 
     def test_errors_with_and_without_a_name_and_a_message(self):
@@ -149,6 +149,14 @@ class Strictness(unittest.TestCase):
             for key in [*right] if not place else ["code", "name", "path", "namespace", "class", "keys", "type"]:
                 self.changed(right, place, lambda at, key=key: at.update({key: 1.5}))
 
+    def test_words_that_are_none(self):
+        right = ask("get", COMPUTER)
+        self.assertEqual(right["results"][0]["properties"]["OperationalStatus"]["words"], ["OK", "In Service"])
+        for kind, words in [("uint16", []), ("uint16", [None]), ("uint16", [2]), ("uint16", "OK"), ("string", ["OK"])]:
+            self.changed(right, ("results", 0, "properties"), lambda at, kind=kind, words=words: at.update(
+                X={"type": kind, "value": None, "words": words}))
+        self.changed(right, ("results", 0, "keys", "Name"), lambda at: at.update(words=["node7"]))
+
     def test_a_value_that_its_type_cannot_hold(self):
         right = ask("get", COMPUTER)
         for kind, value in [("string", 1), ("boolean", 0), ("uint8", 256), ("uint16", -1), ("uint64", 2 ** 64),
@@ -170,7 +178,9 @@ class Strictness(unittest.TestCase):
                 self.changed(right, (part,), lambda at, name=name: at.pop(name))
             self.changed(right, (part,), lambda at: at.update(VESKA_Tenth=at[next(iter(at))]))
         self.changed(right, (), lambda at: at.update(notes=[1]))
-        self.changed(right, (), lambda at: at.pop("notes"))
+        for key in ("notes", "host", "version", "time"):
+            self.changed(right, (), lambda at, key=key: at.pop(key))
+        self.changed(right, (), lambda at: at.update(time="2026-11-21 06:00:00"))
 
 
 class Check(unittest.TestCase):

@@ -184,10 +184,17 @@ class Output(unittest.TestCase):
 
     def test_table_carries_inherited_keys_into_overrides(self):
         table = output.cpp(self.schema)
-        self.assertIn('{"Name", CMPI_string, true, ""}', table)
-        self.assertIn('{"States", CMPI_uint16A, false, ""}', table)
-        self.assertIn('{"To", CMPI_ref, true, "VESKA_Thing"}', table)
-        self.assertIn('{{"When", CMPI_dateTime, false, ""}, true, true}', table)
+        self.assertIn('{"Name", CMPI_string, true, "", {', table)
+        self.assertIn('{"States", CMPI_uint16A, false, "", {', table)
+        self.assertIn('{"To", CMPI_ref, true, "VESKA_Thing", {', table)
+        self.assertRegex(table, r'\{\{"When", CMPI_dateTime, false, "", \{.*\}\}, true, true\}')
+
+    def test_table_carries_qualifiers_in_their_order(self):
+        _, schema = compiled(thing('[Key, Description("a \\"d\\"")] string A; [Write, Description("d"), ValueMap {"1"}, '
+                                   'Values {"One"}] uint8 B;'))
+        table = output.cpp(schema)
+        self.assertIn(r'{{"Key", qualifierValue(true)}, {"Description", qualifierValue("a \"d\"")}}', table)
+        self.assertIn('{"ValueMap", qualifierValue({"1"})}, {"Values", qualifierValue({"One"})}}', table)
 
     def test_registration_names_each_class_once_with_its_kinds(self):
         provider = registration.Provider("M", "P", "loc", "1.2.3", "V", "D", "root/x")

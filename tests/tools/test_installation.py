@@ -155,7 +155,7 @@ class Completion(unittest.TestCase):
     def test_knows_the_commands_and_options_of_the_program(self):
         text = run(PREFIX / "bin/vkcim", "--help").stdout
         commands = set(re.findall(r"^  ([a-z-]+)  ", text.split("\nCommands:")[1], re.M))
-        options = set(re.findall(r"^  (--[a-z-]+)", text, re.M))
+        options = set(re.findall(r"^  (?:-\w,)?(--[a-z-]+)", text, re.M))
         self.assertGreater(len(commands), 10)
         self.assertEqual(self.complete(""), commands)
         self.assertEqual(self.complete("report", "--"), options)
@@ -166,6 +166,7 @@ class Completion(unittest.TestCase):
         self.assertEqual(self.complete("--assoc-class", ""), {c["name"] for c in declared if c["association"]})
         for c in declared:
             self.assertEqual(self.complete("invoke", c["name"], ""), {m["name"] for m in c["methods"]})
+            self.assertEqual(self.complete("value", c["name"], ""), {p["name"] for p in c["properties"]})
         ends = {p["name"] for c in declared if c["association"] for p in c["properties"] if p["type"].endswith(" ref")}
         self.assertEqual(self.complete("associators", "--role", ""), ends)
 

@@ -1,4 +1,4 @@
-"""vkcim as somebody at a terminal meets it: colours, completion in a shell, the examples of its help."""
+"""vkcim as somebody at a terminal meets it: colours, completion in a shell, the width of lines."""
 
 import json
 import os
@@ -92,25 +92,27 @@ class Completion(unittest.TestCase):
         self.assertEqual(self.complete("--provider="), ["--provider=BaseServerProvider"])
 
 
-class Help(unittest.TestCase):
-    # What the provider does not offer.
-    NOT_SUPPORTED = {"create", "delete", "query", "references", "reference-names"}
+class Width(unittest.TestCase):
+    """At 80 columns a report and a help are broken where people would break them."""
 
-    def test_shows_an_example_of_each_command_that_can_be_typed(self):
-        commands = re.findall(r"^  ([a-z-]+)  ", run(VKCIM, "--help").stdout.split("\nCommands:")[1], re.M)
-        self.assertGreater(len(commands), 10)
-        for command in commands:
-            help_text = run(VKCIM, command, "--help").stdout
-            example = re.search(r"^Example:\n  (vkcim .*)$", help_text, re.M).group(1)
-            self.assertRegex(example, rf"\b{command}\b")
-            tree = directory() / "tree.json"
-            tree.write_bytes((SOURCE / "docs/examples/rack-server.json").read_bytes())
-            done = run("sh", "-c", example, env={**HOST, "VK_INSTRUMENTATION_TREE": str(tree)})
-            with self.subTest(example):
-                self.assertEqual(done.returncode, 1 if command in self.NOT_SUPPORTED else 0, done.stderr)
-                self.assertEqual("CMPI_RC_ERR_NOT_SUPPORTED" in done.stderr, command in self.NOT_SUPPORTED, done.stderr)
-                if command not in self.NOT_SUPPORTED | {"modify"}:
-                    self.assertNotIn("nothing returned", done.stdout)
+    def shown(self, *words, **environment):
+        return run(VKCIM, *words, env={**HOST, **environment}).stdout.splitlines()
+
+    def test_of_the_terminal_breaks_lines(self):
+        for words in (["report"], ["describe", "VESKA_ComputerSystem"], ["classes"], ["--help"], ["modify", "--help"]):
+            for line in self.shown(*words, COLUMNS="80", LC_ALL="C.UTF-8"):
+                self.assertLessEqual(len(line), 80, line)
+        self.assertIn("    server read as 0, which then means nothing", self.shown("report", COLUMNS="80"))
+
+    def test_of_no_terminal_leaves_lines_whole(self):
+        self.assertGreater(max(map(len, self.shown("report"))), 110)
+        self.assertEqual(self.shown("names", "VESKA_TimeService"), self.shown("names", "VESKA_TimeService", COLUMNS="40"))
+
+    def test_boxes_are_drawn_in_utf8_locales_only(self):
+        self.assertIn("  └─ VESKA_ComputerSystem.Name=\"node7\"  (VESKA_ComputerSystemPackage)",
+                      self.shown("report", LC_ALL="C.UTF-8"))
+        self.assertIn("  `- VESKA_ComputerSystem.Name=\"node7\"  (VESKA_ComputerSystemPackage)",
+                      self.shown("report", LC_ALL="C"))
 
 
 class Errors(unittest.TestCase):

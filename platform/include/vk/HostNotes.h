@@ -9,4 +9,12 @@ typedef void (*VkHostNote)(void* context, const char* note);
 /// library that is loaded already: libvkinstrumentation has it under this very name.
 void vkHostNotes(VkHostNote take, void* context);
 
+/// Hands over why nothing can be read of the process's snapshot or simulated host, with the directory's or file's name:
+/// it is missing, may not be read or is broken. Nothing at all where it can be read. This and the next one are
+/// libvkcommon's and are looked up by name, too, so that a library that stands in for libvkcommon need not have them.
+void vkHostProblem(VkHostNote take, void* context);
+
+/// Hands over which host it is where it is not this one: `the snapshot in DIRECTORY`, `the simulated host in FILE`.
+void vkHostSource(VkHostNote take, void* context);
+
 } // extern "C"

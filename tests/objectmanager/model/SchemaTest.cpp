@@ -98,8 +98,30 @@ TEST(SchemaTest, EverySuperclassAndClassReferredToIsThere) {
     EXPECT_FALSE(schema.served().empty());
 }
 
+TEST(SchemaTest, ThePropertiesOfAClassHaveWords) {
+    const Schema& schema = Schema::builtin();
+    const Value two{CMPI_uint16, std::uint64_t{2}};
+    using Words = std::vector<std::string_view>;
+    EXPECT_EQ(schema.wordsFor("veska_physicalpackage", {"packagetype", two}), Words{"Rack"});
+    EXPECT_EQ(schema.wordsFor("VESKA_PhysicalPackage", {"Unknown", two}), Words());
+    EXPECT_EQ(schema.wordsFor("Unknown", {"PackageType", two}), Words());
+}
+
+TEST(SchemaTest, TheLineOfInheritanceStartsAtTheClassItself) {
+    const auto names = [](const char* className) {
+        std::vector<std::string> list;
+        for (const ClassDeclaration* each : Schema::builtin().line(className)) list.push_back(each->name);
+        return list;
+    };
+    EXPECT_EQ(names("veska_computersystempackage"),
+              (std::vector<std::string>{"VESKA_ComputerSystemPackage", "CIM_ComputerSystemPackage",
+                                        "CIM_SystemPackaging", "CIM_Dependency"}));
+    EXPECT_EQ(names("Unknown"), std::vector<std::string>());
+}
+
 TEST(SchemaTest, AClassThatIsItsOwnAncestorEndsNoWalk) {
     const Schema circle({{"A", "B", false, {}, {}}, {"B", "A", false, {}, {}}});
+    EXPECT_EQ(circle.line("A").size(), 2U);
     EXPECT_TRUE(circle.isA("A", "B"));
     EXPECT_FALSE(circle.isA("A", "C"));
 }

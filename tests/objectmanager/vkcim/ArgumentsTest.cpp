@@ -19,7 +19,7 @@ Arguments good(const Words& words) {
 
 TEST(Arguments, HaveDefaults) {
     const Arguments arguments = good({"names", "A"});
-    EXPECT_EQ(arguments.operation, om::Operation::EnumInstanceNames);
+    EXPECT_STREQ(arguments.command->name, "names");
     EXPECT_EQ(arguments.subject, "A");
     EXPECT_EQ(arguments.library, "");
     EXPECT_EQ(arguments.provider, "BaseServerProvider");
@@ -54,13 +54,14 @@ TEST(Arguments, AnEmptyPropertyListIsNotAMissingOne) {
 TEST(Arguments, EveryCommandIsRead) {
     for (const Command& command : commands) {
         Words words = {command.name};
+        if (command.takes == Takes::Command) continue; // answered at once
         if (command.takes != Takes::Nothing) words.push_back("subject");
-        if (command.method) words.push_back("method");
+        if (command.member) words.push_back("member");
         if (command.assignments) words.insert(words.end(), {"a=1", "b="});
         const Arguments arguments = good(words);
-        EXPECT_EQ(arguments.operation, command.operation);
+        EXPECT_EQ(arguments.command, &command);
         EXPECT_EQ(arguments.subject, command.takes == Takes::Nothing ? "" : "subject");
-        EXPECT_EQ(arguments.method, command.method ? "method" : "");
+        EXPECT_EQ(arguments.member, command.member ? "member" : "");
         EXPECT_EQ(arguments.assignments.size(), command.assignments ? 2u : 0u) << command.name;
     }
 }
@@ -74,7 +75,8 @@ TEST(Arguments, WordsThatLookLikeSomethingElseAreTakenAsTheyAre) {
 
 TEST(Arguments, HelpAndVersionAreAnswersOfTheirOwn) {
     for (const Words& words :
-         {Words{"--help"}, Words{"--version"}, Words{"names", "--help"}, Words{"get", "A", "--help"}}) {
+         {Words{"--help"}, Words{"--version"}, Words{"names", "--help"}, Words{"get", "A", "--help"}, Words{"-h"},
+          Words{"-V"}, Words{"names", "-h"}, Words{"help"}, Words{"help", "names"}}) {
         const Parsed parsed = parseArguments(words);
         EXPECT_FALSE(parsed.arguments);
         EXPECT_EQ(parsed.exitStatus, 0);
@@ -86,7 +88,39 @@ TEST(Arguments, HelpAndVersionAreAnswersOfTheirOwn) {
 TEST(Arguments, EveryCommandsHelpHasItsExample) {
     for (const Command& command : commands) {
         EXPECT_THAT(parseArguments({command.name, "--help"}).output, HasSubstr(command.example));
+        EXPECT_EQ(parseArguments({"help", command.name}).output, parseArguments({command.name, "--help"}).output);
     }
+    EXPECT_EQ(parseArguments({"help"}).output, parseArguments({"--help"}).output);
+    EXPECT_THAT(parseArguments({"help", "modify"}).output, HasSubstr("/etc/localtime"));
+}
+
+TEST(Arguments, OptionsThatACommandWouldIgnoreAreRefused) {
+    EXPECT_TRUE(good({"report", "--verbose"}).verbose);
+    EXPECT_TRUE(good({"modify", "A", "x=1", "--dry-run"}).dryRun);
+    EXPECT_TRUE(good({"--dry-run", "invoke", "A", "m"}).dryRun);
+    const std::pair<Words, const char*> refused[] = {
+        {{"names", "A", "--verbose"}, "names: --verbose does not go with it"},
+        {{"create", "A", "x=1", "--dry-run"}, "create: --dry-run does not go with it"},
+        {{"delete", "A", "--dry-run"}, "delete: --dry-run does not go with it"},
+        {{"report", "--dry-run"}, "report: --dry-run does not go with it"},
+        {{"value", "A", "x", "--repeat", "2"}, "value: --repeat does not go with it"},
+        {{"classes", "--timing"}, "classes: --timing does not go with it"},
+        {{"--format", "json", "classes"}, "classes: its output is text alone"},
+        {{"--format", "mof", "describe", "A"}, "describe: its output is text alone"},
+        {{"--format", "json", "value", "A", "x"}, "value: its output is text alone"},
+        {{"--format", "json", "modify", "A", "x=1", "--dry-run"}, "--dry-run: its output is text alone"}};
+    for (const auto& [words, what] : refused) {
+        const Parsed parsed = parseArguments(words);
+        EXPECT_EQ(parsed.exitStatus, 2) << what;
+        EXPECT_EQ(parsed.error, std::string("vkcim: ") + what + "\nTry 'vkcim --help'.\n");
+    }
+}
+
+TEST(Arguments, AMistypedCommandIsAnsweredWithTheNearestOne) {
+    EXPECT_THAT(parseArguments({"nmaes", "A"}).error, HasSubstr("there is no command 'nmaes'; did you mean names?"));
+    EXPECT_THAT(parseArguments({"--formt", "json", "names", "A"}).error,
+                HasSubstr("there is no option '--formt'; did you mean --format?"));
+    EXPECT_THAT(parseArguments({"help", "reprot"}).error, HasSubstr("no command 'reprot'; did you mean report?"));
 }
 
 TEST(Arguments, UnusableOnesAreRefusedWithStatusTwo) {

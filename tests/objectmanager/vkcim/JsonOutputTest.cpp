@@ -55,6 +55,27 @@ TEST(JsonOutput, APathHasNullForItsProperties) {
         << json(answer);
 }
 
+TEST(JsonOutput, ANumberHasTheWordsOfItsClassBesideIt) {
+    const auto numbers = [](std::initializer_list<std::uint64_t> values) {
+        std::vector<om::Value> elements;
+        for (const std::uint64_t value : values) elements.push_back({CMPI_uint16, value});
+        return om::Value{CMPI_uint16A, elements};
+    };
+    om::Instance computer;
+    computer.path.className = "VESKA_ComputerSystem";
+    computer.properties = {{"HealthState", {CMPI_uint16, std::uint64_t{5}}},
+                           {"OperationalStatus", numbers({2, 77})},
+                           {"Dedicated", numbers({77})},
+                           {"Status", {CMPI_string, std::string("OK")}}};
+    om::Answer answer;
+    answer.results.emplace_back(computer);
+    EXPECT_NE(jsonText(answer, nameSpace, om::Schema::builtin())
+                  .find(R"("properties":{"HealthState":{"type":"uint16","value":5,"words":["OK"]},)"
+                        R"("OperationalStatus":{"type":"uint16[]","value":[2,77],"words":["OK",null]},)"
+                        R"("Dedicated":{"type":"uint16[]","value":[77]},"Status":{"type":"string","value":"OK"}})"),
+              std::string::npos);
+}
+
 TEST(JsonOutput, PropertiesKeepTheOrderInWhichTheyWereSet) {
     om::Instance instance{
         node7(),
@@ -136,13 +157,16 @@ TEST(JsonOutput, OutArgumentsAreNamed) {
 
 TEST(JsonOutput, AReportHoldsTheAnswersByClassInOrder) {
     Report report;
+    report.host = "node\"7";
+    report.version = "2.1.0";
+    report.time = "2026-11-21T06:00:00Z";
     report.classes = {{"B", {}}, {"A", {}}};
     report.associations = {{"L", {}}};
     report.notes = {"no tables"};
     const std::string empty = json({});
-    EXPECT_EQ(jsonText(report, nameSpace, testSchema()), R"({"classes":{"B":)" + empty + R"(,"A":)" + empty +
-                                                             R"(},"associations":{"L":)" + empty +
-                                                             R"(},"notes":["no tables"]})");
+    EXPECT_EQ(jsonText(report, nameSpace, testSchema()),
+              R"({"host":"node\"7","version":"2.1.0","time":"2026-11-21T06:00:00Z","classes":{"B":)" + empty +
+                  R"(,"A":)" + empty + R"(},"associations":{"L":)" + empty + R"(},"notes":["no tables"]})");
 }
 
 } // namespace

@@ -26,6 +26,20 @@ TEST(LinkTree, ACircleEnds) {
     EXPECT_THAT(drawLinks({{"a", "a", "L"}}), ElementsAre("a", "└─ a  (L)"));
 }
 
+TEST(LinkTree, ATerminalWithoutBoxesGetsPlainCharacters) {
+    Look plain;
+    plain.boxes = false;
+    EXPECT_THAT(drawLinks({{"a", "b", "L"}, {"a", "c", "L"}, {"b", "d", "L"}}, plain),
+                ElementsAre("a", "|- b  (L)", "|  `- d  (L)", "`- c  (L)"));
+}
+
+TEST(LinkTree, AnAssociationThatDoesNotFitStandsOnTheNextLine) {
+    Look narrow;
+    narrow.width = 16;
+    EXPECT_THAT(drawLinks({{"a", "bbbbb", "Link"}, {"a", "cccccc", "Link"}, {"bbbbb", "ddd", "Link"}}, narrow),
+                ElementsAre("a", "├─ bbbbb  (Link)", "│  └─ ddd", "│       (Link)", "└─ cccccc", "     (Link)"));
+}
+
 TEST(LinkTree, NoLinksDrawNothing) {
     EXPECT_THAT(drawLinks({}), IsEmpty());
 }

@@ -8,7 +8,9 @@
 namespace vkcim {
 namespace {
 
+using testing::ElementsAre;
 using testing::HasSubstr;
+using testing::IsEmpty;
 
 om::ObjectPath parse(std::string_view text) {
     return parsePath(text, "root/cimv2", testSchema());
@@ -129,6 +131,35 @@ TEST(PathText, AReferenceTakesTheNamespaceOfThePathAroundIt) {
     const om::ObjectPath path = parse(R"(root/x:Test_Link.From="Test_Thing",To="root/y:Test_Thing")");
     EXPECT_EQ(std::get<std::shared_ptr<const om::ObjectPath>>(path.keys.at(0).second.data)->nameSpace, "root/x");
     EXPECT_EQ(std::get<std::shared_ptr<const om::ObjectPath>>(path.keys.at(1).second.data)->nameSpace, "root/y");
+}
+
+std::vector<std::string> remarksOn(std::string_view text) {
+    std::vector<std::string> remarks;
+    parsePath(text, "root/cimv2", om::Schema::builtin(), &remarks);
+    return remarks;
+}
+
+TEST(PathText, RemarksOnKeysThatTheClassLacks) {
+    EXPECT_THAT(remarksOn(R"(VESKA_ComputerSystem.Nmae="a")"),
+                ElementsAre("position 22: VESKA_ComputerSystem has no key Nmae; did you mean Name?"));
+    EXPECT_THAT(remarksOn(R"(veska_physicalpackage.Tag="a",Model="b")"),
+                ElementsAre("position 31: VESKA_PhysicalPackage has no key Model; its keys: CreationClassName, Tag"));
+    EXPECT_THAT(remarksOn(R"(Other_Class.Nmae="a")"), IsEmpty());
+    EXPECT_THAT(remarksOn(R"(CIM_ManagedElement.Nmae="a")"), IsEmpty()) << "the classes below it have keys";
+}
+
+TEST(PathText, RemarksOnKeysOfAnotherKind) {
+    EXPECT_THAT(remarksOn("VESKA_ComputerSystem.Name=7"),
+                ElementsAre("position 27: key Name of VESKA_ComputerSystem is text in quotes"));
+    EXPECT_THAT(remarksOn(R"(VESKA_ComputerSystem.name="a",CreationClassName=TRUE)"),
+                ElementsAre("position 49: key CreationClassName of VESKA_ComputerSystem is text in quotes"));
+    EXPECT_THAT(remarksOn("VESKA_ComputerSystemPackage.Antecedent=7"),
+                ElementsAre("position 40: key Antecedent of VESKA_ComputerSystemPackage is a path in quotes"));
+}
+
+TEST(PathText, RemarksOnKeysOfReferencesAtTheirPlaceInTheWhole) {
+    EXPECT_THAT(remarksOn(R"(VESKA_ComputerSystemPackage.Antecedent="VESKA_PhysicalPackage.Tg=\"a\"")"),
+                ElementsAre("position 63: VESKA_PhysicalPackage has no key Tg; did you mean Tag?"));
 }
 
 TEST(PathText, PrintsWhatItReads) {

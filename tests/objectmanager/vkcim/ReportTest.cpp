@@ -139,8 +139,8 @@ Notes
 TEST(TextOutput, ColoursHeadingsOnlyWhenAsked) {
     om::Answer answer;
     answer.results.emplace_back(om::Instance{computer, {}});
-    EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema(), false}), "VESKA_ComputerSystem.Name=\"node7\"\n");
-    EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema(), true}),
+    EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema(), {}}), "VESKA_ComputerSystem.Name=\"node7\"\n");
+    EXPECT_EQ(plainAnswer(answer, {nameSpace, testSchema(), {true}}),
               "\x1b[1mVESKA_ComputerSystem.Name=\"node7\"\x1b[0m\n");
 }
 

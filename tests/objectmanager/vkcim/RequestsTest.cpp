@@ -9,6 +9,7 @@
 namespace vkcim {
 namespace {
 
+using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::ThrowsMessage;
 
@@ -64,6 +65,27 @@ TEST(Requests, OptionsAreHandedOn) {
     EXPECT_EQ(made.role, "C");
     EXPECT_EQ(made.resultRole, "D");
     EXPECT_EQ(made.propertyList, (std::vector<std::string>{"E", "F"}));
+}
+
+TEST(Requests, AValueIsAskedOfOneInstanceOrOfAll) {
+    EXPECT_EQ(request({"value", "Test_Thing", "Speed"}).operation, om::Operation::EnumInstances);
+    EXPECT_EQ(request({"value", "Test_Thing.Name=\"a\"", "Speed"}).operation, om::Operation::GetInstance);
+}
+
+TEST(Requests, WhatMayBeATypingErrorIsRemarkedOnAndAskedAllTheSame) {
+    const auto remarks = [](const std::vector<std::string>& words) {
+        std::vector<std::string> found;
+        std::istringstream none;
+        makeRequest(parseArguments(words).arguments.value(), testSchema(), none, &found);
+        return found;
+    };
+    EXPECT_THAT(remarks({"get", "Test_Thing.Nmae=\"a\""}),
+                ElementsAre("path Test_Thing.Nmae=\"a\": position 12: Test_Thing has no key Nmae; did you mean Name?"));
+    EXPECT_THAT(remarks({"invoke", "Test_Thing", "Start", "Thing=ref:Test_Thing.Name=7"}),
+                ElementsAre("Thing=ref:Test_Thing.Name=7: position 27: key Name of Test_Thing is text in quotes",
+                            "Start has no parameter Thing; its parameters: Level"));
+    EXPECT_THAT(remarks({"modify", "Test_Thing", "Sped=1"}),
+                ElementsAre("Test_Thing has no property Sped; did you mean Speed?"));
 }
 
 TEST(Requests, TextsThatCannotBeReadAreNamed) {

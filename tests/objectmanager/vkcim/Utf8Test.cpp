@@ -36,5 +36,14 @@ TEST(Utf8, PrintableTextStaysOnItsLineAndSteersNoTerminal) {
     EXPECT_EQ(printable("\xc2\xa0\xc3\xa9\xff"), "\xc2\xa0\xc3\xa9" REPLACED);
 }
 
+TEST(Utf8, MessagesKeepTheBeginningAndTheEndOfALongText) {
+    EXPECT_EQ(shortened("a\nb"), "a\\nb");
+    EXPECT_EQ(shortened(std::string(800, 'x')), std::string(800, 'x'));
+    const std::string cut = shortened("path " + std::string(5000000, 'x') + ": position 7");
+    EXPECT_EQ(cut.size(), 405u);
+    EXPECT_EQ(cut.substr(0, 6), "path x");
+    EXPECT_EQ(cut.substr(cut.size() - 13), "x: position 7");
+}
+
 } // namespace
 } // namespace vkcim

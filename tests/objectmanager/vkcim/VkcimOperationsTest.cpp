@@ -51,8 +51,12 @@ TEST(VkcimOperations, ThePathsKeysReachTheProvider) {
     EXPECT_EQ(answer({"get", "Echo_Thing", "--namespace", "root/y"}).at("results").at(0).at("namespace"), "root/y");
 }
 
-TEST(VkcimOperations, GetOfAnUnknownInstanceAnswersNothing) {
-    const json nothing = answer({"get", R"(Echo_Missing.Name="x")"});
+TEST(VkcimOperations, GetOfAnUnknownInstanceFindsNothing) {
+    const support::Outcome outcome = vkcim({"get", R"(Echo_Missing.Name="x")"});
+    EXPECT_EQ(outcome.status, 4);
+    EXPECT_EQ(outcome.output, "");
+    EXPECT_EQ(outcome.error, "vkcim: no such instance: Echo_Missing.Name=\"x\"\n");
+    const json nothing = json::parse(vkcim({"--format", "json", "get", R"(Echo_Missing.Name="x")"}).output);
     EXPECT_EQ(nothing.at("results"), json::array());
     EXPECT_EQ(nothing.at("done"), true);
     EXPECT_EQ(nothing.at("status").at("name"), "CMPI_RC_OK");
@@ -77,7 +81,40 @@ TEST(VkcimOperations, ModifySendsTypedValues) {
         "vkcim: CMPI_RC_ERR_FAILED (1): A 8336 [2][11]; B 5632 \"text\"; C 128 null; D 5632 \"\"; E 160 7; no list\n");
     EXPECT_EQ(vkcim({"modify", "Echo_Thing", "A=1", "--properties", "X"}).error,
               "vkcim: CMPI_RC_ERR_FAILED (1): A 160 1; X\n");
-    EXPECT_EQ(answer({"modify", "Echo_Quiet", "A=1"}).at("results"), json::array());
+    EXPECT_EQ(json::parse(vkcim({"--format", "json", "modify", "Echo_Quiet", "A=1"}).output).at("results"),
+              json::array());
+}
+
+TEST(VkcimOperations, ModifySaysWhatDidNotTakeEffect) {
+    const support::Outcome lost = vkcim({"modify", "Echo_Quiet", "A=1", "Operation=GetInstance"});
+    EXPECT_EQ(lost.status, 4);
+    EXPECT_EQ(lost.error, "vkcim: not changed: A has no value\n");
+    EXPECT_EQ(vkcim({"modify", "Echo_Quiet", "Operation=GetInstance"}).status, 0);
+}
+
+TEST(VkcimOperations, ValueIsBareAndOneALine) {
+    const support::Outcome value = vkcim({"value", "Echo_Everything", "U64"});
+    EXPECT_EQ(value.status, 0);
+    EXPECT_EQ(value.output, "18446744073709551615\n");
+    EXPECT_EQ(vkcim({"value", R"(Echo_Thing.Name="x")", "keyname"}).output, "x\n");
+    EXPECT_EQ(vkcim({"value", "Echo_Everything", "Array"}).output, "11\n") << "an element that is null is no value";
+    const support::Outcome none = vkcim({"value", "Echo_Everything", "Null"});
+    EXPECT_EQ(none.status, 4);
+    EXPECT_EQ(none.error, "vkcim: Null of Echo_Everything has no value\n");
+    EXPECT_EQ(vkcim({"value", "Echo_Fail", "Null"}).status, 1);
+}
+
+TEST(VkcimOperations, ADryRunSaysWhatWouldBeAskedAndAsksNothing) {
+    const support::Outcome dry = vkcim({"modify", "Echo_Fail.Name=\"a\"", "A=1", "--dry-run"});
+    EXPECT_EQ(dry.status, 0) << "Echo_Fail answers an error when it is asked";
+    EXPECT_THAT(dry.output, testing::MatchesRegex("host      this host, .*\n"
+                                                  "provider  Echo in .*\n"
+                                                  "path      Echo_Fail.Name=\"a\"\n"
+                                                  "modify\n"
+                                                  "  A=uint32:1\n"
+                                                  "Nothing was asked.\n"));
+    EXPECT_THAT(vkcim({"invoke", "Echo_Fail", "Run", "--dry-run"}).output, HasSubstr("\ninvoke    Run\n"));
+    EXPECT_EQ(support::runCommand({VKCIM, "--library", "/nowhere", "invoke", "A", "m", "--dry-run"}).status, 3);
 }
 
 TEST(VkcimOperations, CreateAnswersThePath) {

@@ -2,8 +2,9 @@
 
 #include "support/SmbiosImage.h"
 #include "vk/HostFacts.h"
+#include "vk/HostNotes.h"
 
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
 #include <cstdlib>
 #include <functional>
@@ -112,6 +113,35 @@ TEST_F(InstrumentationTest, SaysInANoteWhyATreeIsEmpty) {
         cursor.selectNode(Lexicon::ComputerSystemNode);
         EXPECT_FALSE(bool(cursor));
         EXPECT_EQ(hostNotes().front(), file + ": No such file or directory");
+    });
+}
+
+/// What a function of vk/HostNotes.h hands over, each line ended.
+std::string handed(void (*ask)(VkHostNote, void*)) {
+    std::string all;
+    ask([](void* context, const char* note) { static_cast<std::string*>(context)->append(note) += '\n'; }, &all);
+    return all;
+}
+
+TEST_F(InstrumentationTest, SaysWhichHostItReadsAndWhyItCannot) {
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", directory.path(), [this] {
+        EXPECT_EQ(handed(vkHostProblem), "");
+        EXPECT_EQ(handed(vkHostSource), "the snapshot in " + directory.path() + '\n');
+    });
+    const std::string gone = directory.path("gone");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", gone,
+                    [&gone] { EXPECT_EQ(handed(vkHostProblem), gone + ": No such file or directory\n"); });
+    directory.write("file", "{}");
+    const std::string file = directory.path("file");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", file,
+                    [&file] { EXPECT_EQ(handed(vkHostProblem), file + ": Not a directory\n"); });
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", file, [&file] {
+        EXPECT_THAT(handed(vkHostProblem), testing::StartsWith(file + ": "));
+        EXPECT_EQ(handed(vkHostSource), "the simulated host in " + file + '\n');
+    });
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_ROOT", std::string(), [] {
+        EXPECT_EQ(handed(vkHostProblem), "");
+        EXPECT_EQ(handed(vkHostSource), "");
     });
 }
 

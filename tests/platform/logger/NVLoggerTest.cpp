@@ -1,3 +1,4 @@
+#include "nvlog/LogWatch.h"
 #include "nvlog/NVLogger.h"
 
 #include "platform/logger/LoggingProcess.h"
@@ -37,8 +38,52 @@ TEST(Syslog, GetsTheLogChannelsNoticesAndFailuresByDefault) {
             log("dropped", 4000);
             trace("dropped");
         });
-        EXPECT_EQ(lines, "3 LOG 6000 Norvane.Test NVLoggerTest:7 run: kept\n");
+        EXPECT_THAT(lines, EndsWith("3 LOG 6000 Norvane.Test NVLoggerTest:7 run: kept\n"));
+        EXPECT_EQ(splitLines(lines).size(), variables.empty() ? 1U : 2U);
     }
+}
+
+TEST(UnknownSettings, AreNamedInOneLineWhateverIsKept) {
+    const auto first = [](const Environment& variables) {
+        const std::vector<std::string> lines = splitLines(withEnvironment(variables, [] {
+            trace("dropped", 17);
+            log("dropped", 17);
+        }));
+        EXPECT_LE(lines.size(), 1U);
+        return lines.empty() ? std::string() : lines.front();
+    };
+    EXPECT_THAT(first({{"NVLOG_SINK", "console"}, {"NVLOG_LEVELS", "4000,lots"}, {"NVLOG_CHANNELS", "trace"}}),
+                EndsWith("readSettings: not understood: NVLOG_SINK=console, NVLOG_LEVELS=lots"));
+    EXPECT_THAT(first({{"NVLOG_CHANNELS", "log,traces\n"}}), EndsWith("not understood: NVLOG_CHANNELS=traces\\n"));
+    EXPECT_EQ(first({{"NVLOG_SINK", "none"}, {"NVLOG_LEVELS", "lots"}}), "");
+    EXPECT_EQ(first({{"NVLOG_LEVELS", "3000,,6000,"}, {"NVLOG_CHANNELS", " log "}}), "");
+}
+
+TEST(UnknownSettings, GoToTheSinkThatIsKnown) {
+    TemporaryDirectory directory;
+    quietly({{"NVLOG_SINK", "file:" + directory.path("log")}, {"NVLOG_LEVELS", "many"}}, [] { log("x"); });
+    EXPECT_THAT(splitLines(directory.read("log")),
+                ElementsAre(EndsWith(" readSettings: not understood: NVLOG_LEVELS=many"), EndsWith(" run: x")));
+}
+
+TEST(LogWatch, SeesTheLinesOfTheLogChannelThatAreKept) {
+    quietly({{"NVLOG_SINK", "file:/dev/null"}, {"NVLOG_LEVELS", "3000,6000"}}, [] {
+        std::vector<std::string> seen;
+        const NVLogWatch watch = {[](void* context, int level, const char* text) {
+                                      static_cast<std::vector<std::string>*>(context)->push_back(
+                                          std::to_string(level) + text);
+                                  },
+                                  &seen};
+        log("before");
+        nvLogWatch(&watch);
+        log("a");
+        log("b", 3000);
+        log("dropped", 4000);
+        trace("c");
+        nvLogWatch(nullptr);
+        log("after");
+        EXPECT_THAT(seen, ElementsAre("6000a", "3000b"));
+    });
 }
 
 TEST(StandardError, GetsTheSameLines) {

@@ -71,6 +71,22 @@ TEST(Settings, PassOverWhatIsNoLevel) {
     }
 }
 
+TEST(Settings, NoteWhatCannotBeUsed) {
+    const auto unknown = [](const char* sink, const char* levels, const char* channels) {
+        return std::string(parseSettings(sink, levels, channels).unknown.data());
+    };
+    EXPECT_EQ(unknown(nullptr, nullptr, nullptr), "");
+    for (const char* sink : {"", "syslog", "stderr", "none", "file:/x"}) EXPECT_EQ(unknown(sink, "all", "log"), "");
+    EXPECT_EQ(unknown("STDERR", "50x, all,Lots", "log,x"),
+              "NVLOG_SINK=STDERR, NVLOG_LEVELS=50x, NVLOG_LEVELS=Lots, NVLOG_CHANNELS=x");
+    EXPECT_EQ(unknown("file:", nullptr, nullptr), "NVLOG_SINK=file:");
+    const std::string tooLong = "file:" + std::string(PATH_MAX, 'x');
+    EXPECT_EQ(unknown(tooLong.c_str(), nullptr, nullptr), "NVLOG_SINK=" + tooLong.substr(0, 40));
+    std::string many;
+    for (int i = 0; i < 100; ++i) many += "level,";
+    EXPECT_EQ(unknown(nullptr, many.c_str(), nullptr).size(), 239U) << "as much as there is room for";
+}
+
 TEST(Settings, KeepAllLevelsWhenTheListIsTooLong) {
     std::string list;
     for (std::size_t i = 0; i < Settings::maxLevels; ++i) list += std::to_string(i) + ",";
