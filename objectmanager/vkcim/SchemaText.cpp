@@ -100,8 +100,13 @@ std::string classText(const om::ClassDeclaration& declared, const om::Schema& sc
     for (const om::PropertyDeclaration& property : declared.properties) text += propertyText(property);
     if (!declared.methods.empty()) text += "\nMethods\n";
     for (const om::MethodDeclaration& method : declared.methods) text += methodText(method);
-    return text + inherited(declared, schema, "Inherited properties", &om::ClassDeclaration::properties) +
-           inherited(declared, schema, "Inherited methods", &om::ClassDeclaration::methods) + derived(declared, schema);
+    // A provider supplies what its class declares itself.
+    const std::vector<std::string> served = schema.served();
+    const bool isServed = std::find(served.begin(), served.end(), declared.name) != served.end();
+    const char* properties = isServed ? "Inherited properties, not supplied here" : "Inherited properties";
+    const char* methods = isServed ? "Inherited methods, not offered here" : "Inherited methods";
+    return text + inherited(declared, schema, properties, &om::ClassDeclaration::properties) +
+           inherited(declared, schema, methods, &om::ClassDeclaration::methods) + derived(declared, schema);
 }
 
 } // namespace vkcim

@@ -155,7 +155,8 @@ TEST_F(ThrowingLogger, MayFailAtAnyCall) {
                                                                    {"REPLACEMENT_IN", operation},
                                                                    {"REPLACEMENT_SELDOM", "1"}},
                          {"--repeat", "500"});
-            EXPECT_EQ(finished.exitStatus, 0) << thrown << " in " << operation;
+            // 4 where the last answer lost its instance.
+            EXPECT_THAT(finished.exitStatus, testing::AnyOf(0, 4)) << thrown << " in " << operation;
             EXPECT_EQ(answerOf(finished)["status"]["name"], "CMPI_RC_OK") << thrown << " in " << operation;
         }
     }

@@ -41,10 +41,12 @@ TEST(SchemaText, DescribesMethodsWithTheirParameters) {
     EXPECT_THAT(service, HasSubstr("\nMethods\n  ManageTime(): uint32\n      Tells or sets the host's time."));
     EXPECT_THAT(service, HasSubstr("\n    TimeData: datetime, in and out\n      The time to set"));
     EXPECT_THAT(service, HasSubstr("\n    ManagedElement: ref to CIM_ManagedElement, in\n"));
-    EXPECT_THAT(service, HasSubstr("\nInherited methods\n  StartService, StopService\n"));
-    EXPECT_THAT(service,
-                HasSubstr("\nInherited properties\n  PrimaryOwnerName, PrimaryOwnerContact, StartMode, Started, "
-                          "EnabledState,"));
+    EXPECT_THAT(service, HasSubstr("\nInherited methods, not offered here\n  StartService, StopService\n"));
+    EXPECT_THAT(
+        service,
+        HasSubstr(
+            "\nInherited properties, not supplied here\n  PrimaryOwnerName, PrimaryOwnerContact, StartMode, Started, "
+            "EnabledState,"));
 }
 
 TEST(SchemaText, DescribesAClassOfTheStandardByItsNames) {
