@@ -10,7 +10,7 @@ from support import directory, install, run
 SOURCE = Path(__file__).resolve().parents[2]
 PREFIX = "/opt/vk"
 WRAPPER, SCRIPT = f"{PREFIX}/lib/vk/ntp/ntpd", f"{PREFIX}/lib/vk/ntp/ntp"
-NO_ANSWER = "has no usable answer of a server within 1 seconds"
+NO_RESULT = "did not synchronise the clock within 1 seconds"
 SYSTEM = ("/usr/bin", "/usr/lib", "/usr/lib64")
 MADE = directory()
 install(PREFIX, destdir=MADE, component="ntp")
@@ -116,8 +116,8 @@ class RunningChronyd(Test):
 
     def test_gives_the_reason(self):
         for answers, reason in [({"burst": "501 Not authorised"}, "chronyd: 501 Not authorised"),
-                                ({"answer": ":"}, f"chronyd {NO_ANSWER}"),
-                                ({"synchronised": "no"}, f"chronyd {NO_ANSWER}"),
+                                ({"answer": ":"}, f"chronyd {NO_RESULT}"),
+                                ({"synchronised": "no"}, f"chronyd {NO_RESULT}"),
                                 ({"offset": "7.000000000", "step": "500 Failure"},
                                  "chronyd cannot step the clock by 7.000000000 seconds: 500 Failure")]:
             with self.subTest(answers):
@@ -127,8 +127,14 @@ class RunningChronyd(Test):
 class Timesyncd(Test):
     ANSWER = "mkdir -p /run/systemd/timesync; : >/run/systemd/timesync/synchronized"
 
-    def host(self, offset, start=ANSWER, active=True):
-        return Host(timedatectl=f'echo "       Server: 10.99.0.1"; echo "       Offset: {offset}"').with_systemd(
+    TIMEDATECTL = """
+case "$*" in
+"show -p NTPSynchronized --value") echo {kernel} ;;
+timesync-status) echo "       Server: 10.99.0.1"; echo "       Offset: {offset}" ;;
+esac"""
+
+    def host(self, offset, start=ANSWER, active=True, kernel="yes"):
+        return Host(timedatectl=self.TIMEDATECTL.format(offset=offset, kernel=kernel)).with_systemd(
             "systemd-timesyncd", start=start, active=active)
 
     def test_is_restarted_and_its_offset_passed_on(self):
@@ -141,7 +147,8 @@ class Timesyncd(Test):
                 self.assertIn("systemctl restart systemd-timesyncd", host.calls())
 
     def test_gives_the_reason(self):
-        self.refuse(self.host("+1ms", start=":"), f"systemd-timesyncd {NO_ANSWER}")
+        self.refuse(self.host("+1ms", start=":"), f"systemd-timesyncd {NO_RESULT}")
+        self.refuse(self.host("+1ms", kernel="no"), f"systemd-timesyncd {NO_RESULT}")
         self.refuse(self.host("+1ms", start="exit 1"), "systemd-timesyncd cannot be restarted")
 
     def test_is_not_started_where_it_does_not_run(self):
@@ -159,7 +166,7 @@ class OneShot(Test):
                     "ntpsec: ntpd[19]: IO: unable to bind")
 
     def test_of_ntpsec_has_a_time_limit(self):
-        self.refuse(Host(ntpd=ntpd("ntpd ntpsec-1.2.2", "greeting", end="exec sleep 100")), f"ntpsec {NO_ANSWER}")
+        self.refuse(Host(ntpd=ntpd("ntpd ntpsec-1.2.2", "greeting", end="exec sleep 100")), f"ntpsec {NO_RESULT}")
 
     def openntpd(self, *lines, end="exec sleep 100"):
         return Host(ntpd=ntpd("usage: ntpd [-dnSsv] [-f file] [-p file]", "ntp engine ready", *lines, end=end))
@@ -177,7 +184,7 @@ class OneShot(Test):
         self.refuse(self.openntpd("settimeofday: Operation not permitted"), "openntpd: settimeofday: Operation not permitted")
         self.refuse(self.openntpd("/etc/openntpd/ntpd.conf:1: syntax error", end="exit 1"),
                     "openntpd: /etc/openntpd/ntpd.conf:1: syntax error")
-        self.refuse(self.openntpd(), f"openntpd {NO_ANSWER}")
+        self.refuse(self.openntpd(), f"openntpd {NO_RESULT}")
 
     def test_of_chronyd_sets_the_clock(self):
         wrong = "2026-11-22T08:01:24Z System clock wrong by {} seconds (step)"
@@ -185,6 +192,8 @@ class OneShot(Test):
                 ([wrong.format("-0.000013")], 0, "time set -0.000013s"), ([wrong.format("12.5")], 0, "time set +12.5s"),
                 ([wrong.format("0.1"), "2026-11-22T08:01:24Z Could not step system clock"], 0,
                  "not synchronised: chronyd: Could not step system clock"),
+                ([wrong.format("0.1"), "2026-11-22T08:01:24Z Fatal error : no room"], 1,
+                 "not synchronised: chronyd: Fatal error : no room"),
                 (["2026-11-22T08:01:24Z Timeout reached"], 1, "not synchronised: chronyd: Timeout reached"),
                 (["2026-11-22T08:01:24Z Fatal error : adjtimex(0x8001) failed"], 1,
                  "not synchronised: chronyd: Fatal error : adjtimex(0x8001) failed")]:
