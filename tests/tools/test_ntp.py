@@ -61,15 +61,15 @@ class Host:
         return self.add("usr/sbin/systemctl", SYSTEMCTL.format(unit=unit, start=start, stop=stop))
 
     def run(self, *command, **env):
-        env = {"PATH": "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin", "VK_NTP_LIMIT": "1"} | env
+        env = {"PATH": "/usr/local/sbin:/usr/local/bin:/usr/sbin:/usr/bin", **env}
         words = ["bwrap", "--unshare-all", "--die-with-parent", "--bind", self.root, "/", "--ro-bind", MADE / "opt", "/opt"]
         for place in filter(os.path.isdir, SYSTEM):
             words += ["--ro-bind", place, place]
         return run(*words, "--proc", "/proc", "--dev", "/dev", *command, env=env)
 
-    def synchronise(self):
+    def synchronise(self, limit=60):
         """The first line, which is all that the time service reads."""
-        return self.run(WRAPPER, "-xgq").stdout.partition("\n")[0]
+        return self.run(WRAPPER, "-xgq", VK_NTP_LIMIT=str(limit)).stdout.partition("\n")[0]
 
     def control(self, action):
         return self.run(SCRIPT, action).stdout.partition("\n")[0]
@@ -99,7 +99,7 @@ class Test(unittest.TestCase):
             raise unittest.SkipTest("bubblewrap is missing, or makes no file systems here")
 
     def expect(self, host, line):
-        self.assertEqual(host.synchronise(), f"ntpd: {line}")
+        self.assertEqual(host.synchronise(limit=1 if NO_RESULT in line else 60), f"ntpd: {line}")
 
     def refuse(self, host, reason):
         self.expect(host, f"not synchronised: {reason}")
@@ -201,7 +201,7 @@ class OneShot(Test):
                 said = "".join(f'echo "{each}" >&2\n' for each in [*lines, "2026-11-22T08:01:24Z chronyd exiting"])
                 host = Host(chronyc="exit 1", chronyd=f"{said}exit {status}")
                 self.expect(host, line)
-                self.assertEqual(host.calls()[-1], "chronyd -q -t 1")
+                self.assertEqual(host.calls()[-1], "chronyd -q -t 60")
 
 
 class Handing(Test):
@@ -322,8 +322,8 @@ class Setup(Test):
         host.setup("install")
         for path, found in [("/usr/local/sbin:/usr/sbin", "/usr/local/sbin/ntpd"), ("/usr/sbin:/usr/bin", "/usr/sbin/ntpd"),
                             ("/usr/bin", "no ntpd")]:
-            done = host.run("/bin/sh", "-c", f"cp /usr/bin/sleep /tmp/sfcbd; PATH={path} /tmp/sfcbd 100 & sleep 0.2; "
-                            f"{PREFIX}/sbin/vk-ntp-setup status")
+            done = host.run("/bin/sh", "-c", f"cp /usr/bin/sleep /tmp/sfcbd; PATH={path} /tmp/sfcbd 100 & "
+                            f"until grep -q sfcbd /proc/$!/comm; do sleep 0.1; done; {PREFIX}/sbin/vk-ntp-setup status")
             self.assertRegex(done.stdout, rf"(?m)^sfcbd \d+: finds {found} in its PATH {path}$")
 
     def test_refuses_unusable_arguments(self):
