@@ -43,6 +43,7 @@ endif()
 # The prefix is known to the programs, so it cannot be changed while packing.
 set(CPACK_SET_DESTDIR ON)
 set(CPACK_PACKAGING_INSTALL_PREFIX ${CMAKE_INSTALL_PREFIX})
+include(NtpPackage)
 
 # What Debian asks of every package, and compressed manual pages.
 if(VK_PACKAGING)

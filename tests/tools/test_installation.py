@@ -36,6 +36,8 @@ class Contents(unittest.TestCase):
                      "share/vk-baseserver/examples/rack-server.json",
                      "share/doc/vk-baseserver-tools/vkcim.schema.json",
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
+        expected += ["lib/vk/ntp/daemons.sh", "lib/vk/ntp/ntp", "lib/vk/ntp/ntpd", "sbin/vk-ntp-setup",
+                     "share/man/man8/vk-ntp-setup.8"]
         expected += [f"share/vk-baseserver/register/{path.name}" for path in (SOURCE / "tools/register").glob("*.py")]
         expected += [f"lib/pkgconfig/{name}.pc" for name in LIBRARIES[:-1] + ["vk-cmpi"]]
         expected += [f"lib/cmake/vk-baseserver/vk-baseserver-config{part}.cmake"
@@ -44,9 +46,9 @@ class Contents(unittest.TestCase):
         expected += [f"include/vk-baseserver/{h.relative_to(SOURCE / 'platform/include')}" for h in headers]
         self.assertEqual([str(p.relative_to(PREFIX)) for p in files_below(PREFIX)], sorted(expected))
 
-    def test_each_component_alone_holds_its_part_and_all_three_everything(self):
+    def test_each_component_alone_holds_its_part_and_all_of_them_everything(self):
         parts = []
-        for component in ("provider", "tools", "development"):
+        for component in ("provider", "tools", "development", "ntp"):
             where = directory() / "p"
             install(where, component=component)
             parts += [str(p.relative_to(where)) for p in files_below(where)]
