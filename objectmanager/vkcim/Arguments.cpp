@@ -171,12 +171,12 @@ private:
     }
 
     std::string explain(const CLI::Error& error) const {
-        if (error.what() == std::string(CLI::RequiredError(assignment).what()))
-            return CLI::RequiredError(readable(assignment)).what();
         for (const std::string& word : app.remaining(true)) {
             if (word.size() > 1 && word.front() == '-')
                 return "there is no option '" + word + "'" + didYouMean(nearestName(word, optionNames()));
         }
+        if (error.what() == std::string(CLI::RequiredError(assignment).what()))
+            return CLI::RequiredError(readable(assignment)).what();
         if (!app.get_subcommands().empty() ||
             error.get_exit_code() != static_cast<int>(CLI::ExitCodes::RequiredError)) {
             return error.what();
