@@ -7,8 +7,8 @@ cd "$here"
 . scripts/common.sh
 # shellcheck disable=SC2086
 install_packages $build_packages
-# The tests are most of the tree; test.sh builds them.
-build_tree release build vkcim vknabaseserverprofileprovider schema_files provider-bench
+# The tests are most of the tree; test.sh builds them, and the benchmarks.
+build_tree release build vkcim vknabaseserverprofileprovider
 cd "$caller"
 [ $# -gt 0 ] || set -- report
 exec "$here/build/bin/vkcim" "$@"

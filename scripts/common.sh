@@ -37,16 +37,57 @@ install_packages() {
     rm -f "$log"
 }
 
-# build_tree PRESET FOLDER [TARGET...]: configures once and builds all, or the targets; the output goes to
-# FOLDER/build.log.
+# Whether a tree was configured for this checkout. One that was copied or moved with its checkout is not, and would build
+# the sources of the place that it was configured for.
+configured_here() {
+    local home
+    home=$(sed -n 's/^CMAKE_HOME_DIRECTORY:INTERNAL=//p' "$1/CMakeCache.txt" 2>/dev/null) || return
+    [ "$home" -ef "$PWD" ]
+}
+
+# show_progress TEXT: passes on what cmake and ninja print, and shows on standard error how far they are: on a terminal in
+# one line, which is gone at the end; elsewhere the text is printed once. Where nothing is to be done nothing is shown.
+show_progress() {
+    local line step shown="" terminal=""
+    if [ -t 2 ] && [ "${TERM:-dumb}" != dumb ]; then terminal=yes; fi
+    while IFS= read -r line || [ -n "$line" ]; do
+        printf '%s\n' "$line"
+        if [[ $line == "-- "* ]]; then
+            step=configuring
+        elif [[ $line =~ ^\[([0-9]+)/([0-9]+)\]\  ]]; then
+            step="building: ${BASH_REMATCH[1]} of ${BASH_REMATCH[2]}"
+        else
+            continue
+        fi
+        if [ -n "$terminal" ]; then
+            printf '\r\033[K%s' "$step" >&2
+        elif [ -z "$shown" ]; then
+            printf '%s\n' "$1" >&2
+        fi
+        shown=yes
+    done
+    if [ -n "$terminal" ] && [ -n "$shown" ]; then printf '\r\033[K' >&2; fi
+}
+
+# configure_tree PRESET DIRECTORY: once, and anew where the tree is another checkout's.
+configure_tree() {
+    if [ -f "$2/build.ninja" ] && configured_here "$2"; then return; fi
+    # Written last: without it a configuration that failed is not taken for one that is done.
+    rm -f "$2/build.ninja"
+    cmake --fresh --preset "$1"
+}
+
+# build_tree PRESET DIRECTORY [TARGET...]: configures and builds all, or the targets; the output goes to DIRECTORY/build.log.
 build_tree() {
     local preset=$1 directory=$2
     shift 2
     local log="$PWD/$directory/build.log"
-    mkdir -p "$directory"
-    if ! { { [ -f "$directory/build.ninja" ] || cmake --preset "$preset"; } &&
-        cmake --build "$directory" ${1:+--target "$@"}; } >"$log" 2>&1 </dev/null; then
-        grep -E 'error|Error|FAILED' "$log" | head -n 15 >&2
+    # Tried first: bash goes on as if all were well where it cannot open the file that a group of commands writes to.
+    { mkdir -p "$directory" && true >"$log"; } 2>/dev/null ||
+        die "cannot write $log, which belongs to $(stat -c %U "$log" "$directory" . 2>/dev/null | head -n 1); remove $directory, or build as its owner"
+    if ! { configure_tree "$preset" "$directory" && cmake --build "$directory" ${1:+--target "$@"}; } 2>&1 </dev/null |
+        show_progress "building the $preset tree in $directory" >"$log"; then
+        grep -E 'error|Error|FAILED' "$log" | head -n 15 >&2 || true
         die "building the $preset tree failed; the whole output is in $log"
     fi
 }

@@ -21,6 +21,20 @@ constexpr std::size_t mostTimes = 100000000; // each is kept until the end: 8 by
 
 const std::map<std::string, Format> formats = {{"text", Format::Text}, {"mof", Format::Mof}, {"json", Format::Json}};
 
+/// The positional that is shown as NAME=VALUE: CLI11 from 2.4 on refuses a name with '=' in it.
+const std::string assignment = "ASSIGNMENT";
+
+std::string readable(const std::string& name) {
+    return name == assignment ? "NAME=VALUE" : name;
+}
+
+class HelpFormat : public CLI::Formatter {
+public:
+    std::string make_option_name(const CLI::Option* option, bool positional) const override {
+        return readable(CLI::Formatter::make_option_name(option, positional));
+    }
+};
+
 /// The option `--properties A,B`: an empty text is an empty list.
 std::vector<std::string> splitNames(const std::string& text) {
     std::vector<std::string> names;
@@ -65,6 +79,7 @@ public:
         app.set_help_flag("-h,--help", "Print this and exit");
         app.require_subcommand(1, 1);
         app.fallthrough();
+        app.formatter(std::make_shared<HelpFormat>());
         app.get_formatter()->label("SUBCOMMAND", "COMMAND");
         app.get_formatter()->label("REQUIRED", "");
         app.footer(
@@ -160,6 +175,8 @@ private:
             if (word.size() > 1 && word.front() == '-')
                 return "there is no option '" + word + "'" + didYouMean(nearestName(word, optionNames()));
         }
+        if (error.what() == std::string(CLI::RequiredError(assignment).what()))
+            return CLI::RequiredError(readable(assignment)).what();
         if (!app.get_subcommands().empty() ||
             error.get_exit_code() != static_cast<int>(CLI::ExitCodes::RequiredError)) {
             return error.what();
@@ -175,7 +192,7 @@ private:
         sub->group("Commands");
         const std::string warning = *command.warning ? command.warning + std::string("\n\n") : "";
         sub->footer(warning + "Example:\n  " + command.example + "\nOptions of every command: vkcim --help");
-        const auto add = [&](const char* name, auto& text, bool required, const char* about) {
+        const auto add = [&](const std::string& name, auto& text, bool required, const char* about) {
             sub->add_option(name, text, about)->required(required)->type_name("");
         };
         if (command.takes == Takes::Class) add("CLASS", arguments.subject, true, "Name of a class");
@@ -185,8 +202,7 @@ private:
         if (command.takes == Takes::Command) add("COMMAND", arguments.subject, false, "Name of a command");
         if (command.member) add(command.member, arguments.member, true, "Its name");
         if (command.assignments) {
-            add("NAME=VALUE", arguments.assignments, command.needsAssignments,
-                "Names and values, as many as there are");
+            add(assignment, arguments.assignments, command.needsAssignments, "Names and values, as many as there are");
         }
     }
 

@@ -13,7 +13,7 @@
 namespace vkcim {
 namespace {
 
-std::string quoted(std::string_view text) {
+std::string inQuotes(std::string_view text) {
     std::string literal = "\"";
     for (const char c : cleanUtf8(text)) {
         const auto byte = static_cast<unsigned char>(c);
@@ -103,11 +103,11 @@ private:
             return '{' + list + '}';
         }
         if (const auto* embedded = std::get_if<std::shared_ptr<const om::Instance>>(&value.data)) {
-            return *embedded ? quoted(instance(**embedded)) : "NULL";
+            return *embedded ? inQuotes(instance(**embedded)) : "NULL";
         }
         std::string number = numberText(value);
         if (!number.empty()) return number;
-        return quoted(plainText(value, {nameSpace, schema}));
+        return inQuotes(plainText(value, {nameSpace, schema}));
     }
 
     const std::string& nameSpace;

@@ -20,9 +20,10 @@ using Arguments = std::vector<std::string>;
 
 const Arguments getOne = {"get", R"(VESKA_ComputerSystem.CreationClassName="VESKA_ComputerSystem",Name="node7")"};
 
-/// A process of its own, in which the sanitizers accept libraries that are loaded before theirs.
+/// A process of its own, in which the sanitizers accept libraries that are loaded before theirs. The library is named
+/// as seen from its directory, since the list of those to preload is cut at blanks.
 Environment preloading(const std::string& library) {
-    return {{"LD_PRELOAD", library}, {"ASAN_OPTIONS", "verify_asan_link_order=0"}};
+    return {{"LD_PRELOAD", "./" + library}, {"ASAN_OPTIONS", "verify_asan_link_order=0"}};
 }
 
 Environment operator+(Environment environment, const Environment& more) {
@@ -32,7 +33,7 @@ Environment operator+(Environment environment, const Environment& more) {
 
 test::CommandResult askChild(const Arguments& command, const Environment& environment, const Arguments& options = {}) {
     // The variables are for vkcim alone: what starts it must not be made to preload anything.
-    std::string line = "timeout -k 5 60 env";
+    std::string line = "cd " + test::quoted(REPLACEMENTS) + " && timeout -k 5 60 env";
     for (const auto& [name, value] : environment) line += " " + name + "=" + test::quoted(value);
     for (const char* word : {VKCIM, "--library", VK_PROVIDER_LIBRARY, "--format", "json"})
         line += " " + test::quoted(word);

@@ -39,7 +39,9 @@ const TracedHost tracedHosts[] = {
 };
 
 void simulateHost(const TracedHost& host) {
-    test::simulate(host.nodes(), {{"rootDirectory", "/opt/vk/platform/"}, {"kvm", false}});
+    test::simulate(
+        host.nodes(),
+        {{"architecture", "x86_64"}, {"uid", "uid-1"}, {"rootDirectory", "/opt/vk/platform/"}, {"kvm", false}});
 }
 
 /// The host's own name, as a whole value.

@@ -123,6 +123,13 @@ TEST(Arguments, AMistypedCommandIsAnsweredWithTheNearestOne) {
     EXPECT_THAT(parseArguments({"help", "reprot"}).error, HasSubstr("no command 'reprot'; did you mean report?"));
 }
 
+TEST(Arguments, ValuesAreCalledAsTheyAreWritten) {
+    EXPECT_THAT(parseArguments({"modify", "--help"}).output, HasSubstr(" PATH NAME=VALUE...\n"));
+    EXPECT_THAT(parseArguments({"modify", "--help"}).output, HasSubstr("\n  NAME=VALUE ... "));
+    EXPECT_THAT(parseArguments({"invoke", "--help"}).output, HasSubstr(" PATH METHOD [NAME=VALUE...]\n"));
+    EXPECT_EQ(parseArguments({"modify", "A"}).error, "vkcim: NAME=VALUE is required\nTry 'vkcim --help'.\n");
+}
+
 TEST(Arguments, UnusableOnesAreRefusedWithStatusTwo) {
     for (const Words& words : {Words{"--library", "", "names", "A"},
                                Words{"--provider", "", "names", "A"},

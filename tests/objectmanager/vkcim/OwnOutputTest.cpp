@@ -13,7 +13,7 @@ using support::Outcome;
 using testing::HasSubstr;
 using testing::Not;
 
-const std::string program = VKCIM " --library " ECHO_PROVIDER " --provider Echo ";
+const std::string program = "'" VKCIM "' --library '" ECHO_PROVIDER "' --provider Echo ";
 
 /// Runs the program by the shell, with a provider that prints on standard output.
 Outcome loudly(const std::string& command) {
@@ -53,7 +53,7 @@ TEST(OwnOutput, HoldsTheAnswerAloneOfAMethodThatRunsACommand) {
     const std::string output = host.path("output");
     const Outcome outcome =
         support::runCommand({"/bin/sh", "-c",
-                             "exec " VKCIM " --format json invoke VESKA_CIMServiceConfig SetCIMconfig "
+                             "exec '" VKCIM "' --format json invoke VESKA_CIMServiceConfig SetCIMconfig "
                              "deliveryRetryIntervalSec=30 >'" +
                                  output + "'"},
                             "", {{"VK_INSTRUMENTATION_TREE", host.path("tree.json")}, {"NVLOG_SINK", "none"}});

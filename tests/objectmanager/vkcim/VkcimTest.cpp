@@ -136,7 +136,8 @@ TEST(Vkcim, TheDefaultLibraryIsTheOneBesideTheProgram) {
 TEST(Vkcim, ALibraryOfTheWorkingDirectoryNeedsNoSlash) {
     const support::TemporaryDirectory directory;
     directory.link(ECHO_PROVIDER, "libecho.so");
-    const std::string command = "cd '" + directory.path() + "' && exec " VKCIM " --library libecho.so --provider Echo";
+    const std::string command =
+        "cd '" + directory.path() + "' && exec '" VKCIM "' --library libecho.so --provider Echo";
     const Outcome outcome = support::runCommand({"/bin/sh", "-c", command + " names Echo_Thing"});
     EXPECT_EQ(outcome.status, 0) << outcome.error;
 }
