@@ -6,8 +6,8 @@ namespace VK {
 
 std::string architectureOf(const Root& root) {
     if (!root.isLive()) {
-        const std::string told = root.read("/proc/sys/kernel/arch").text;
-        if (const std::string word = told.substr(0, told.find_first_of(" \t\r\n")); !word.empty()) return word;
+        const std::string contents = root.read("/proc/sys/kernel/arch").text;
+        if (const std::string word = contents.substr(0, contents.find_first_of(" \t\r\n")); !word.empty()) return word;
     }
     utsname name{};
     return uname(&name) == 0 ? static_cast<const char*>(name.machine) : std::string();

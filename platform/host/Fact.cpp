@@ -8,7 +8,7 @@ namespace {
 
 /// How much a miss says of why there is no text.
 unsigned int weight(const Fact& miss) {
-    if (!miss.useless.empty()) return 3;
+    if (!miss.placeholder.empty()) return 3;
     if (!miss.problem.empty() || miss.error != ENOENT) return 2;
     return 1;
 }
@@ -22,7 +22,7 @@ Fact missing(const std::string& source, int error) {
     return fact;
 }
 
-Fact told(const std::string& source, const std::string& text, FirmwareText kind) {
+Fact factOf(const std::string& source, const std::string& text, FirmwareText kind) {
     Fact fact;
     fact.source = source;
     if (!text.empty() && !isPlaceholder(text, kind)) {
@@ -30,7 +30,7 @@ Fact told(const std::string& source, const std::string& text, FirmwareText kind)
         return fact;
     }
     fact.error = ENOENT;
-    fact.useless = text;
+    fact.placeholder = text;
     return fact;
 }
 

@@ -52,10 +52,10 @@ std::vector<ChassisFacts> withoutTables(const Root& root, const Sysinfo& sysinfo
     facts.serial = fromSysfs(root, "chassis_serial");
     facts.type = typeFromText(textOfSysfs(root, "chassis_type"));
     if (facts.type == 0) facts.type = chassisTypeFromWord(fromDeviceTree(root, "chassis-type").text);
-    const bool told = facts.manufacturer || facts.version || facts.serial || facts.type != 0 ||
-                      fromDeviceTree(root, "model", FirmwareText::Model) || fromDeviceTree(root, "serial-number") ||
-                      sysinfo.model() || sysinfo["Sequence Code"];
-    return told ? std::vector<ChassisFacts>{facts} : std::vector<ChassisFacts>();
+    const bool hasFacts = facts.manufacturer || facts.version || facts.serial || facts.type != 0 ||
+                          fromDeviceTree(root, "model", FirmwareText::Model) || fromDeviceTree(root, "serial-number") ||
+                          sysinfo.model() || sysinfo["Sequence Code"];
+    return hasFacts ? std::vector<ChassisFacts>{facts} : std::vector<ChassisFacts>();
 }
 
 /// The tables' own word that there is no chassis holds only where they are whole.

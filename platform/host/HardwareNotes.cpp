@@ -9,13 +9,13 @@ namespace VK::Host {
 
 namespace {
 
-/// Why there is no text; `untold` for a host that simply does not have it.
-std::string reason(const Fact& fact, const std::string& untold) {
-    if (!fact.useless.empty()) return fact.source + " holds a placeholder, " + inQuotes(fact.useless);
+/// Why there is no text; `absence` for a host that simply does not have it.
+std::string reason(const Fact& fact, const std::string& absence) {
+    if (!fact.placeholder.empty()) return fact.source + " holds a placeholder, " + inQuotes(fact.placeholder);
     if (!fact.problem.empty()) return fact.source + " " + fact.problem;
     switch (fact.error) {
     case ENOENT:
-        return untold;
+        return absence;
     case EACCES:
     case EPERM:
         return fact.source + " may be read by root alone";

@@ -64,15 +64,15 @@ Fact Tables::withoutStructure() const {
 }
 
 Fact Tables::system(std::string SmbiosSystem::*text, FirmwareText kind) const {
-    return smbios.system ? told(tableFile, (*smbios.system).*text, kind) : withoutStructure();
+    return smbios.system ? factOf(tableFile, (*smbios.system).*text, kind) : withoutStructure();
 }
 
 Fact Tables::baseBoard(std::string SmbiosBaseBoard::*text, FirmwareText kind) const {
-    return smbios.baseBoard ? told(tableFile, (*smbios.baseBoard).*text, kind) : withoutStructure();
+    return smbios.baseBoard ? factOf(tableFile, (*smbios.baseBoard).*text, kind) : withoutStructure();
 }
 
 Fact Tables::chassis(const std::string& text, FirmwareText kind) {
-    return told(tableFile, text, kind);
+    return factOf(tableFile, text, kind);
 }
 
 std::vector<std::string> Tables::problems() const {
@@ -85,30 +85,31 @@ std::vector<std::string> Tables::problems() const {
 Fact fromSysfs(const Root& root, const char* name, FirmwareText kind) {
     const std::string file = std::string("/sys/class/dmi/id/") + name;
     const Root::Contents contents = root.read(file);
-    return contents ? told(file, cleanText(firstLine(contents.text)), kind) : missing(file, contents.error);
+    return contents ? factOf(file, cleanText(firstLine(contents.text)), kind) : missing(file, contents.error);
 }
 
 std::string textOfSysfs(const Root& root, const char* name) {
     const Fact fact = fromSysfs(root, name);
-    return fact ? fact.text : fact.useless;
+    return fact ? fact.text : fact.placeholder;
 }
 
 Fact fromDeviceTree(const Root& root, const char* name, FirmwareText kind) {
     const std::string file = std::string("/proc/device-tree/") + name;
     const Root::Contents contents = root.read(file);
-    return contents ? told(file, deviceTreeText(contents.text), kind) : missing(file, contents.error);
+    return contents ? factOf(file, deviceTreeText(contents.text), kind) : missing(file, contents.error);
 }
 
 Fact fromXen(const Root& root) {
     const std::string file = "/sys/hypervisor/uuid";
     const Root::Contents contents = root.read(file);
-    return contents ? told(file, cleanText(contents.text)) : missing(file, contents.error);
+    return contents ? factOf(file, cleanText(contents.text)) : missing(file, contents.error);
 }
 
 Sysinfo::Sysinfo(const Root& root) : contents(root.read(sysinfoFile)) {}
 
 Fact Sysinfo::value(const char* key, FirmwareText kind) const {
-    return contents ? told(sysinfoFile, sysinfoValue(contents.text, key), kind) : missing(sysinfoFile, contents.error);
+    return contents ? factOf(sysinfoFile, sysinfoValue(contents.text, key), kind)
+                    : missing(sysinfoFile, contents.error);
 }
 
 Fact Sysinfo::operator[](const char* key) const {
@@ -126,7 +127,7 @@ Fact asUuid(Fact fact) {
     const std::string uuid = uuidFromText(fact.text);
     if (uuid.empty()) {
         Fact shared = missing(fact.source, ENOENT);
-        shared.useless = fact.text;
+        shared.placeholder = fact.text;
         return shared;
     }
     fact.text = uuid;

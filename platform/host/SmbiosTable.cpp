@@ -34,9 +34,9 @@ SmbiosVersion mended(unsigned int major, unsigned int minor) {
     return {major, minor};
 }
 
-SmbiosEntryPoint unusable(const char* why) {
+SmbiosEntryPoint unusable(const char* problem) {
     SmbiosEntryPoint result;
-    result.problem = why;
+    result.problem = problem;
     return result;
 }
 
@@ -101,8 +101,8 @@ std::string_view SmbiosStructure::stringAt(std::size_t offset, std::size_t& badI
     return {};
 }
 
-std::nullopt_t SmbiosTable::stop(const char* why) {
-    broken = std::string(why) + " at byte " + std::to_string(size - rest.size());
+std::nullopt_t SmbiosTable::stop(const char* problem) {
+    broken = std::string(problem) + " at byte " + std::to_string(size - rest.size());
     rest = {};
     return std::nullopt;
 }

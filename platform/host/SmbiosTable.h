@@ -59,7 +59,7 @@ public:
     const std::string& problem() const { return broken; }
 
 private:
-    std::nullopt_t stop(const char* why);
+    std::nullopt_t stop(const char* problem);
 
     std::string_view rest;
     std::size_t size;

@@ -14,7 +14,7 @@ std::string withCode(const std::string& text, const CMPIStatus& status) {
     return text + ", return code " + std::to_string(static_cast<int>(status.rc));
 }
 
-std::string untold(const char* what, const CMPIStatus& status) {
+std::string noAnswer(const char* what, const CMPIStatus& status) {
     return withCode(std::string("The broker could not tell ") + what, status);
 }
 
@@ -36,11 +36,11 @@ bool hasValue(const CMPIData& data, const CMPIStatus& status) {
 
 void requireTold(const CMPIStatus& status, const char* what) {
     if (succeeded(status) || isAbsent(status)) return;
-    throw std::runtime_error(untold(what, status));
+    throw std::runtime_error(noAnswer(what, status));
 }
 
 void noteUntold(const char* function, int line, const char* what, const CMPIStatus& status) {
-    if (!succeeded(status) && !isAbsent(status)) logFailure(function, line, untold(what, status));
+    if (!succeeded(status) && !isAbsent(status)) logFailure(function, line, noAnswer(what, status));
 }
 
 const char* textOf(const CMPIString* string, CMPIStatus& status) {

@@ -17,8 +17,8 @@ namespace {
 
 constexpr std::int64_t earliest = 946684800; // 2000-01-01
 
-bool refuse(const std::string& why) {
-    logLine(failure, "setProperty", __LINE__, "clock not set: " + why);
+bool refuse(const std::string& reason) {
+    logLine(failure, "setProperty", __LINE__, "clock not set: " + reason);
     return false;
 }
 

@@ -14,8 +14,8 @@ namespace {
 
 constexpr int farthest = 14 * 60;
 
-bool refuse(const std::string& why) {
-    logLine(failure, "setProperty", __LINE__, why);
+bool refuse(const std::string& reason) {
+    logLine(failure, "setProperty", __LINE__, reason);
     return false;
 }
 

@@ -85,11 +85,11 @@ std::optional<SavedZone> ZoneMemory::load() const {
     return zone;
 }
 
-int ZoneMemory::setAside(const std::string& name, const char* why) {
+int ZoneMemory::setAside(const std::string& name, const char* reason) {
     std::string other = name + ".damaged";
     for (int number = 2; has(other); ++number) other = name + ".damaged-" + std::to_string(number);
     const int error = move(name, other);
-    if (error == 0) renamed = stateDirectory + "/" + name + " " + why + " and is now called " + other;
+    if (error == 0) renamed = stateDirectory + "/" + name + " " + reason + " and is now called " + other;
     return error;
 }
 

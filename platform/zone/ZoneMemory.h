@@ -56,7 +56,7 @@ private:
     void discard(const std::string& name);
     std::optional<SavedZone> load() const;
     int migrate();
-    int setAside(const std::string& name, const char* why);
+    int setAside(const std::string& name, const char* reason);
 
     const Root& root;
     const int state;

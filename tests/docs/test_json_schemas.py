@@ -116,8 +116,8 @@ class Vkcim(unittest.TestCase):
 class Strictness(unittest.TestCase):
     """Every change to a right document that makes it a wrong one is refused."""
 
-    def refuse(self, document, why):
-        self.assertFalse(VALIDATOR.is_valid(document), why)
+    def refuse(self, document, reason):
+        self.assertFalse(VALIDATOR.is_valid(document), reason)
 
     def changed(self, document, place, change):
         wrong = copy.deepcopy(document)

@@ -67,16 +67,17 @@ protected:
         intact = ask(getOne, {});
     }
 
-    void expectIntact(const nlohmann::json& answer, const std::string& why) {
-        EXPECT_EQ(answer, intact) << why;
+    void expectIntact(const nlohmann::json& answer, const std::string& replacement) {
+        EXPECT_EQ(answer, intact) << replacement;
         EXPECT_THAT(intact["results"], SizeIs(1));
     }
 
     /// Nothing returned, nothing closed, no error.
-    static void expectNothing(const nlohmann::json& answer, const std::string& why) {
-        EXPECT_EQ(answer["status"], nlohmann::json({{"code", 0}, {"name", "CMPI_RC_OK"}, {"message", nullptr}})) << why;
-        EXPECT_EQ(answer["results"], nlohmann::json::array()) << why;
-        EXPECT_EQ(answer["done"], false) << why;
+    static void expectNothing(const nlohmann::json& answer, const std::string& replacement) {
+        EXPECT_EQ(answer["status"], nlohmann::json({{"code", 0}, {"name", "CMPI_RC_OK"}, {"message", nullptr}}))
+            << replacement;
+        EXPECT_EQ(answer["results"], nlohmann::json::array()) << replacement;
+        EXPECT_EQ(answer["done"], false) << replacement;
     }
 
     nlohmann::json intact;

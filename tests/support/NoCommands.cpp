@@ -14,7 +14,7 @@ namespace {
 struct Asked {
     std::mutex mutex;
     std::vector<std::string> commands;
-    std::function<void(const std::string&, const std::string&)> told;
+    std::function<void(const std::string&, const std::string&)> observer;
 };
 
 Asked& asked() {
@@ -25,7 +25,7 @@ Asked& asked() {
 void keep(const char* function, const char* command) {
     const std::lock_guard lock(asked().mutex);
     asked().commands.emplace_back(command);
-    if (asked().told) asked().told(function, command);
+    if (asked().observer) asked().observer(function, command);
 }
 
 const char* outputOf(const char* command) {
@@ -59,9 +59,9 @@ std::vector<std::string> takeCommands() {
     return std::exchange(asked().commands, {});
 }
 
-void tellCommands(std::function<void(const std::string& function, const std::string& command)> told) {
+void tellCommands(std::function<void(const std::string& function, const std::string& command)> observer) {
     const std::lock_guard lock(asked().mutex);
-    asked().told = std::move(told);
+    asked().observer = std::move(observer);
 }
 
 } // namespace test

@@ -13,7 +13,8 @@ namespace test {
 /// The commands asked for since it was last asked.
 std::vector<std::string> takeCommands();
 
-/// From now on `told` is called for every command, as `popen` or `system` and what was asked. An empty one ends that.
-void tellCommands(std::function<void(const std::string& function, const std::string& command)> told);
+/// From now on `observer` is called for every command, as `popen` or `system` and what was asked. An empty one ends
+/// that.
+void tellCommands(std::function<void(const std::string& function, const std::string& command)> observer);
 
 } // namespace test

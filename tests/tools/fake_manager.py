@@ -128,8 +128,8 @@ def provider_dir():
 def cimconfig():
     planned = "-p" in words
     if (state / "up").exists() or (planned and (state / "providerDir").exists()):
-        told = get("providerDir-as-said") or provider_dir()
-        end(0, f"{'Planned' if planned else 'Current'} value: {told}")
+        value = get("providerDir-as-said") or provider_dir()
+        end(0, f"{'Planned' if planned else 'Current'} value: {value}")
     end(1, f"{'Planned' if planned else 'Current'} value can not be determined because the CIM server is not running.")
 
 

@@ -42,9 +42,9 @@ class Masked(unittest.TestCase):
     def test_masks_the_same_by_the_same_in_every_source(self):
         for version, data in [((2, 7), table()), ((2, 5), table(uuid_bytes=SYSTEM_UUID.bytes))]:
             target, _ = take(make_host(data, version))
-            told = properties(target, "VESKA_ComputerSystem")["UUID"]
+            answer = properties(target, "VESKA_ComputerSystem")["UUID"]
             in_file = (target / "sys/class/dmi/id/product_uuid").read_text(encoding="ascii").strip()
-            self.assertEqual(in_file, told.upper(), version)
+            self.assertEqual(in_file, answer.upper(), version)
             serial = (target / "sys/class/dmi/id/product_serial").read_text(encoding="ascii").strip()
             self.assertIn(serial.encode(), (target / "sys/firmware/dmi/tables/DMI").read_bytes())
 
@@ -52,8 +52,8 @@ class Masked(unittest.TestCase):
         data = table(chassis_serial="To Be Filled By O.E.M.", system_serial="0123456789", uuid_bytes=b"\xff" * 16)
         root = make_host(data, **{"sys/class/dmi/id/product_serial": b"0123456789\n"})
         target, _ = take(root)
-        told = properties(target, "VESKA_PhysicalPackage")
-        self.assertNotIn("SerialNumber", told)
+        answer = properties(target, "VESKA_PhysicalPackage")
+        self.assertNotIn("SerialNumber", answer)
         copy = (target / "sys/firmware/dmi/tables/DMI").read_bytes()
         self.assertIn(b"To Be Filled By O.E.M.", copy)
         self.assertIn(b"0123456789", copy)
@@ -207,9 +207,9 @@ class Texts(unittest.TestCase):
             self.assertNotIn(secret, masked)
             root = make_host(table(chassis_serial=serial))
             target, _ = take(root)
-            told = [properties(r, "VESKA_PhysicalPackage")["SerialNumber"] for r in (root, target)]
-            self.assertEqual(told[0], serial)
-            self.assertNotIn(secret, told[1])
+            serials = [properties(r, "VESKA_PhysicalPackage")["SerialNumber"] for r in (root, target)]
+            self.assertEqual(serials[0], serial)
+            self.assertNotIn(secret, serials[1])
 
     def test_fillers_stay(self):
         for text in ("System Serial Number", "Chassis  Serial Number", "Not Specified", "not applicable", "NO ASSET TAG",

@@ -184,12 +184,12 @@ const std::vector<std::vector<std::string>> askingCommands = {{"report"},
                                                               {"modify", "VESKA_TimeService", "Region=x"},
                                                               {"associators", "VESKA_ComputerSystem"}};
 
-void expectUnreadable(const char* variable, const std::string& place, const std::string& why) {
+void expectUnreadable(const char* variable, const std::string& place, const std::string& problem) {
     for (const std::vector<std::string>& words : askingCommands) {
         SCOPED_TRACE(testing::PrintToString(words) + " of " + place);
         const Outcome outcome = vkcim(words, place, variable);
         EXPECT_EQ(outcome.status, 4);
-        EXPECT_THAT(outcome.error, HasSubstr("vkcim: the host cannot be read: " + place + ": " + why));
+        EXPECT_THAT(outcome.error, HasSubstr("vkcim: the host cannot be read: " + place + ": " + problem));
     }
 }
 

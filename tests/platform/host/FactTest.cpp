@@ -14,23 +14,23 @@ Fact damaged(const char* source) {
     return fact;
 }
 
-TEST(Fact, IsToldUnlessItsTextSaysNothing) {
-    EXPECT_EQ(told("file", "1234", FirmwareText::Model).text, "1234");
-    EXPECT_EQ(told("file", "1234").text, "");
-    EXPECT_EQ(told("file", "1234").useless, "1234");
-    EXPECT_EQ(told("file", "").useless, "");
-    EXPECT_EQ(told("file", "").error, ENOENT);
+TEST(Fact, HasATextUnlessItSaysNothing) {
+    EXPECT_EQ(factOf("file", "1234", FirmwareText::Model).text, "1234");
+    EXPECT_EQ(factOf("file", "1234").text, "");
+    EXPECT_EQ(factOf("file", "1234").placeholder, "1234");
+    EXPECT_EQ(factOf("file", "").placeholder, "");
+    EXPECT_EQ(factOf("file", "").error, ENOENT);
 }
 
-TEST(Fact, ComesFromTheFirstSourceThatTellsIt) {
-    EXPECT_EQ(firstOf({missing("a", EACCES), told("b", "None"), told("c", "CZ1"), told("d", "CZ2")}).text, "CZ1");
+TEST(Fact, ComesFromTheFirstSourceThatHasIt) {
+    EXPECT_EQ(firstOf({missing("a", EACCES), factOf("b", "None"), factOf("c", "CZ1"), factOf("d", "CZ2")}).text, "CZ1");
 }
 
-TEST(Fact, ThatNobodyTellsNamesTheSourceWithMostToBlame) {
+TEST(Fact, ThatNoSourceHasNamesTheSourceWithMostToBlame) {
     EXPECT_EQ(firstOf({missing("a", ENOENT), missing("b", ENOENT)}).source, "a");
     EXPECT_EQ(firstOf({missing("a", ENOENT), missing("b", EACCES), damaged("c")}).source, "b");
     EXPECT_EQ(firstOf({missing("a", ENOENT), damaged("b"), missing("c", EACCES)}).source, "b");
-    EXPECT_EQ(firstOf({damaged("a"), told("b", ""), told("c", "None"), told("d", "N/A")}).source, "c");
+    EXPECT_EQ(firstOf({damaged("a"), factOf("b", ""), factOf("c", "None"), factOf("d", "N/A")}).source, "c");
 }
 
 } // namespace

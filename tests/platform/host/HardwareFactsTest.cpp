@@ -86,9 +86,9 @@ TEST_F(HardwareFactsTest, PlaceholdersInTheTablesGiveWayToTheNextSource) {
     const HardwareFacts facts = read();
     EXPECT_EQ(facts.model.text, "Board Mk 2");
     EXPECT_EQ(facts.manufacturer.text, "");
-    EXPECT_EQ(facts.manufacturer.useless, "To Be Filled By O.E.M.");
+    EXPECT_EQ(facts.manufacturer.placeholder, "To Be Filled By O.E.M.");
     EXPECT_EQ(facts.serial.text, "");
-    EXPECT_EQ(facts.serial.useless, "0123456789");
+    EXPECT_EQ(facts.serial.placeholder, "0123456789");
     EXPECT_EQ(facts.uuid.text, "");
     EXPECT_THAT(notesOn(facts), Contains("no UUID: /sys/firmware/dmi/tables/DMI holds a placeholder, "
                                          "\"ffffffff-ffff-ffff-ffff-ffffffffffff\""));
@@ -114,7 +114,7 @@ TEST_F(HardwareFactsTest, WithoutTablesTheKernelTells) {
     ASSERT_EQ(facts.chassis.size(), 1U);
     EXPECT_EQ(facts.chassis[0].manufacturer.text, "Boxes");
     EXPECT_EQ(facts.chassis[0].type, 23U); // 151 without the lock bit
-    EXPECT_EQ(facts.chassis[0].serial.useless, "None");
+    EXPECT_EQ(facts.chassis[0].serial.placeholder, "None");
     EXPECT_EQ(facts.chassis[0].status, 0U);
 }
 
@@ -227,7 +227,7 @@ TEST_F(HardwareFactsTest, ABoardWithoutProductTellsNoManufacturerEither) {
     withBoard(leftAsItCame, "ASRockRack", "Base Board Product Name").writeTo(host);
     EXPECT_EQ(read().model.text, "");
     EXPECT_EQ(read().manufacturer.text, "");
-    EXPECT_EQ(read().manufacturer.useless, "To Be Filled By O.E.M.");
+    EXPECT_EQ(read().manufacturer.placeholder, "To Be Filled By O.E.M.");
 }
 
 TEST_F(HardwareFactsTest, LenovosModelStandsInTheVersion) {
@@ -275,7 +275,7 @@ TEST_F(HardwareFactsTest, ShortModelsThatCountAreModels) {
         .writeTo(host);
     const HardwareFacts facts = read();
     EXPECT_EQ(facts.model.text, "1234");
-    EXPECT_EQ(facts.serial.useless, "1234");
+    EXPECT_EQ(facts.serial.placeholder, "1234");
     EXPECT_EQ(facts.chassis.at(1).version.text, "4321");
     EXPECT_EQ(facts.chassis.at(1).serial.text, "");
 }

@@ -78,9 +78,9 @@ TEST_F(HostNotes, BlameTheEntryPointForItsChecksum) {
 TEST_F(HostNotes, DoNotSayThatTheHostHasNoneOfWhatStandsBehindAFault) {
     SmbiosImage broken(3, 2);
     broken.addRaw("\x01\x02\0\0\0\0"s).writeTo(host);
-    const std::string why = tableFile + " is damaged: structure shorter than 4 bytes at byte 0";
-    EXPECT_THAT(notes(), AllOf(Contains("no UUID: " + why), Contains("no serial number: " + why),
-                               Contains("no model: " + why), Contains("no chassis: " + why)));
+    const std::string damage = tableFile + " is damaged: structure shorter than 4 bytes at byte 0";
+    EXPECT_THAT(notes(), AllOf(Contains("no UUID: " + damage), Contains("no serial number: " + damage),
+                               Contains("no model: " + damage), Contains("no chassis: " + damage)));
 }
 
 TEST_F(HostNotes, NameThePlaceholderAndItsFile) {

@@ -65,9 +65,9 @@ TEST(Settings, PassOverWhatIsNoLevel) {
     EXPECT_TRUE(settings.keeps(Channel::Log, 4000));
     EXPECT_FALSE(settings.keeps(Channel::Log, 50));
     EXPECT_FALSE(settings.keeps(Channel::Log, 6000));
-    for (const char* useless : {"abc", ",", "x,y", " "}) {
-        EXPECT_TRUE(withLevels(useless).keeps(Channel::Log, 6000)) << useless;
-        EXPECT_FALSE(withLevels(useless).keeps(Channel::Log, 4000)) << useless;
+    for (const char* noNumbers : {"abc", ",", "x,y", " "}) {
+        EXPECT_TRUE(withLevels(noNumbers).keeps(Channel::Log, 6000)) << noNumbers;
+        EXPECT_FALSE(withLevels(noNumbers).keeps(Channel::Log, 4000)) << noNumbers;
     }
 }
 

@@ -126,8 +126,8 @@ TEST_F(ClassRelations, DoNotHoldWhereTheBrokerDoesNotAnswer) {
     EXPECT_FALSE(ProviderUtilities::areClassesRelated(nullptr, "root/cimv2", name, name));
     fake.refusals = {{"classPathIsA", CMPI_RC_ERR_FAILED}};
     EXPECT_FALSE(related(name, name));
-    const std::string untold = noClass + "whether a class is derived from another, return code 1";
-    EXPECT_THAT(takeLog(), ElementsAre(untold, untold)) << "one for each direction";
+    const std::string failure = noClass + "whether a class is derived from another, return code 1";
+    EXPECT_THAT(takeLog(), ElementsAre(failure, failure)) << "one for each direction";
     for (const CMPIrc absent : {CMPI_RC_ERR_NOT_FOUND, CMPI_RC_ERR_INVALID_CLASS}) {
         fake.refusals = {{"classPathIsA", absent}};
         EXPECT_FALSE(related(name, name));

@@ -84,12 +84,12 @@ TEST_F(Properties, OfAnotherTypeAreAbsent) {
 
 TEST_F(Properties, AreAbsentWhereTheBrokerFails) {
     fake.refusals = {{"getProperty", CMPI_RC_ERR_FAILED}, {"getArg", CMPI_RC_ERR_FAILED}};
-    const std::string untold = "LOG 6000 Norvane.ProviderUtilities The broker could not tell a value that a request "
-                               "brings, return code 1";
+    const std::string failure = "LOG 6000 Norvane.ProviderUtilities The broker could not tell a value that a request "
+                                "brings, return code 1";
     EXPECT_EQ(getUint16("U16"), -1);
-    EXPECT_THAT(takeLog(), ElementsAre(untold));
+    EXPECT_THAT(takeLog(), ElementsAre(failure));
     EXPECT_EQ(getUint32("U32"), -1);
-    EXPECT_THAT(takeLog(), ElementsAre(untold));
+    EXPECT_THAT(takeLog(), ElementsAre(failure));
     for (const CMPIrc absence : {CMPI_RC_ERR_NO_SUCH_PROPERTY, CMPI_RC_ERR_NOT_FOUND}) {
         fake.refusals = {{"getProperty", absence}};
         EXPECT_EQ(getUint16("U16"), -1);
