@@ -61,6 +61,15 @@ TEST_F(Instances, AreMadeOfAPath) {
     EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
 }
 
+TEST_F(Instances, RefusedForAPathThatHidesItsClassAreLoggedWithoutOne) {
+    CMPIObjectPath* const path = fake.makePath("root/cimv2", "CIM_System");
+    fake.refusals = {{"newInstance", CMPI_RC_ERR_NOT_FOUND}};
+    fake.pathTable.getClassName = nullptr;
+    EXPECT_EQ(ProviderUtilities::createInstance(fake.get(), path), nullptr);
+    EXPECT_THAT(takeLog(), ElementsAre("LOG 6000 Norvane.ProviderUtilities The broker refused an instance of the class "
+                                       "(null), return code 6"));
+}
+
 TEST_F(Instances, TakePropertiesOfTheTypeThatTheValueStandsFor) {
     std::string text = "node7";
     EXPECT_TRUE(ProviderUtilities::setProperty(instance, "A", text));
