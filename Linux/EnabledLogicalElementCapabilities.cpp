@@ -37,7 +37,7 @@ bool EnabledLogicalElementCapabilities::getElementName(std::string& name) const 
 
 bool EnabledLogicalElementCapabilities::getElementNameEditSupported(bool& supported) const {
     const TraceScope scope(VK_SCOPE(source));
-    bool readOnly = false;
+    bool readOnly{};
     if (!node().isPropertyReadOnly(NodeLexicon::NameProperty, readOnly)) return false;
     supported = !readOnly;
     return true;

@@ -20,12 +20,12 @@ const TraceSource& CMPITimeService::traceSource() {
 void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** propertyList) {
     const ParameterTraceScope scope(VK_SCOPE(source), " referenceInstance=", instance, " properties=", propertyList);
     if (instance == nullptr) return;
-    bool automatic = false;
+    bool automatic{};
     if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic)) {
         data.setAutomaticDSTAdjustment(automatic); // on purpose: its result is ignored
         return;
     }
-    unsigned short region = 0; // on purpose: accepted and ignored
+    unsigned short region{}; // on purpose: accepted and ignored
     ProviderUtilities::getProperty(instance, "Region", region);
 }
 
@@ -110,7 +110,7 @@ unsigned int CMPITimeService::invokeMethod(const char* methodName, const CMPIArg
     const CMPICount count = in->ft->getArgCount(in, &status);
     if (status.rc != CMPI_RC_OK || (count != 2 && count != 3)) return CMPI_RC_ERR_INVALID_PARAMETER;
 
-    bool getRequest = false;
+    bool getRequest{};
     if (!ProviderUtilities::getProperty(in, "GetRequest", getRequest)) return CMPI_RC_ERR_INVALID_PARAMETER;
     if (argument(in, "ManagedElement").type != CMPI_ref) // its value does not matter: there is one time service
         return refuse(broker, "ManagedElement Parameter is having Invalid type or is NULL");
@@ -128,7 +128,7 @@ unsigned int CMPITimeService::setTime(const CMPIArgs* in, CMPIArgs* out) {
     unsigned int gmtOffset = offsetOf(text);
     traceVariable(here, "CMPITIMESERVICE::gmt_offset_uint32", gmtOffset);
 
-    long seconds = 0;
+    long seconds{};
     if (!secondsOf(time, seconds) || data.manageTime(seconds, gmtOffset) != 0) return CMPI_RC_ERR_FAILED;
     return returnCurrentTime(broker, out);
 }

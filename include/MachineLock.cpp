@@ -34,7 +34,7 @@ bool waitForLock(int file) {
     struct flock whole {};
     whole.l_type = F_WRLCK;
     whole.l_whence = SEEK_SET;
-    int result = 0;
+    int result{};
     do result = fcntl(file, F_SETLKW, &whole);
     while (result != 0 && errno == EINTR);
     return result == 0;

@@ -35,7 +35,7 @@ bool fraction(std::string_view text, int& value) {
 std::optional<Instant> parseCimDateTime(std::string_view text) {
     if (text.size() != wholeLength || text[fractionAt - 1] != '.' || (text[signAt] != '+' && text[signAt] != '-'))
         return std::nullopt;
-    int year = 0, month = 0, day = 0, hour = 0, minute = 0, second = 0, microsecond = 0, offset = 0;
+    int year{}, month{}, day{}, hour{}, minute{}, second{}, microsecond{}, offset{};
     const bool digits = number(text, 0, 4, year) && number(text, 4, 2, month) && number(text, 6, 2, day) &&
                         number(text, 8, 2, hour) && number(text, 10, 2, minute) && number(text, 12, 2, second) &&
                         fraction(text.substr(fractionAt, 6), microsecond) && number(text, signAt + 1, 3, offset);

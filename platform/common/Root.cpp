@@ -52,7 +52,7 @@ Root::Contents failure(int error) {
 }
 
 ssize_t readSome(int fd, char* to, std::size_t size) {
-    ssize_t count = 0;
+    ssize_t count{};
     do {
         count = ::read(fd, to, size);
     } while (count < 0 && errno == EINTR);

@@ -65,7 +65,7 @@ void addLevel(Settings& settings, int level) noexcept {
 
 void setLevels(Settings& settings, std::string_view list) noexcept {
     forEachEntry(list, [&settings](std::string_view entry) {
-        int level = 0;
+        int level{};
         const char* const end = entry.data() + entry.size();
         const auto [rest, error] = std::from_chars(entry.data(), end, level);
         if (entry == "all")

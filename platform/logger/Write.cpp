@@ -49,7 +49,7 @@ private:
 ssize_t writeOnce(int descriptor, std::string_view line, bool endLineBefore) noexcept {
     char lineFeed = '\n';
     const iovec parts[] = {{&lineFeed, 1}, {const_cast<char*>(line.data()), line.size()}};
-    ssize_t count = 0;
+    ssize_t count{};
     do {
         count = endLineBefore ? writev(descriptor, parts, 2) : write(descriptor, line.data(), line.size());
     } while (count < 0 && errno == EINTR);

@@ -78,7 +78,7 @@ CMPIObjectPath* ProviderUtilities::createObjectPath(const CMPIBroker* broker, co
 unsigned int ProviderUtilities::getKeyCount(const CMPIObjectPath* objectPath) {
     if (objectPath == nullptr) return 0;
     CMPIStatus status = notOffered;
-    CMPICount count = 0;
+    CMPICount count{};
     if (Cmpi::hasSlot(objectPath, &CMPIObjectPathFT::getKeyCount)) {
         status = Cmpi::freshStatus();
         count = objectPath->ft->getKeyCount(objectPath, &status);

@@ -67,7 +67,7 @@ public:
     bool time(std::int64_t longestHours, std::int64_t& seconds) {
         const bool negative = take('-');
         if (!negative) take('+');
-        std::int64_t hours = 0, minutes = 0, rest60 = 0;
+        std::int64_t hours{}, minutes = 0, rest60 = 0;
         if (!number(0, longestHours, hours)) return false;
         if (take(':')) {
             if (!number(0, 59, minutes)) return false;
@@ -80,7 +80,7 @@ public:
     /// `,Mm.w.d[/time]` and the like.
     bool day(RuleDay& rule) {
         if (!take(',')) return false;
-        std::int64_t month = 0, week = 0, day = 0;
+        std::int64_t month{}, week{}, day{};
         if (take('M')) {
             if (!number(1, 12, month) || !take('.') || !number(1, 5, week) || !take('.') || !number(0, 6, day))
                 return false;
@@ -133,13 +133,13 @@ std::optional<PosixRule> parsePosixRule(std::string_view text) {
     constexpr std::int64_t longestOffset = 24;
     PosixRule rule;
     RuleParser parser(text);
-    std::int64_t west = 0;
+    std::int64_t west{};
     if (!parser.name() || !parser.time(longestOffset, west)) return std::nullopt;
     rule.standardOffset = static_cast<std::int32_t>(-west);
     if (parser.atEnd()) return rule;
     rule.hasDaylightSaving = true;
     if (!parser.name()) return std::nullopt;
-    std::int64_t daylightWest = west - 3600;
+    std::int64_t daylightWest{};
     RuleParser ahead = parser;
     if (ahead.time(longestOffset, daylightWest))
         parser = ahead;
