@@ -22,7 +22,8 @@ class Choice:
     def files(self):
         listed = subprocess.run(["git", "ls-files", "--cached", "--others", "--exclude-standard", *ROOMS], cwd=self.root,
                                 check=True, stdout=subprocess.PIPE, text=True).stdout.splitlines()
-        return sorted(name for name in set(listed) if name.endswith((".cpp", ".h")) and (self.root / name).is_file())
+        names = {name for name in listed if name.endswith((".cpp", ".h")) and (self.root / name).is_file()}
+        return sorted(names, key=lambda name: (ROOMS.index(name.split("/")[0]), name))
 
     def arguments_of(self, file):
         """How a file is compiled; a header as the nearest source is, with the include directories of all."""

@@ -15,6 +15,7 @@ from source import Source, full_name, start_of
 
 SCOPES = (Kind.NAMESPACE, Kind.CLASS_DECL, Kind.STRUCT_DECL, Kind.UNION_DECL, Kind.CLASS_TEMPLATE,
           Kind.CLASS_TEMPLATE_PARTIAL_SPECIALIZATION, Kind.LINKAGE_SPEC, Kind.UNEXPOSED_DECL)
+CLASSES = (Kind.CLASS_DECL, Kind.STRUCT_DECL, Kind.UNION_DECL, Kind.CLASS_TEMPLATE, Kind.CLASS_TEMPLATE_PARTIAL_SPECIALIZATION)
 CONDITIONALS = (Kind.IF_STMT, Kind.WHILE_STMT, Kind.DO_STMT, Kind.FOR_STMT, Kind.CONDITIONAL_OPERATOR)
 DECLARATIONS = (Kind.PARM_DECL, Kind.STATIC_ASSERT, Kind.FIELD_DECL, Kind.ENUM_DECL)
 
@@ -25,7 +26,7 @@ class CannotRead(Exception):
 
 def walk_scope(source, node):
     for child in node.get_children():
-        if child.location.file is not None and child.location.file.name == source.name:
+        if source.holds(child):
             walk_declaration(source, child)
 
 
@@ -44,7 +45,7 @@ def walk_function(source, node):
             and source.text_of(child).startswith(("{", "try"))]  # and not what clang makes of = default
     if body and node.kind == Kind.CONSTRUCTOR:  # what its members begin with
         body = [child for child in children if child.kind.is_expression()] + body
-    with computed_when_compiling(source, node):
+    with computed_when_running(source, node):
         for child in body:
             walk(source, child, full_name(node), node, node)
 
@@ -54,7 +55,7 @@ def walk_variable(source, node, function):
     name_end = node.location.offset + len(node.spelling)
     if source.text[node.location.offset:name_end] != node.spelling:
         return  # made by a macro
-    with computed_when_compiling(source, node):
+    with computed_when_running(source, node):
         for child in node.get_children():
             between = source.text[name_end:start_of(child)]
             if start_of(child) >= name_end and not re.fullmatch(r"\s*(\[[^]]*\]\s*)*\[\s*", between):
@@ -62,18 +63,32 @@ def walk_variable(source, node, function):
 
 
 @contextlib.contextmanager
-def computed_when_compiling(source, node):
-    """While it lasts, mutants are found that a process cannot choose, if the declaration says constexpr or the like."""
-    fixed = re.search(r"\bconst(expr|eval|init)\b", source.text[start_of(node):node.location.offset]) is not None
-    source.fixed += fixed
+def computed_when_running(source, node):
+    """While it lasts, mutants are found that a process can choose only without the declaration's constexpr or the like."""
+    before = len(source.loosened)
+    source.loosened += loosened(source, node)
     yield
-    source.fixed -= fixed
+    del source.loosened[before:]
+
+
+def loosened(source, node):
+    """What makes a function or variable one that is computed when running: inline where it was, and const."""
+    head = source.text[start_of(node):node.location.offset]
+    word = re.search(r"\bconst(expr|eval|init)\b", head)
+    if not word:
+        return
+    is_variable = node.kind == Kind.VAR_DECL
+    is_inline = not is_variable or node.semantic_parent.kind in CLASSES
+    inline = "inline" if is_inline and not re.search(r"\binline\b", head) else ""
+    yield start_of(node) + word.start(), start_of(node) + word.end(), inline
+    if is_variable and word[0] == "constexpr":
+        yield node.location.offset, node.location.offset, "const "
 
 
 def walk(source, node, function, holder, outer):
     """Statements and expressions; `holder` is what a node stands in, `outer` what that stands in."""
     kind = node.kind
-    if kind in DECLARATIONS or kind.is_attribute():
+    if kind in DECLARATIONS or kind.is_attribute() or not source.holds(node):
         return
     if kind == Kind.VAR_DECL:
         walk_variable(source, node, function)
@@ -86,7 +101,8 @@ def walk(source, node, function, holder, outer):
     for child in children:
         if kind in statements.HOLDERS:
             statements.remove_statement(source, child, node, holder, function)
-        walk(source, child, function, node, holder)
+        # What clang puts around an expression holds nothing.
+        walk(source, child, function, *((holder, outer) if kind == Kind.UNEXPOSED_EXPR else (node, holder)))
 
 
 def mutate(source, node, children, function, holder):

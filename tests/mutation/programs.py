@@ -14,27 +14,30 @@ import workspace
 ROOMS = ("provider", "cmpi", "Linux", "include", "platform")
 WHOLE = re.compile(r"(load|system)\.")  # tests that are no GoogleTest programs
 ENDLESS = "no end"
+LIKELY = 6  # single tests that are tried before whole programs
 UNSTEADY = 4  # times that an unchanged program is tried, each without the tests that failed before
 SECONDS = 5  # that a program may compute beyond five times what it takes unchanged
 
 
 class Program:
-    """A GoogleTest program or a part of its tests; or another test."""
+    """A GoogleTest program or a part of its tests: some suites, or a single test; or another test."""
 
-    def __init__(self, target, path=None, sources=(), suites=()):
+    def __init__(self, target, path=None, sources=(), suites=(), test=None):
         self.target = target
         self.path = path
         self.sources = [pathlib.PurePath(source) for source in sources]
         self.suites = suites
+        self.test = test
 
     def command(self, left_out=()):
         if not self.path:
             return ["ctest", "--test-dir", "build", "-R", f"^{re.escape(self.target)}$"]
-        chosen = ":".join(f"{suite}.*:*/{suite}.*:{suite}/*" for suite in self.suites) or "*"  # with parameters and types
+        suites = ":".join(f"{suite}.*:*/{suite}.*:{suite}/*" for suite in self.suites)  # with parameters and types
+        chosen = self.test or suites or "*"
         return [self.path, "--gtest_fail_fast", f"--gtest_filter={chosen}-{':'.join(left_out)}"]
 
     def key(self):
-        return self.target, tuple(self.suites)
+        return self.target, tuple(self.suites), self.test
 
     def is_in(self, directory):
         return any(source.parent == directory for source in self.sources)
@@ -50,6 +53,7 @@ class Programs:
         self.seconds = {}  # by program: what it takes unchanged
         self.left_out = collections.defaultdict(list)  # by target: the tests that fail unchanged
         self.reached = {}  # by program: the places of mutants, one byte for each number
+        self.noticing = collections.defaultdict(dict)  # by file, those that noticed a mutant of it: single tests
 
     def read_targets(self):
         """From what CMake says of its targets."""
@@ -74,6 +78,18 @@ class Programs:
         others = [program for program in self.known if program.target not in seen]
         others.sort(key=lambda program: not program.is_in(pathlib.PurePath("tests/provider")))  # they look at all of it
         return [each for each in (nearest, same_room, *in_parts(others)) if each]
+
+    def likely(self, file):
+        """The tests that noticed the last mutants of a file: often those of the next, too."""
+        return list(self.noticing[file].values())[:-LIKELY - 1:-1]
+
+    def note(self, file, program, failure):
+        """What noticed a mutant of a file."""
+        test = failure.partition(": ")[2]
+        if program.path and "." in test:
+            single = Program(program.target, program.path, program.sources, test=test)
+            self.noticing[file].pop(single.key(), None)
+            self.noticing[file][single.key()] = single
 
     def mirror(self, program, stem):
         """The part of a program whose files are named after a source; None when it has none."""

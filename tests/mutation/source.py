@@ -19,9 +19,12 @@ class Mutant:
     old: str
     function: str
     last_line: int
-    # The expression or statement that a process may have either way, from its start to its end; None where the mistake has
-    # to be there when it is compiled.
-    place: tuple[int, int] | None = dataclasses.field(default=None, compare=False)
+    # The expression, statement or rows that a process may have either way, from start to end; none where the mistake has to
+    # be there when it is compiled.
+    places: tuple[tuple[int, int], ...] = dataclasses.field(default=(), compare=False)
+    type: str = dataclasses.field(default="", compare=False)  # of the rows, or of the object that a declaration makes
+    # What stands in its way there: changes (start, end, new) of a declaration that is computed when compiling.
+    loosened: tuple[tuple[int, int, str], ...] = dataclasses.field(default=(), compare=False)
 
     def apply(self, text):
         return text[:self.start] + self.new + text[self.end:]
@@ -42,16 +45,20 @@ class Source:
         self.text = read(path)
         self.line_starts = [0] + [found.end() for found in re.finditer("\n", self.text)]
         self.mutants = set()
-        self.fixed = 0  # how many of what is being read are computed when compiling
+        self.loosened = []  # what has to change so that what is being read is computed when running
 
     def line_of(self, offset):
         return bisect.bisect_right(self.line_starts, offset)
 
-    def add(self, function, kind, start, end, new, place=None):
+    def add(self, function, kind, start, end, new, *places, type=""):
         old = self.text[start:end]
         if old != new:
             self.mutants.add(Mutant(self.name, self.line_of(start), start, end, kind, new, old, function, self.line_of(end),
-                                    None if self.fixed else place))
+                                    places, type, tuple(self.loosened)))
+
+    def holds(self, node):
+        """Whether a node stands here, and not in a file that is included."""
+        return node.location.file is not None and node.location.file.name == self.name
 
     def text_of(self, node):
         return self.text[start_of(node):end_of(node)]

@@ -9,8 +9,11 @@ from source import end_of, place_of, start_of
 COMPARISONS = {"==": "!=", "!=": "==", "<": ">=", ">=": "<", ">": "<=", "<=": ">"}
 BOUNDARIES = {"<": "<=", "<=": "<", ">": ">=", ">=": ">"}
 CONNECTIVES = ("&&", "||")
-NEGATION, REMOVED = "negation", "removed statement"
+NEGATION, REMOVED, SWAPPED = "negation", "removed statement", "swapped rows"
 LITERAL = re.compile(r"(0[xX][0-9a-fA-F]+|[0-9]+)([uUlLzZ]*)")
+# The declaration of an object, with what it is made of.
+GUARD = re.compile(r"(?:const\s+)?(?P<type>[\w:]+(?:<[^;(){}]*>)?)\s+(?P<name>\w+)\s*"
+                   r"(?:\((?P<values>.*)\)|\{(?P<braced>.*)\})?;", re.S)
 
 FUNCTIONS = (Kind.FUNCTION_DECL, Kind.FUNCTION_TEMPLATE, Kind.CXX_METHOD, Kind.CONSTRUCTOR, Kind.DESTRUCTOR,
              Kind.CONVERSION_FUNCTION)
@@ -69,17 +72,25 @@ def mutate_constant(source, node, function):
 
 
 def swap_rows(source, node, rows, function, holder):
-    """Swaps neighbours in an array's list, or in any list of lists."""
+    """Swaps neighbours in an array's list, or in any list of lists; in an array's, a process may have them either way."""
     is_array = holder.kind == Kind.VAR_DECL and holder.type.kind in ARRAYS
     if not source.text_of(node).startswith("{"):
         return
     if not is_array and not all(source.text_of(row).startswith("{") for row in rows):
         return
+    row_type = row_type_of(source, holder) if is_array else ""
     for one, other in zip(rows, rows[1:]):
         between = source.text[end_of(one):start_of(other)]
-        if "," in between:
-            source.add(function, "swapped rows", start_of(one), end_of(other),
-                       source.text_of(other) + between + source.text_of(one))
+        if "," in between and source.holds(one) and source.holds(other):
+            source.add(function, SWAPPED, start_of(one), end_of(other),
+                       source.text_of(other) + between + source.text_of(one),
+                       *((place_of(one), place_of(other)) if row_type else ()), type=row_type)
+
+
+def row_type_of(source, table):
+    """As the table's declaration has it."""
+    words = source.text[start_of(table):table.location.offset]
+    return " ".join(re.sub(r"\b(static|inline|constexpr|constinit|extern)\b", "", words).split())
 
 
 def negate_condition(source, node, children, function):
@@ -100,8 +111,11 @@ def remove_statement(source, node, holder, outer, function):
     """Removes what is a statement of its own in what holds it; `outer` is what holds that."""
     start, end = start_of(node), end_of(node)
     if node.kind == Kind.DECL_STMT:
-        if holder.kind == Kind.COMPOUND_STMT and is_guard(source, node, holder):
-            source.add(function, REMOVED, start, end - 1, "")
+        written = source.text[start:end].endswith(";")  # and not within a macro
+        if written and holder.kind == Kind.COMPOUND_STMT and is_guard(source, node, holder):
+            guard = GUARD.fullmatch(source.text[start:end])
+            source.add(function, REMOVED, start, end - 1, "", *([(start, end)] if guard else []),
+                       type=guard["type"] if guard else "")
         return
     if not node.kind.is_expression() and node.kind not in JUMPS:
         return

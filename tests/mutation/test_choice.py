@@ -55,14 +55,14 @@ class Checkout(unittest.TestCase):
 
 class ChoiceTest(Checkout):
     def test_the_product_s_sources_are_mutated_and_nothing_else(self):
-        self.assertEqual(self.choice.files(), ["platform/include/Limit.h", "platform/zone/Second.cpp", "provider/First.cpp"])
+        self.assertEqual(self.choice.files(), ["provider/First.cpp", "platform/include/Limit.h", "platform/zone/Second.cpp"])
 
     def test_a_source_is_read_as_it_is_compiled_and_a_header_as_the_nearest_source(self):
         found = [str(mutant) for mutant in self.choice.all_of(self.choice.files())]
-        self.assertEqual(found, ["platform/include/Limit.h:1: limit: constant: 2 -> 3",
-                                 "platform/zone/Second.cpp:3: second: comparison: == -> !=",
-                                 "provider/First.cpp:2: first: comparison: == -> !=",
-                                 "provider/First.cpp:2: first: constant: 4 -> 5"])
+        self.assertEqual(found, ["provider/First.cpp:2: first: comparison: == -> !=",
+                                 "provider/First.cpp:2: first: constant: 4 -> 5",
+                                 "platform/include/Limit.h:1: limit: constant: 2 -> 3",
+                                 "platform/zone/Second.cpp:3: second: comparison: == -> !="])
 
     def test_unchanged_lines_have_no_mutants(self):
         self.assertEqual(self.choice.changed_since("HEAD"), [])
@@ -72,9 +72,9 @@ class ChoiceTest(Checkout):
         self.git("rm", "-q", "--cached", "platform/zone/Second.cpp")
         self.git("-c", "user.name=A", "-c", "user.email=a@b", "commit", "-q", "-m", "Forget")
         found = [str(mutant) for mutant in self.choice.changed_since("HEAD")]
-        self.assertEqual(found, ["platform/zone/Second.cpp:3: second: comparison: == -> !=",
-                                 "provider/First.cpp:4: third: comparison: != -> ==",
-                                 "provider/First.cpp:4: third: constant: 6 -> 7"])
+        self.assertEqual(found, ["provider/First.cpp:4: third: comparison: != -> ==",
+                                 "provider/First.cpp:4: third: constant: 6 -> 7",
+                                 "platform/zone/Second.cpp:3: second: comparison: == -> !="])
 
     def test_a_seed_chooses_the_same_mutants_again_each_once(self):
         files = self.choice.files()
@@ -93,7 +93,9 @@ class WorkspaceTest(Checkout):
         self.mutant, = self.choice.mutants_of("platform/include/Limit.h")
 
     def schema(self):
-        return schema.Schema(self.copy, [self.mutant])
+        made = schema.Schema(self.copy, [self.mutant])
+        made.give_up(f"{self.root}/{self.mutant.file}:1:15: note: not initialized with a constant expression")
+        return made
 
     def test_the_copy_alone_is_mutated_and_put_right_again_whatever_happens(self):
         mutated = self.copy.tree / self.mutant.file

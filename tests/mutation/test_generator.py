@@ -100,6 +100,9 @@ class MutantsTest(unittest.TestCase):
                     "int run(int& a) {\n    Lock lock(a);\n    int b = a;\n    return b;\n}",
                     "3 run: removed statement: Lock lock(a) -> nothing")
 
+    def test_what_a_macro_declares_stays(self):
+        self.expect("#define PLACE() []() -> int& { static int place; return place; }()\nint run() {\n    return PLACE();\n}")
+
     def test_what_members_begin_with_is_mutated(self):
         self.expect("struct Point {\n    Point() : x(4) {}\n    int x;\n};", "2 Point::Point: constant: 4 -> 5")
 
@@ -109,6 +112,13 @@ class MutantsTest(unittest.TestCase):
                     '2 rooms::names: swapped rows: "b", "c" -> "c", "b"')
         self.expect("struct Row { int a; const char* b; };\nRow table[] = {{'1', \"x\"}, {'2', \"y\"}, {'2', \"y\"}};",
                     "2 table: swapped rows: {'1', \"x\"}, {'2', \"y\"} -> {'2', \"y\"}, {'1', \"x\"}")
+
+    def test_what_is_included_within_a_table_stays(self):
+        with tempfile.NamedTemporaryFile("w", suffix=".inc") as included:
+            included.write("{1, true},\n{2, false},\n{3, true},\n")
+            included.flush()
+            self.expect("// 0,1,2,3,4,5,6,7,8,9,10,11,12,13,14,15,16\nstruct Row { int a; bool b; };\nconst Row table[] = {\n"
+                        f"#include \"{included.name}\"\n}};")
 
     def test_a_function_is_named_with_its_namespaces_and_classes(self):
         self.expect("namespace a { namespace {\ntemplate <class T> struct B { bool c(T x) const { return x != x; } };\n}}",

@@ -76,9 +76,62 @@ int main() {
         self.assertEqual(answers["! -> nothing"], "113")
         self.assertEqual(answers["10 -> 11"], "25")
 
+    def test_what_is_computed_when_compiling_can_be_chosen_where_nothing_needs_it_then(self):
+        answers, usual = self.answers("""#include <cstdio>
+constexpr int limit = 4;
+constexpr int size = 6;
+constexpr int twice(int a) { return 2 * a; }
+struct Named {
+    static constexpr int names[] = {10, 20};
+};
+struct Row {
+    const char* name;
+    int number;
+};
+constexpr Row rows[] = {{"a", 7}, {"b", twice(7)}};
+int main() {
+    static_assert(size);
+    std::printf("%d %d %s%d %s%d", limit, Named::names[0], rows[0].name, rows[0].number, rows[1].name, rows[1].number);
+}
+""")
+        self.assertEqual(usual, "4 10 a7 b14")
+        self.assertEqual(answers["4 -> 5"], "5 10 a7 b14")
+        self.assertEqual(answers["2 -> 3"], "4 10 a7 b21")
+        self.assertEqual(answers["10, 20 -> 20, 10"], "4 20 a7 b14")
+        self.assertEqual(answers['{"a", 7}, {"b", twice(7)} -> {"b", twice(7)}, {"a", 7}'], "4 10 b14 a7")
+        self.assertNotIn("6 -> 7", answers)
+
+    def test_rows_of_objects_can_be_chosen(self):
+        answers, usual = self.answers("""#include <cstdio>
+#include <variant>
+struct Row {
+    const char* name;
+    std::variant<int, const char*> value;
+};
+constexpr Row rows[] = {{"a", 7}, {"b", 8}};
+int main() { std::printf("%s%d", rows[0].name, std::get<0>(rows[1].value)); }
+""")
+        self.assertEqual(usual, "a8")
+        self.assertEqual(answers['{"a", 7}, {"b", 8} -> {"b", 8}, {"a", 7}'], "b7")
+
+    def test_an_object_can_be_left_out(self):
+        answers, usual = self.answers("""#include <cstdio>
+struct Noted {
+    Noted(const char* text, int) { std::printf("<%s", text); }
+    ~Noted() { std::printf(">"); }
+};
+int main() {
+    const Noted noted("in", 5);
+    std::printf(".");
+}
+""")
+        self.assertEqual(usual, "<in.>")
+        self.assertEqual(answers['const Noted noted("in", 5) -> nothing'], ".")
+
     def test_what_the_compiler_has_to_know_cannot_be_chosen_and_the_rest_can(self):
         answers, usual = self.answers("""#include <cstdio>
 constexpr int limit = 4;
+static_assert(limit == 4);
 int main(int count, char**) {
     int a[] = {10, 20};
     switch (count) {
@@ -90,11 +143,26 @@ int main(int count, char**) {
         self.assertEqual(usual, "10")
         self.assertNotIn("4 -> 5", answers)  # the limit
         self.assertNotIn("1 -> 0", answers)  # the case
-        self.assertNotIn("10, 20 -> 20, 10", answers)
+        self.assertEqual(answers["10, 20 -> 20, 10"], "20")
         self.assertEqual(answers["10 -> 11"], "11")
 
+    def test_what_the_end_of_a_function_needs_cannot_be_chosen(self):
+        answers, usual = self.answers("""#include <cstdio>
+#include <cstdlib>
+[[noreturn]] void end() {
+    std::exit(5);
+}
+int main() {
+    std::printf("%d", 6);
+    end();
+}
+""")
+        self.assertEqual(usual, "6")
+        self.assertEqual(answers["6 -> 7"], "7")
+        self.assertNotIn("5 -> 6", answers)
+
     def test_a_single_mutant_can_be_built(self):
-        built = self.built("constexpr int limit = 4;\nint main() { return limit - 4; }\n")
+        built = self.built("constexpr int limit = 4;\nint main() {\n    enum { same = limit };\n    return same - 4;\n}\n")
         limit, = (mutant for mutant in built.mutants if mutant not in built.numbers)
         with built.edited(limit):
             built.copy.build()
