@@ -45,7 +45,7 @@ public:
     CMPIInstance* getCMPIInstance(const char** properties) {
         const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " properties=", properties);
         CMPIObjectPath* path = getObjectPath();
-        if (path == nullptr) return nullptr;
+        // None of a null path either.
         CMPIInstance* instance = ProviderUtilities::createInstance(broker, path);
         if (instance == nullptr) return nullptr;
         for (const char* role : Self::roles) {

@@ -90,7 +90,7 @@ public:
     CMPIInstance* getCMPIInstance(const char** properties) const {
         const ParameterTraceScope scope(VK_SCOPE(Self::traceSource()), " properties=", properties);
         CMPIObjectPath* path = getObjectPath();
-        if (path == nullptr) return nullptr;
+        // None of a null path either.
         CMPIInstance* instance = ProviderUtilities::createInstance(broker, path);
         if (instance == nullptr) return nullptr;
         for (const Property<Data>& property : Self::properties) publish(broker, instance, data, property);

@@ -60,7 +60,7 @@ public:
     /// stands on its first pair then; in a moniker without pairs it stays where it was.
     static bool transformMonikerToObjectPath(Moniker& moniker, CMPIObjectPath** objectPath);
 
-    /// A new instance of that path, or null.
+    /// A new instance of that path, or null; null for a null path, too.
     static CMPIInstance* createInstance(const CMPIBroker* broker, CMPIObjectPath* objectPath);
 
     /// Sets a property of the CIM type that the value's type stands for; false when the broker refuses it.

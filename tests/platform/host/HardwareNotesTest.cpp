@@ -32,15 +32,14 @@ protected:
 
 TEST_F(HostNotes, SayThatTheHostDoesNotTellWhatWholeTablesLack) {
     image.writeTo(host);
-    EXPECT_THAT(notes(), AllOf(Contains("no serial number: the host has none"),
-                               Contains("no chassis: the host has none")));
+    EXPECT_THAT(notes(),
+                AllOf(Contains("no serial number: the host has none"), Contains("no chassis: the host has none")));
 }
 
 TEST_F(HostNotes, SayThatTheFirmwareHasNoTablesOnlyWithoutTheirDirectory) {
     EXPECT_THAT(notes(), AllOf(Contains("no SMBIOS tables: the firmware provides none (/sys/firmware/dmi/tables is not "
                                         "there)"),
-                               Contains("no UUID: the host has none"),
-                               Contains("no chassis: the host has none")));
+                               Contains("no UUID: the host has none"), Contains("no chassis: the host has none")));
 }
 
 TEST_F(HostNotes, NameTheTableThatIsMissing) {
