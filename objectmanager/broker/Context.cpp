@@ -84,13 +84,13 @@ void ContextObject::clear() noexcept {
     entries = std::vector<ContextEntry>();
 }
 
-std::vector<ContextEntry> usualEntries(const std::string& nameSpace) {
+std::vector<ContextEntry> usualEntries(const std::string& nameSpace, const std::string& principal) {
     const auto string = [](const char* name, std::string text) {
         return ContextEntry{name, {CMPI_string, std::move(text)}, {}};
     };
     return {{CMPIInvocationFlags, {CMPI_uint32, std::uint64_t{0}}, {}},
             string(CMPIInitNameSpace, nameSpace),
-            string(CMPIPrincipal, ""),
+            string(CMPIPrincipal, principal),
             string(CMPIRole, ""),
             string(CMPIAcceptLanguage, ""),
             string(CMPIContentLanguage, "")};

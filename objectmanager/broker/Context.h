@@ -26,7 +26,7 @@ private:
     void clear() noexcept override;
 };
 
-/// The entries that every call has: no flags, the namespace, and principal, role and languages unknown.
-std::vector<ContextEntry> usualEntries(const std::string& nameSpace);
+/// The entries that every call has: no flags, the namespace, the principal, and role and languages unknown.
+std::vector<ContextEntry> usualEntries(const std::string& nameSpace, const std::string& principal = {});
 
 } // namespace om

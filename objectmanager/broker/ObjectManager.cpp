@@ -25,7 +25,7 @@ ObjectManager::~ObjectManager() = default;
 
 Answer ObjectManager::run(const Request& request, std::chrono::nanoseconds* elapsed) {
     const std::string& nameSpace = request.path.nameSpace.empty() ? impl->broker.nameSpace() : request.path.nameSpace;
-    return invoke(impl->broker, request, usualEntries(nameSpace), elapsed);
+    return invoke(impl->broker, request, usualEntries(nameSpace, request.principal), elapsed);
 }
 
 const CMPIBroker* ObjectManager::broker() const {

@@ -43,6 +43,7 @@ struct Request {
     std::string method;
     std::string query;
     std::string language;
+    std::string principal;      ///< who asks, for the provider; empty for nobody in particular
     std::optional<Fault> fault; ///< its calls are counted anew for every request
     CallObserver onCall;        ///< receives the broker's calls, for tests; `vkcim` has no option for it
 };

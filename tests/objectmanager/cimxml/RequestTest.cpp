@@ -1,0 +1,121 @@
+#include "objectmanager/cimxml/Request.h"
+
+#include "objectmanager/cimxml/Errors.h"
+#include "tests/objectmanager/cimxml/Messages.h"
+
+#include <gmock/gmock.h>
+
+namespace cimxml {
+namespace {
+
+using Kind = ValueElement::Kind;
+
+TEST(Request, ReadsAnIntrinsicOperation) {
+    const Request request = readRequest(
+        intrinsic("EnumerateInstances",
+                  parameter("ClassName", className("X")) + parameter("DeepInheritance", text("TRUE")) +
+                      parameter("PropertyList", "<VALUE.ARRAY/>") + "<IPARAMVALUE NAME=\"LocalOnly\"></IPARAMVALUE>"));
+    EXPECT_EQ(request.id, "4711");
+    EXPECT_TRUE(request.intrinsic);
+    EXPECT_EQ(request.name, "EnumerateInstances");
+    EXPECT_EQ(request.nameSpace, "root/cimv2");
+    ASSERT_EQ(request.parameters.size(), 4U);
+    EXPECT_EQ(request.parameters[0].value.path->className, "X");
+    EXPECT_EQ(request.parameters[1].value.text, "TRUE");
+    EXPECT_EQ(request.parameters[2].value.kind, Kind::Array);
+    EXPECT_EQ(request.parameters[3].value.kind, Kind::None);
+}
+
+TEST(Request, ReadsAMethodOfAnInstanceAndOfAClass) {
+    const auto method = [](const std::string& target) {
+        return message("<SIMPLEREQ><METHODCALL NAME=\"Do\">" + target +
+                       "<PARAMVALUE NAME=\"A\" PARAMTYPE=\"uint8\"><VALUE>1</VALUE></PARAMVALUE>"
+                       "<PARAMVALUE NAME=\"B\"/></METHODCALL></SIMPLEREQ>");
+    };
+    const Request ofInstance = readRequest(
+        method("<LOCALINSTANCEPATH>" + localNameSpace + instanceName("X", key("K", "v")) + "</LOCALINSTANCEPATH>"));
+    EXPECT_FALSE(ofInstance.intrinsic);
+    EXPECT_TRUE(ofInstance.target.instance);
+    EXPECT_EQ(ofInstance.target.keys.at(0).value.text, "v");
+    EXPECT_EQ(ofInstance.nameSpace, "root/cimv2");
+    EXPECT_EQ(ofInstance.parameters.at(0).type, "uint8");
+    EXPECT_EQ(ofInstance.parameters.at(1).type, "");
+    const Request ofClass =
+        readRequest(method("<LOCALCLASSPATH>" + localNameSpace + className("X") + "</LOCALCLASSPATH>"));
+    EXPECT_FALSE(ofClass.target.instance);
+}
+
+TEST(Request, TakesVersionsByTheirFirstNumberAndSkipsCorrelators) {
+    const Request request =
+        readRequest("<CIM DTDVERSION='2.4' CIMVERSION='2.8'><MESSAGE PROTOCOLVERSION='1.4' ID='&lt;a&gt;'><SIMPLEREQ>"
+                    "<CORRELATOR NAME='a' TYPE='string'/><IMETHODCALL NAME='EnumerateQualifiers'>" +
+                    localNameSpace + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>");
+    EXPECT_EQ(request.id, "<a>");
+    EXPECT_EQ(request.protocolVersion, "1.4");
+}
+
+TEST(Request, RefusesWhatIsNoRequestOfOneOperation) {
+    const std::string call = "<IMETHODCALL NAME=\"GetClass\">" + localNameSpace + "</IMETHODCALL>";
+    const std::string simple = "<SIMPLEREQ>" + call + "</SIMPLEREQ>";
+    const auto versions = [&](const char* cimVersion, const char* dtdVersion, const char* protocolVersion) {
+        return std::string("<CIM CIMVERSION='") + cimVersion + "' DTDVERSION='" + dtdVersion +
+               "'><MESSAGE ID='1' PROTOCOLVERSION='" + protocolVersion + "'>" + simple + "</MESSAGE></CIM>";
+    };
+    struct {
+        std::string xml;
+        unsigned status;
+        const char* cimError;
+    } const bad[] = {
+        {"<XML/>", 400, "request-not-valid"},
+        {"<CIM/>", 400, "request-not-valid"},
+        {"<CIM CIMVERSION='2.0'/>", 400, "request-not-valid"},
+        {cim(""), 400, "request-not-valid"},
+        {cim("<DECLARATION/>"), 400, "request-not-valid"},
+        {cim("<MESSAGE PROTOCOLVERSION='1.0'>" + simple + "</MESSAGE>"), 400, "request-not-valid"},
+        {cim("<MESSAGE ID='1'>" + simple + "</MESSAGE>"), 400, "request-not-valid"},
+        {cim("<MESSAGE ID='1' PROTOCOLVERSION='1.0' OTHER=''>" + simple + "</MESSAGE>"), 400, "request-not-valid"},
+        {versions("3.0", "2.0", "1.0"), 501, "unsupported-cim-version"},
+        {versions("2", "2.0", "1.0"), 501, "unsupported-cim-version"},
+        {versions("", "2.0", "1.0"), 501, "unsupported-cim-version"},
+        {versions("2.0", "1.0", "1.0"), 501, "unsupported-dtd-version"},
+        {versions("2.0", "2.0", "2.0"), 501, "unsupported-protocol-version"},
+        {versions("2.0", "2.0", "10.0"), 501, "unsupported-protocol-version"},
+        {message("<MULTIREQ>" + simple + simple + "</MULTIREQ>"), 501, "multiple-requests-unsupported"},
+        {message(""), 400, "request-not-valid"},
+        {message("text"), 400, "request-not-valid"},
+        {message(simple + simple), 400, "request-not-valid"},
+        {message("<SIMPLERSP/>"), 400, "request-not-valid"},
+        {message("<SIMPLEEXPREQ/>"), 400, "request-not-valid"},
+        {message("<SIMPLEREQ/>"), 400, "request-not-valid"},
+        {message("<SIMPLEREQ>" + call + call + "</SIMPLEREQ>"), 400, "request-not-valid"},
+        {message("<SIMPLEREQ><EXPMETHODCALL NAME='A'/></SIMPLEREQ>"), 400, "request-not-valid"},
+        {message("<SIMPLEREQ><IMETHODCALL>" + localNameSpace + "</IMETHODCALL></SIMPLEREQ>"), 400, "request-not-valid"},
+        {message("<SIMPLEREQ><IMETHODCALL NAME='GetClass'/></SIMPLEREQ>"), 400, "request-not-valid"},
+        {intrinsic("GetClass", parameter("A", text("1")), ""), 400, "request-not-valid"},
+        {intrinsic("GetClass", "<PARAMVALUE NAME='A'/>"), 400, "request-not-valid"},
+        {intrinsic("GetClass", "<IPARAMVALUE/>"), 400, "request-not-valid"},
+        {intrinsic("GetClass", "<IPARAMVALUE NAME='A' PARAMTYPE='string'/>"), 400, "request-not-valid"},
+        {intrinsic("GetClass", parameter("A", "<NAMESPACE NAME='a'/>")), 400, "request-not-valid"},
+        {intrinsic("GetClass", parameter("A", text("1") + text("2"))), 400, "request-not-valid"},
+        {intrinsic("GetClass", parameter("A", "text")), 400, "request-not-valid"},
+        {intrinsic("GetClass", "", "<LOCALNAMESPACEPATH/>"), 400, "request-not-valid"},
+        {intrinsic("GetClass", "", "<NAMESPACEPATH/>"), 400, "request-not-valid"},
+        {message("<SIMPLEREQ><METHODCALL NAME='A'>" + className("X") + "</METHODCALL></SIMPLEREQ>"), 400,
+         "request-not-valid"},
+        {message("<SIMPLEREQ><METHODCALL NAME='A'>" + localNameSpace + "</METHODCALL></SIMPLEREQ>"), 400,
+         "request-not-valid"},
+        {intrinsic("GetClass", "").substr(0, 200), 400, "request-not-well-formed"},
+    };
+    for (const auto& each : bad) {
+        try {
+            readRequest(each.xml);
+            ADD_FAILURE() << each.xml << " was read";
+        } catch (const Refusal& refusal) {
+            EXPECT_EQ(refusal.status, each.status) << each.xml;
+            EXPECT_EQ(refusal.cimError, each.cimError) << each.xml << ": " << refusal.what();
+        }
+    }
+}
+
+} // namespace
+} // namespace cimxml
