@@ -1,0 +1,63 @@
+#include "objectmanager/endpoint/ClassElements.h"
+#include "objectmanager/endpoint/Operations.h"
+#include "objectmanager/endpoint/Qualifiers.h"
+
+namespace endpoint {
+namespace {
+
+/// The subclasses that the parameters ask for; all classes below, or those directly below, or at the top.
+std::vector<const om::ClassDeclaration*> subclasses(const Call& call) {
+    const std::optional<std::string> above = call.parameters.className("ClassName");
+    const bool deep = call.parameters.flag("DeepInheritance", false);
+    if (above) knownClass(call, *above);
+    std::vector<const om::ClassDeclaration*> found;
+    for (const om::ClassDeclaration& declared : call.schema().classes()) {
+        const bool direct = om::sameName(declared.superclass, above.value_or(""));
+        const bool below = !above || call.schema().isA(declared.superclass, *above);
+        if (deep ? below : direct) found.push_back(&declared);
+    }
+    return found;
+}
+
+} // namespace
+
+std::string getClass(const Call& call) {
+    const ClassSelection selection = ClassSelection::of(call, true);
+    const om::ResolvedClass& known =
+        knownClass(call, call.parameters.requiredClassName("ClassName"), CMPI_RC_ERR_NOT_FOUND);
+    cimxml::Writer writer;
+    writeClass(writer, call.schema(), *known.declaration, selection);
+    return returned(writer.text());
+}
+
+std::string enumerateClasses(const Call& call) {
+    const ClassSelection selection = ClassSelection::of(call, true);
+    cimxml::Writer writer;
+    for (const om::ClassDeclaration* declared : subclasses(call)) {
+        writeClass(writer, call.schema(), *declared, selection);
+    }
+    return returned(writer.text());
+}
+
+std::string enumerateClassNames(const Call& call) {
+    cimxml::Writer writer;
+    for (const om::ClassDeclaration* declared : subclasses(call)) writer.className(declared->name);
+    return returned(writer.text());
+}
+
+std::string getQualifier(const Call& call) {
+    const std::string name = call.parameters.requiredText("QualifierName");
+    const QualifierType* type = findQualifierType(name);
+    if (type == nullptr) fail(CMPI_RC_ERR_NOT_FOUND, "there is no qualifier " + name);
+    cimxml::Writer writer;
+    writeQualifierType(writer, *type);
+    return returned(writer.text());
+}
+
+std::string enumerateQualifiers(const Call&) {
+    cimxml::Writer writer;
+    for (const QualifierType& type : qualifierTypes()) writeQualifierType(writer, type);
+    return returned(writer.text());
+}
+
+} // namespace endpoint

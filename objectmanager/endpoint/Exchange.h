@@ -1,0 +1,48 @@
+#pragma once
+
+#include "objectmanager/endpoint/Operations.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+namespace endpoint {
+
+using Headers = std::vector<std::pair<std::string, std::string>>;
+
+struct HttpRequest {
+    std::string method;
+    std::string version = "HTTP/1.1";
+    std::string path = "/cimom";
+    Headers headers;
+    std::string body;
+};
+
+struct HttpAnswer {
+    unsigned status = 200;
+    Headers headers;
+    std::string body; ///< empty unless the status is 200
+
+    // For the log.
+    std::string operation; ///< empty where the request was not read so far
+    std::string nameSpace;
+    std::string className; ///< empty where the operation has none
+    int cimStatus = 0;
+    std::string detail; ///< what was wrong with a request that is refused
+};
+
+/// What DSP0200 says of headers. Whether a request's head is one of a CIM operation; nothing where it is, so that the
+/// body may be read.
+std::optional<HttpAnswer> refuseHead(const HttpRequest& request);
+
+/// The answer to a request whose head is not refused. `CIMObject` is compared leniently, since many clients do not
+/// encode it: its namespace and class, encoded or not, whatever its keys.
+HttpAnswer exchange(Operations& operations, const HttpRequest& request, const Caller& caller);
+
+/// A header's value, of several of that name joined by commas; nothing where there is none. Names compare without
+/// regard to case.
+std::optional<std::string> headerOf(const HttpRequest& request, std::string_view name);
+
+} // namespace endpoint
