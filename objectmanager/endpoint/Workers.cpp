@@ -1,0 +1,78 @@
+#include "objectmanager/endpoint/Workers.h"
+
+#include <chrono>
+#include <thread>
+
+namespace endpoint {
+
+Workers::Workers(std::size_t threads, std::size_t longestQueue, std::size_t mostThreads)
+    : longest(longestQueue), most(mostThreads) {
+    for (std::size_t i = 0; i < threads; ++i) start();
+}
+
+Workers::~Workers() {
+    stop();
+}
+
+void Workers::start() {
+    {
+        const std::lock_guard lock(shared->mutex);
+        ++shared->threads;
+    }
+    try {
+        std::thread([own = shared] { work(own); }).detach();
+    } catch (...) {
+        const std::lock_guard lock(shared->mutex);
+        --shared->threads;
+        throw;
+    }
+}
+
+void Workers::work(const std::shared_ptr<Shared>& shared) {
+    std::unique_lock lock(shared->mutex);
+    for (;;) {
+        shared->changed.wait(lock, [&] { return shared->stopping || shared->surplus > 0 || !shared->queue.empty(); });
+        if (shared->stopping || shared->surplus > 0) break;
+        const std::function<void()> job = std::move(shared->queue.front());
+        shared->queue.pop_front();
+        lock.unlock();
+        job();
+        lock.lock();
+    }
+    if (shared->surplus > 0) --shared->surplus;
+    --shared->threads;
+    shared->changed.notify_all();
+}
+
+bool Workers::post(std::function<void()> job) {
+    const std::lock_guard lock(shared->mutex);
+    if (shared->stopping || shared->queue.size() >= longest) return false;
+    shared->queue.push_back(std::move(job));
+    shared->changed.notify_all();
+    return true;
+}
+
+bool Workers::replace() {
+    {
+        const std::lock_guard lock(shared->mutex);
+        if (shared->threads >= most) return false;
+    }
+    start();
+    return true;
+}
+
+void Workers::cameBack() {
+    const std::lock_guard lock(shared->mutex);
+    ++shared->surplus;
+    shared->changed.notify_all();
+}
+
+bool Workers::stop() {
+    std::unique_lock lock(shared->mutex);
+    shared->stopping = true;
+    shared->queue.clear();
+    shared->changed.notify_all();
+    return shared->changed.wait_for(lock, std::chrono::seconds(1), [&] { return shared->threads == 0; });
+}
+
+} // namespace endpoint

@@ -1,0 +1,51 @@
+#pragma once
+
+#include <condition_variable>
+#include <cstddef>
+#include <deque>
+#include <functional>
+#include <memory>
+#include <mutex>
+
+namespace endpoint {
+
+/// Threads that run jobs in their order. A job that hangs holds its thread for good; `replace` lets another thread take
+/// its place, so that the others never wait for it.
+class Workers {
+public:
+    Workers(std::size_t threads, std::size_t longestQueue, std::size_t mostThreads);
+    /// Lets the jobs that are running end if they can within a second; those that hang are left to the process's end.
+    ~Workers();
+    Workers(const Workers&) = delete;
+    Workers& operator=(const Workers&) = delete;
+
+    /// Whether the job was taken; the queue is full otherwise.
+    bool post(std::function<void()> job);
+    /// Starts a thread beside one that hangs; false where there are too many already.
+    bool replace();
+    /// Says that a job came back after its thread had been replaced: one thread is too many then.
+    void cameBack();
+
+    /// Whether all threads have ended.
+    bool stop();
+
+private:
+    /// Outlives the object while a thread hangs.
+    struct Shared {
+        std::mutex mutex;
+        std::condition_variable changed;
+        std::deque<std::function<void()>> queue;
+        std::size_t threads = 0;
+        std::size_t surplus = 0; ///< threads that are to end
+        bool stopping = false;
+    };
+
+    static void work(const std::shared_ptr<Shared>& shared);
+    void start();
+
+    std::shared_ptr<Shared> shared = std::make_shared<Shared>();
+    std::size_t longest;
+    std::size_t most;
+};
+
+} // namespace endpoint
