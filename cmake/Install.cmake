@@ -1,4 +1,4 @@
-# What is installed where. Components: provider (libraries, schema, registration), tools; Development.cmake has the third.
+# What is installed where. Components: provider (libraries, schema, registration), tools, endpoint; Development.cmake has the fourth.
 
 set(public_libraries nvlog vkcommon vkproduct vkinstrumentation vkproviderutilities)
 set(runtime_libraries vknabaseserverprofileprovider ${public_libraries})
@@ -11,11 +11,15 @@ set(runtime_libraries vknabaseserverprofileprovider ${public_libraries})
 string(REPEAT "/." 200 room)
 set_target_properties(${runtime_libraries} PROPERTIES BUILD_WITH_INSTALL_RPATH ON INSTALL_RPATH "$ORIGIN${room}")
 
+if(VK_ENDPOINT)
+    set(endpoint_targets cimxml endpoint endpoint_server vkcimd)
+endif()
+
 # Debug information names the sources from the tree's root on, not where the tree lay when it was built.
 # gcov's notes name them as they are.
 if(NOT VK_COVERAGE)
     foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_broker vkcim_text vkcim_core vkcim
-            vk_command_line vk_snapshot vk-host-snapshot vk_check vk-provider-check)
+            vk_command_line vk_snapshot vk-host-snapshot vk_check vk-provider-check ${endpoint_targets})
         target_compile_options(${target} PRIVATE
             -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)
     endforeach()
@@ -69,3 +73,16 @@ endforeach()
 install(FILES ${VK_SCHEMA_DIR}/vkcim.schema.json docs/json/vk-provider-check.schema.json
     DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/vk-baseserver-tools COMPONENT tools)
 install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/examples COMPONENT tools)
+
+if(VK_ENDPOINT)
+    install(TARGETS vkcimd RUNTIME DESTINATION ${CMAKE_INSTALL_SBINDIR} COMPONENT endpoint)
+    vk_configured(docs/man/vkcimd.8.in ${CMAKE_INSTALL_MANDIR}/man8 endpoint FILES)
+    vk_configured(packaging/endpoint/vkcimd.service.in lib/systemd/system endpoint FILES)
+    install(FILES packaging/endpoint/vkcimd.socket DESTINATION lib/systemd/system COMPONENT endpoint)
+    install(FILES packaging/endpoint/vkcimd.conf DESTINATION ${CMAKE_INSTALL_SYSCONFDIR} COMPONENT endpoint)
+    set(pam debian)
+    if(CMAKE_INSTALL_LIBDIR STREQUAL lib64)
+        set(pam rpm)
+    endif()
+    install(FILES packaging/endpoint/pam.${pam} DESTINATION ${CMAKE_INSTALL_SYSCONFDIR}/pam.d RENAME vkcimd COMPONENT endpoint)
+endif()
