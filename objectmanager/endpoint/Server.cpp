@@ -153,7 +153,8 @@ private:
             auto connection = std::make_shared<Connection>();
             connection->kind = entry.listener.kind;
             connection->socket = MHD_get_connection_info(handle, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd;
-            entry.server->identify(*connection, handle);
+            identify(*connection, handle);
+            entry.server->refuseCrowds(*connection);
             entry.server->connections.insert(connection);
             *context = new std::shared_ptr<Connection>(std::move(connection));
         } else {
@@ -166,15 +167,23 @@ private:
     }
 
     /// Who is at the other end, as far as the socket says.
-    void identify(Connection& connection, MHD_Connection* handle) const {
+    static void identify(Connection& connection, MHD_Connection* handle) {
         if (connection.kind == Listener::Kind::Unix) {
-            const std::optional<uid_t> peer = peerOf(connection.socket);
-            connection.address = "unix:" + (peer ? std::to_string(*peer) : "?");
-            connection.caller = peer ? rightsOf(*peer) : Caller();
-            if (settings.anonymousRead) connection.caller->mayRead = true;
+            connection.peer = peerOf(connection.socket);
+            connection.address = "unix:" + (connection.peer ? std::to_string(*connection.peer) : "?");
         } else {
             connection.address =
                 addressText(MHD_get_connection_info(handle, MHD_CONNECTION_INFO_CLIENT_ADDRESS)->client_addr);
+        }
+    }
+
+    /// Under the lock. MHD counts the connections of network addresses; root may have as many as there are.
+    void refuseCrowds(const Connection& connection) const {
+        if (connection.kind != Listener::Kind::Unix || connection.peer == uid_t{0}) return;
+        const auto same = std::count_if(connections.begin(), connections.end(),
+                                        [&](const auto& each) { return each->address == connection.address; });
+        if (static_cast<unsigned>(same) >= settings.limits.connectionsPerAddress) {
+            shutdown(connection.socket, SHUT_RDWR);
         }
     }
 
@@ -222,7 +231,7 @@ private:
         const bool posted = work.http.method == "POST" || work.http.method == "M-POST";
         if (posted && !chunked && !headerOf(work.http, "Content-Length")) return plainAnswer(411, "no Content-Length");
         if (chunked && headerOf(work.http, "Content-Length")) return plainAnswer(400, "two lengths");
-        const bool named = work.connection->caller || headerOf(work.http, "Authorization");
+        const bool named = work.connection->kind == Listener::Kind::Unix || headerOf(work.http, "Authorization");
         if (!named && !mayBeAnonymous(*work.connection)) return challenge("no user is named");
         return refuseHead(work.http);
     }
@@ -286,8 +295,11 @@ private:
     std::optional<HttpAnswer> authenticate(Work& work) {
         Connection& connection = *work.connection;
         const std::string authorization = headerOf(work.http, "Authorization").value_or("");
-        if (connection.kind == Listener::Kind::Unix ||
-            (connection.caller && authorization == connection.authorization)) {
+        if (connection.kind == Listener::Kind::Unix) {
+            if (!connection.caller) connection.caller = connection.peer ? rightsOf(*connection.peer) : Caller();
+            work.caller = *connection.caller;
+            work.caller.mayRead = work.caller.mayRead || settings.anonymousRead;
+        } else if (connection.caller && authorization == connection.authorization) {
             work.caller = *connection.caller;
         } else if (authorization.empty()) {
             work.caller.mayRead = mayBeAnonymous(connection);

@@ -3,9 +3,12 @@
 #include "objectmanager/endpoint/Exchange.h"
 #include "objectmanager/endpoint/Listening.h"
 
+#include <sys/types.h>
+
 #include <chrono>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
 
 struct MHD_Connection;
@@ -18,8 +21,9 @@ struct Connection {
 
     Listener::Kind kind = Listener::Kind::Unix;
     int socket = -1;
-    std::string address;   ///< for the log
-    bool receiving = true; ///< a request is arriving, or expected
+    std::string address;       ///< for the log
+    std::optional<uid_t> peer; ///< at the other end of a Unix socket
+    bool receiving = true;     ///< a request is arriving, or expected
     Clock::time_point since = Clock::now();
     std::string authorization; ///< that has been checked: its user is `caller`
     std::optional<Caller> caller;

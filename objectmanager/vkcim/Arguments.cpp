@@ -153,6 +153,23 @@ private:
         dryRun = app.add_flag("--dry-run", arguments.dryRun,
                               "For modify and invoke: say what would be asked of which host, and do not ask");
         addFaults();
+        addRemote();
+    }
+
+    void addRemote() {
+        url = app.add_option("--url", arguments.remote.url,
+                             "Ask the CIM server there: https://HOST:5989, http://HOST:5988 or unix:PATH")
+                  ->type_name("URL");
+        app.add_option("--user", arguments.remote.user, "With --url: who asks; the password is asked for")
+            ->type_name("NAME")
+            ->needs(url);
+        app.add_option("--netrc-file", arguments.remote.netrcFile, "With --url: where user and password stand")
+            ->type_name("FILE")
+            ->needs(url);
+        app.add_option("--cacert", arguments.remote.certificates, "With --url: the certificates that are trusted")
+            ->type_name("FILE")
+            ->needs(url);
+        app.add_flag("--insecure", arguments.remote.insecure, "With --url: trust every certificate")->needs(url);
     }
 
     void addFaults() {
@@ -267,6 +284,7 @@ private:
     CLI::Option* threads = nullptr;
     std::string faultText;
     CLI::Option* fault = nullptr;
+    CLI::Option* url = nullptr;
     CLI::Option* timing = nullptr;
     CLI::Option* verbose = nullptr;
     CLI::Option* dryRun = nullptr;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "objectmanager/vkcim/Commands.h"
+#include "objectmanager/vkcim/Remote.h"
 
 #include <cstddef>
 #include <optional>
@@ -30,6 +31,7 @@ struct Arguments {
     bool verbose = false;
     bool dryRun = false;
     std::optional<om::Fault> fault;
+    RemoteOptions remote; ///< the server that is asked instead of a library
 };
 
 /// Either arguments to run, or a text to print and the status to exit with.

@@ -102,9 +102,37 @@ private:
 
     static std::string cannotRead(const std::string& problem) { return "the host cannot be read: " + problem; }
 
+    bool isRemote() const { return !arguments.remote.url.empty(); }
+
+    /// What the libraries of this host know of it says nothing of another one.
+    std::string hostProblemHere() const { return isRemote() ? std::string() : hostProblem(arguments.provider); }
+
+    /// Who answers: a provider's library, or a server.
+    class Answering {
+    public:
+        Answering(const Runner& runner, const std::string& nameSpace) {
+            if (runner.isRemote())
+                server.emplace(runner.arguments.remote, runner.schema);
+            else
+                manager.emplace(runner.library(), runner.arguments.provider, nameSpace, runner.schema);
+        }
+
+        om::Answer run(const om::Request& request, Nanoseconds* elapsed = nullptr) {
+            if (manager) return manager->run(request, elapsed);
+            const auto started = std::chrono::steady_clock::now();
+            om::Answer answer = server->run(request);
+            if (elapsed != nullptr) *elapsed = std::chrono::steady_clock::now() - started;
+            return answer;
+        }
+
+    private:
+        std::optional<om::ObjectManager> manager;
+        std::optional<RemoteServer> server;
+    };
+
     // In both, the provider has cleaned up and is unloaded before anything is printed.
     Outcome ask(const om::Request& request) const {
-        om::ObjectManager manager(library(), arguments.provider, request.path.nameSpace, schema);
+        Answering manager(*this, request.path.nameSpace);
         const LastFailure failure;
         Outcome outcome;
         outcome.repeated = repeatedly([&](Nanoseconds& elapsed) { return manager.run(request, &elapsed); },
@@ -116,20 +144,20 @@ private:
             again.path = request.path;
             outcome.unchanged = notChanged(request, manager.run(again), reason, schema);
         }
-        outcome.hostProblem = hostProblem(arguments.provider);
+        outcome.hostProblem = hostProblemHere();
         return outcome;
     }
 
     Report askEverything(Timing& timing, std::string& problem) const {
-        om::ObjectManager manager(library(), arguments.provider, arguments.nameSpace, schema);
+        Answering manager(*this, arguments.nameSpace);
         std::optional<QuietErrors> quiet;
         if (!arguments.verbose) quiet.emplace();
         return makeReport(
             schema, arguments.nameSpace, arguments.properties,
             [&](const om::Request& request) { return manager.run(request, &timing.runs.emplace_back()); },
             [&] {
-                problem = hostProblem(arguments.provider);
-                return hostNotes(arguments.provider);
+                problem = hostProblemHere();
+                return isRemote() ? std::vector<std::string>() : hostNotes(arguments.provider);
             });
     }
 
@@ -157,6 +185,7 @@ private:
     }
 
     std::string dryRunText(const om::Request& request) const {
+        if (isRemote()) throw std::runtime_error("--dry-run does not go with --url");
         const om::ObjectManager manager(library(), arguments.provider, request.path.nameSpace, schema);
         const bool calls = request.operation == om::Operation::InvokeMethod;
         std::string text =
