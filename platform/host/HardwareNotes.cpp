@@ -40,8 +40,7 @@ std::vector<std::string> notesOn(const HardwareFacts& facts) {
     noteMissing(notes, "serial number", facts.serial);
     noteMissing(notes, "manufacturer", facts.manufacturer);
     noteMissing(notes, "model", facts.model);
-    if (facts.chassis.empty())
-        notes.push_back("no chassis: " + reason(facts.noChassis, "the host has none"));
+    if (facts.chassis.empty()) notes.push_back("no chassis: " + reason(facts.noChassis, "the host has none"));
     noteMissing(notes, "primary owner", facts.ownerName);
     return notes;
 }

@@ -1,5 +1,5 @@
-#include "nvlog/LogWatch.h"
 #include "nvlog/NVLogger.h"
+#include "nvlog/LogWatch.h"
 
 #include "platform/logger/LoggingProcess.h"
 #include "support/TemporaryDirectory.h"
@@ -70,8 +70,8 @@ TEST(LogWatch, SeesTheLinesOfTheLogChannelThatAreKept) {
     quietly({{"NVLOG_SINK", "file:/dev/null"}, {"NVLOG_LEVELS", "3000,6000"}}, [] {
         std::vector<std::string> seen;
         const NVLogWatch watch = {[](void* context, int level, const char* text) {
-                                      static_cast<std::vector<std::string>*>(context)->push_back(
-                                          std::to_string(level) + text);
+                                      static_cast<std::vector<std::string>*>(context)->push_back(std::to_string(level) +
+                                                                                                 text);
                                   },
                                   &seen};
         log("before");
