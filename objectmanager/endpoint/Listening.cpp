@@ -11,7 +11,7 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <cstdlib>
+#include <charconv>
 #include <cstring>
 #include <memory>
 #include <stdexcept>
@@ -136,7 +136,11 @@ ListenUrl::ListenUrl(const std::string& given) : kind(Listener::Kind::Unix), tex
     host = hasPort ? rest.substr(0, colon) : rest;
     port = hasPort ? std::string(rest.substr(colon + 1)) : plain ? "5988" : "5989";
     if (host.size() >= 2 && host.front() == '[' && host.back() == ']') host = host.substr(1, host.size() - 2);
-    if (port.size() > 5 || std::atol(port.c_str()) > 65535) throw std::invalid_argument("'" + text + "': no such port");
+    in_port_t number = 0;
+    const auto [end, error] = std::from_chars(port.data(), port.data() + port.size(), number);
+    if (error != std::errc() || end != port.data() + port.size()) {
+        throw std::invalid_argument("'" + text + "': no such port");
+    }
     const Addresses addresses = host.empty() ? Addresses(nullptr, freeaddrinfo) : resolve(host, port);
     if (!addresses) throw std::invalid_argument("'" + text + "' has no address");
     if (plain && !isLoopback(addresses->ai_addr)) {

@@ -113,9 +113,9 @@ std::string Operations::content(const cimxml::Request& request, const Caller& ca
     }
     static const std::vector<cimxml::ParameterElement> none;
     const Parameters parameters(request.intrinsic ? request.parameters : none,
-                                request.intrinsic ? row->parameters : Names{});
+                                row != nullptr ? row->parameters : Names{});
     const Call call{request, parameters, *space, caller, hostName, contexts};
-    return request.intrinsic ? row->run(call) : invokeMethod(call);
+    return row != nullptr ? row->run(call) : invokeMethod(call);
 }
 
 Outcome Operations::answer(const cimxml::Request& request, const Caller& caller) {
