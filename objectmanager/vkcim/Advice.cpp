@@ -13,6 +13,7 @@ namespace {
 template <class Named>
 std::vector<std::string> namesOf(const std::vector<Named>& all) {
     std::vector<std::string> names;
+    names.reserve(all.size());
     for (const Named& each : all) names.push_back(each.name);
     return names;
 }
