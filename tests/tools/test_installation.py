@@ -14,6 +14,9 @@ PREFIX = directory() / "installed"
 install(PREFIX)
 LIBRARIES = ["nvlog", "vkcommon", "vkproduct", "vkinstrumentation", "vkproviderutilities",
              "vknabaseserverprofileprovider"]
+# Of a tree with VK_ENDPOINT=ON.
+ENDPOINT = ["sbin/vkcimd", "share/man/man8/vkcimd.8", "lib/systemd/system/vkcimd.service", "lib/systemd/system/vkcimd.socket",
+            "etc/vkcimd.conf", "etc/pam.d/vkcimd"] if (BUILD / "bin/vkcimd").exists() else []
 EXAMPLE = PREFIX / "share/vk-baseserver/examples/rack-server.json"
 OPEN = "import ctypes, sys; ctypes.CDLL(sys.argv[1], mode=ctypes.RTLD_GLOBAL).BaseServerProvider_Create_InstanceMI"
 
@@ -38,6 +41,7 @@ class Contents(unittest.TestCase):
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
         expected += ["lib/vk/ntp/daemons.sh", "lib/vk/ntp/ntp", "lib/vk/ntp/ntpd", "sbin/vk-ntp-setup",
                      "share/man/man8/vk-ntp-setup.8"]
+        expected += ENDPOINT
         expected += [f"share/vk-baseserver/register/{path.name}" for path in (SOURCE / "tools/register").glob("*.py")]
         expected += [f"lib/pkgconfig/{name}.pc" for name in LIBRARIES[:-1] + ["vk-cmpi"]]
         expected += [f"lib/cmake/vk-baseserver/vk-baseserver-config{part}.cmake"
@@ -48,7 +52,7 @@ class Contents(unittest.TestCase):
 
     def test_each_component_alone_holds_its_part_and_all_of_them_everything(self):
         parts = []
-        for component in ("provider", "tools", "development", "ntp"):
+        for component in ["provider", "tools", "development", "ntp"] + ["endpoint"] * bool(ENDPOINT):
             where = directory() / "p"
             install(where, component=component)
             parts += [str(p.relative_to(where)) for p in files_below(where)]
