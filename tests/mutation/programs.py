@@ -15,7 +15,7 @@ ROOMS = ("provider", "cmpi", "Linux", "include", "platform")
 WHOLE = re.compile(r"(load|system)\.")  # tests that are no GoogleTest programs
 ENDLESS = "no end"
 LIKELY = 6  # single tests that are tried before whole programs
-UNSTEADY = 4  # times that an unchanged program is tried, each without the tests that failed before
+UNSTEADY = 4  # times that an unchanged program is tried, each without the single tests that failed before
 SECONDS = 5  # that a program may compute beyond five times what it takes unchanged
 
 
@@ -131,10 +131,9 @@ class Programs:
                 if failed is None:
                     self.reached[program.key()] = reached.read()
                     return
-                if "." not in failed or not program.path:
-                    break
-                print(f"left out, for it fails unchanged: {program.target}: {failed}", flush=True)
-                self.left_out[program.target].append(failed)
+                if program.path and "." in failed:
+                    print(f"left out, for it fails unchanged: {program.target}: {failed}", flush=True)
+                    self.left_out[program.target].append(failed)
         raise workspace.Failure(f"the unchanged copy fails: {program.target}: {failed}")
 
     def failure_of(self, program, mutant=None):

@@ -35,7 +35,8 @@ __attribute__((unused, noinline, cold)) static void vkChoose() {
     vkCall(SYS_prlimit64, 0, 5 /* RLIMIT_RSS */, 0, limits);
     if (limits[0] == 0) {
         int file = (int)vkCall(SYS_openat, -100, "@REACHED@", 2);
-        long map = file < 0 ? -1 : vkCall(SYS_mmap, 0, @SIZE@, 3, 1, file, 0);
+        // At one address for all sources, so that libraries that are loaded again do not leave a map each time.
+        long map = file < 0 ? -1 : vkCall(SYS_mmap, 1L << 45, @SIZE@, 3, 1 | 0x10 /* MAP_FIXED */, file, 0);
         if (file >= 0) vkCall(SYS_close, file);
         if (map != -1) vkReached = (unsigned char*)map;
     }

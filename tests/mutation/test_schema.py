@@ -175,6 +175,16 @@ int main() {
         reached = built.copy.reached.read_bytes()
         self.assertEqual({mutant.line for mutant, number in built.numbers.items() if reached[number]}, {2, 4})
 
+    def test_a_library_that_is_loaded_again_leaves_no_map_each_time(self):
+        built = self.built("int ask(int count) {\n    return count > 1;\n}\n\nint main() {}\n")
+        built.copy.reached.write_bytes(bytes(built.size))
+        for name in ("first.so", "second.so"):
+            subprocess.run(["g++", "-shared", "-fPIC", "-o", name, "main.cpp"], cwd=self.root, check=True)
+        load = (f"import ctypes\nfor name in ('first.so', 'second.so'): ctypes.CDLL('{self.root}/' + name)['_Z3aski'](2)\n"
+                "print(sum('reached' in line for line in open('/proc/self/maps')))")
+        asked = subprocess.run(["prlimit", "--rss=0:", sys.executable, "-c", load], check=True, stdout=subprocess.PIPE)
+        self.assertEqual(asked.stdout, b"1\n")
+
 
 if __name__ == "__main__":
     unittest.main()
