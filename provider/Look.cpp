@@ -6,18 +6,29 @@
 #include <dlfcn.h>
 
 namespace VK::BaseServerProvider {
+namespace {
+
+using Look = decltype(&vkWithinLook);
+
+void searchLook(void (*work)(void*), void* data);
+
+constinit std::atomic<Look> look{searchLook}; ///< from the first call on, what was found
+
+void withoutLook(void (*work)(void*), void* data) {
+    work(data);
+}
+
+/// Among the libraries that the provider was loaded with. Nobody waits for another thread's search.
+void searchLook(void (*work)(void*), void* data) {
+    const auto found = reinterpret_cast<Look>(dlsym(RTLD_DEFAULT, "vkWithinLook"));
+    look = found != nullptr ? found : withoutLook;
+    withinLook(work, data);
+}
+
+} // namespace
 
 void withinLook(void (*work)(void*), void* data) {
-    // Among the libraries that the provider was loaded with. Found once; nobody waits for another thread's search.
-    static std::atomic<decltype(&vkWithinLook)> found{nullptr};
-    static std::atomic<bool> searched{false};
-    if (!searched.load(std::memory_order_acquire)) {
-        found = reinterpret_cast<decltype(&vkWithinLook)>(dlsym(RTLD_DEFAULT, "vkWithinLook"));
-        searched.store(true, std::memory_order_release);
-    }
-    const auto look = found.load(std::memory_order_relaxed);
-    if (look == nullptr) return work(data);
-    look(work, data);
+    look.load(std::memory_order_relaxed)(work, data);
 }
 
 } // namespace VK::BaseServerProvider

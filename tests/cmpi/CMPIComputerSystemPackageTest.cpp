@@ -121,6 +121,13 @@ TEST(CMPIComputerSystemPackage, LeadsFromAComputerToAllItsChassisAndBack) {
     EXPECT_THAT(tags, ElementsAre("A", "B"));
 }
 
+TEST(CMPIComputerSystemPackage, LeadsToAChassisWithAnEmptySerialNumber) {
+    test::simulate({test::computer(0, "a"), test::chassis(0, 0, "")});
+    const std::vector<om::ObjectPath> there = test::paths(test::associatorNames(computerPath("a"), className));
+    ASSERT_EQ(there.size(), 1U);
+    EXPECT_EQ(test::text(*test::find(there[0].keys, "Tag")), "");
+}
+
 TEST(CMPIComputerSystemPackage, LeadsFromAChassisNowhereOnAHostWithoutComputer) {
     test::simulate({test::chassis(0, 0, "A")});
     const om::Answer answer = test::associatorNames(test::path("VESKA_PhysicalPackage"), className);
