@@ -68,10 +68,6 @@ constexpr CMPIInstanceFT makeTable() {
     return ft;
 }
 
-bool contains(const std::vector<std::string>& names, std::string_view name) {
-    return std::any_of(names.begin(), names.end(), [name](const std::string& each) { return sameName(each, name); });
-}
-
 } // namespace
 
 const CMPIInstanceFT InstanceObject::table = makeTable();
@@ -87,7 +83,7 @@ void InstanceObject::set(const char* name, const CMPIValue* value, CMPIType type
         if (type == CMPI_null) given.type = declared->type;
         if (given.type != declared->type) throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     }
-    if (filter && !contains(*filter, property)) return;
+    if (filter && !containsName(*filter, property)) return;
     putValue(instance.properties, property, std::move(given));
 }
 
@@ -107,7 +103,7 @@ void InstanceObject::setFilter(const char** properties, const char** keys) {
     for (; keys != nullptr && *keys != nullptr; ++keys) names.emplace_back(*keys);
     auto& list = instance.properties;
     list.erase(std::remove_if(list.begin(), list.end(),
-                              [&names](const NamedValue& each) { return !contains(names, each.first); }),
+                              [&names](const NamedValue& each) { return !containsName(names, each.first); }),
                list.end());
     filter = std::move(names);
 }

@@ -18,7 +18,7 @@ struct Candidate {
 /// The references of an association class, nearest class first.
 std::vector<const om::PropertyDeclaration*> referencesOf(const om::Schema& schema, const std::string& className) {
     std::vector<const om::PropertyDeclaration*> found;
-    for (const om::ClassDeclaration* c = schema.find(className); c != nullptr; c = schema.find(c->superclass)) {
+    for (const om::ClassDeclaration* c : schema.line(className)) {
         for (const om::PropertyDeclaration& property : c->properties) {
             const bool again = std::any_of(found.begin(), found.end(),
                                            [&](const auto* each) { return om::sameName(each->name, property.name); });
@@ -89,31 +89,17 @@ om::Request requestThrough(const Call& call, const Traversal& traversal, const C
     return request;
 }
 
-const std::string& classOf(const om::ObjectPath& path) {
-    return path.className;
-}
-const std::string& classOf(const om::Instance& instance) {
-    return instance.path.className;
-}
-
 template <class Result>
 std::vector<Result> results(const Call& call, const Traversal& traversal, bool names, const Selection* selection) {
-    std::vector<Result> found;
-    std::size_t refused = 0;
     const auto through = candidates(call, traversal, call.schema().servedAssociations());
+    std::vector<om::Request> requests;
     for (const Candidate& each : through) {
-        om::Request request = requestThrough(call, traversal, each, names);
-        if (selection != nullptr) request.propertyList = selection->properties();
-        try {
-            for (auto& result : ask(call, std::move(request)).results) {
-                auto* one = std::get_if<Result>(&result);
-                if (one != nullptr && isWanted(call, traversal, each, classOf(*one))) found.push_back(std::move(*one));
-            }
-        } catch (const cimxml::CimError& error) { // where another association answers, one that cannot is passed over
-            if (error.code != CMPI_RC_ERR_NOT_SUPPORTED || ++refused == through.size()) throw;
-        }
+        requests.push_back(requestThrough(call, traversal, each, names));
+        if (selection != nullptr) requests.back().propertyList = selection->properties();
     }
-    return found;
+    return wantedResults<Result>(call, requests, [&](std::size_t which, const om::ObjectPath& path) {
+        return isWanted(call, traversal, through[which], path.className);
+    });
 }
 
 void expectClass(const Call& call, const std::optional<std::string>& name) {

@@ -44,18 +44,8 @@ void expectAllKeys(const Call& call, const om::ObjectPath& path) {
     }
 }
 
-std::vector<std::string> servedBelow(const Call& call, std::string_view className) {
-    std::vector<std::string> found = call.schema().served();
-    found.erase(std::remove_if(found.begin(), found.end(),
-                               [&](const std::string& each) { return !call.schema().isA(each, className); }),
-                found.end());
-    return found;
-}
-
 bool isServed(const Call& call, std::string_view className) {
-    const std::vector<std::string> served = call.schema().served();
-    return std::any_of(served.begin(), served.end(),
-                       [&](const std::string& each) { return om::sameName(each, className); });
+    return om::containsName(call.schema().served(), className);
 }
 
 om::Answer ask(const Call& call, om::Request request) {
@@ -77,18 +67,16 @@ om::Answer ask(const Call& call, om::Request request) {
     return answer;
 }
 
-om::Answer askAll(const Call& call, const std::vector<om::Request>& requests) {
-    om::Answer all;
+void askEach(const Call& call, const std::vector<om::Request>& requests,
+             const std::function<void(std::size_t, om::Answer)>& take) {
     std::size_t refused = 0;
-    for (const om::Request& request : requests) {
+    for (std::size_t i = 0; i < requests.size(); ++i) {
         try {
-            om::Answer answer = ask(call, request);
-            std::move(answer.results.begin(), answer.results.end(), std::back_inserter(all.results));
+            take(i, ask(call, requests[i]));
         } catch (const cimxml::CimError& error) {
             if (error.code != CMPI_RC_ERR_NOT_SUPPORTED || ++refused == requests.size()) throw;
         }
     }
-    return all;
 }
 
 om::Request requestFor(const Call& call, om::Operation operation, om::ObjectPath path) {

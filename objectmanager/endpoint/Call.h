@@ -6,6 +6,8 @@
 #include "objectmanager/endpoint/NameSpace.h"
 #include "objectmanager/endpoint/Parameters.h"
 
+#include <cstddef>
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -42,15 +44,14 @@ om::ObjectPath typedPath(const Call& call, const cimxml::PathElement& element,
 /// Throws INVALID_PARAMETER where a key of the class is missing.
 void expectAllKeys(const Call& call, const om::ObjectPath& path);
 
-/// The classes that a provider serves and that are the class or below it. Each is asked for its own instances.
-std::vector<std::string> servedBelow(const Call& call, std::string_view className);
 bool isServed(const Call& call, std::string_view className);
 
 /// Asks the namespace's provider; a status other than OK is thrown as CimError.
 om::Answer ask(const Call& call, om::Request request);
-/// Asks for each of these requests and returns all results. One that answers NOT_SUPPORTED is passed over where another
-/// one answers.
-om::Answer askAll(const Call& call, const std::vector<om::Request>& requests);
+/// Asks for each of these requests and hands over its answer, with its place among them. One that answers NOT_SUPPORTED
+/// is passed over where another one answers.
+void askEach(const Call& call, const std::vector<om::Request>& requests,
+             const std::function<void(std::size_t, om::Answer)>& take);
 
 om::Request requestFor(const Call& call, om::Operation operation, om::ObjectPath path);
 om::Request requestFor(const Call& call, om::Operation operation, const std::string& className);

@@ -19,13 +19,6 @@ std::vector<const om::Qualifiers*> qualifiersOf(const Line<T>& line) {
     return found;
 }
 
-/// A class and its superclasses, nearest first.
-std::vector<const om::ClassDeclaration*> ancestry(const om::Schema& schema, const om::ClassDeclaration& declared) {
-    std::vector<const om::ClassDeclaration*> line;
-    for (const om::ClassDeclaration* c = &declared; c != nullptr; c = schema.find(c->superclass)) line.push_back(c);
-    return line;
-}
-
 /// Properties or methods of a class, inherited ones first, each with the declarations that it overrides.
 template <class T>
 std::vector<Line<T>> members(const std::vector<const om::ClassDeclaration*>& classes,
@@ -50,7 +43,7 @@ class ClassWriter {
 public:
     ClassWriter(cimxml::Writer& target, const om::Schema& classes, const om::ClassDeclaration& written,
                 const ClassSelection& parts)
-        : writer(target), schema(classes), declared(written), selection(parts), line(ancestry(classes, written)) {}
+        : writer(target), schema(classes), declared(written), selection(parts), line(classes.line(written.name)) {}
 
     void write() {
         if (declared.superclass.empty()) {
@@ -75,8 +68,7 @@ private:
     }
 
     bool wants(const std::string& name) const {
-        return !selection.properties || std::any_of(selection.properties->begin(), selection.properties->end(),
-                                                    [&](const std::string& each) { return om::sameName(each, name); });
+        return !selection.properties || om::containsName(*selection.properties, name);
     }
 
     void property(const Line<om::PropertyDeclaration>& each) {

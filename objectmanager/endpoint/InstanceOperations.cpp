@@ -15,28 +15,18 @@ om::ObjectPath servedPath(const Call& call, const cimxml::PathElement& element) 
     return path;
 }
 
-const om::ObjectPath& pathOf(const om::ObjectPath& path) {
-    return path;
-}
-const om::ObjectPath& pathOf(const om::Instance& instance) {
-    return instance.path;
-}
-
 /// All that the providers of the class and its subclasses return, without what is of no such class.
 template <class Result>
 std::vector<Result> resultsBelow(const Call& call, const std::string& className, om::Operation operation,
                                  const std::optional<std::vector<std::string>>& properties) {
-    std::vector<Result> found;
     std::vector<om::Request> requests;
-    for (const std::string& served : servedBelow(call, className)) {
+    for (const std::string& served : call.schema().servedBelow(className)) {
         requests.push_back(requestFor(call, operation, served));
         requests.back().propertyList = properties;
     }
-    for (auto& result : askAll(call, requests).results) {
-        auto* one = std::get_if<Result>(&result);
-        if (one != nullptr && call.schema().isA(pathOf(*one).className, className)) found.push_back(std::move(*one));
-    }
-    return found;
+    return wantedResults<Result>(call, requests, [&](std::size_t, const om::ObjectPath& path) {
+        return call.schema().isA(path.className, className);
+    });
 }
 
 /// The instance of a path; NOT_FOUND where the provider returned none. A path that lacks a key is taken only where
@@ -65,9 +55,7 @@ std::vector<om::NamedValue> changedValues(const om::Instance& instance,
                                           const std::optional<std::vector<std::string>>& list) {
     std::vector<om::NamedValue> values;
     for (const om::NamedValue& property : instance.properties) {
-        const bool listed = list && std::any_of(list->begin(), list->end(), [&](const std::string& name) {
-                                return om::sameName(name, property.first);
-                            });
+        const bool listed = list && om::containsName(*list, property.first);
         if (listed || (!list && !property.second.isNull())) values.push_back(property);
     }
     return values;

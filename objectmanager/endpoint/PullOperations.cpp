@@ -56,62 +56,58 @@ std::string deliver(const Call& call, Enumeration enumeration, std::uint32_t cou
     return writer.take();
 }
 
-Enumeration newEnumeration(const Call& call, bool paths) {
+/// What an opening operation asks of its enumeration, made and checked before a provider is asked.
+struct Opening {
+    Enumeration enumeration;
+    std::uint32_t firstCount;
+};
+
+Opening opening(const Call& call, bool paths) {
+    checkFilters(call);
     Enumeration enumeration;
     enumeration.nameSpace = call.space.name;
     enumeration.user = call.caller.user;
     enumeration.paths = paths;
     enumeration.timeout = timeoutOf(call);
-    return enumeration;
+    return {std::move(enumeration), call.parameters.number("MaxObjectCount").value_or(0)};
 }
 
-std::uint32_t firstCount(const Call& call) {
-    return call.parameters.number("MaxObjectCount").value_or(0);
-}
-
-std::string openInstances(const Call& call, const Selection& selection, const std::vector<om::Instance>& instances) {
-    Enumeration enumeration = newEnumeration(call, false);
+std::string openInstances(const Call& call, Opening opened, const Selection& selection,
+                          const std::vector<om::Instance>& instances) {
     for (const om::Instance& instance : instances) {
         cimxml::Writer writer;
         writer.open("VALUE.INSTANCEWITHPATH");
         writer.instancePath(instance.path, call.host);
         selection.write(writer, instance);
         writer.close("VALUE.INSTANCEWITHPATH");
-        enumeration.elements.push_back(writer.take());
+        opened.enumeration.elements.push_back(writer.take());
     }
-    return deliver(call, std::move(enumeration), firstCount(call), {});
+    return deliver(call, std::move(opened.enumeration), opened.firstCount, {});
 }
 
-std::string openPaths(const Call& call, const std::vector<om::ObjectPath>& paths) {
-    Enumeration enumeration = newEnumeration(call, true);
+std::string openPaths(const Call& call, Opening opened, const std::vector<om::ObjectPath>& paths) {
     for (const om::ObjectPath& path : paths) {
         cimxml::Writer writer;
         writer.instancePath(path, call.host);
-        enumeration.elements.push_back(writer.take());
+        opened.enumeration.elements.push_back(writer.take());
     }
-    return deliver(call, std::move(enumeration), firstCount(call), {});
-}
-
-/// What all opening operations check before a provider is asked.
-void checkOpening(const Call& call) {
-    checkFilters(call);
-    timeoutOf(call);
-    firstCount(call);
+    return deliver(call, std::move(opened.enumeration), opened.firstCount, {});
 }
 
 Traversal openedTraversal(const Call& call, bool toReferences) {
-    checkOpening(call);
     return traversalFrom(call, call.parameters.requiredInstanceName("InstanceName"), toReferences);
 }
 
 std::string openTraversedInstances(const Call& call, bool toReferences) {
     const Selection selection(call);
+    Opening opened = opening(call, false);
     const Traversal traversal = openedTraversal(call, toReferences);
-    return openInstances(call, selection, associatedInstances(call, traversal, selection));
+    return openInstances(call, std::move(opened), selection, associatedInstances(call, traversal, selection));
 }
 
 std::string openTraversedPaths(const Call& call, bool toReferences) {
-    return openPaths(call, associatedPaths(call, openedTraversal(call, toReferences)));
+    Opening opened = opening(call, true);
+    return openPaths(call, std::move(opened), associatedPaths(call, openedTraversal(call, toReferences)));
 }
 
 /// The enumeration of the caller's context. One of another kind, namespace or user stays as it is.
@@ -134,15 +130,15 @@ std::string pull(const Call& call, bool paths) {
 } // namespace
 
 std::string openEnumerateInstances(const Call& call) {
-    checkOpening(call);
+    Opening opened = opening(call, false);
     Selection selection(call);
     const std::vector<om::Instance> instances = instancesOfClass(call, selection);
-    return openInstances(call, selection, instances);
+    return openInstances(call, std::move(opened), selection, instances);
 }
 
 std::string openEnumerateInstancePaths(const Call& call) {
-    checkOpening(call);
-    return openPaths(call, pathsOfClass(call));
+    Opening opened = opening(call, true);
+    return openPaths(call, std::move(opened), pathsOfClass(call));
 }
 
 std::string openAssociatorInstances(const Call& call) {

@@ -7,6 +7,27 @@
 
 namespace endpoint {
 
+inline const om::ObjectPath& pathOf(const om::ObjectPath& path) {
+    return path;
+}
+inline const om::ObjectPath& pathOf(const om::Instance& instance) {
+    return instance.path;
+}
+
+/// What the providers return to several requests (askEach) and is wanted: `isWanted` is given the request's place and
+/// the result's path.
+template <class Result, class Wanted>
+std::vector<Result> wantedResults(const Call& call, const std::vector<om::Request>& requests, Wanted isWanted) {
+    std::vector<Result> found;
+    askEach(call, requests, [&](std::size_t which, om::Answer answer) {
+        for (auto& result : answer.results) {
+            auto* one = std::get_if<Result>(&result);
+            if (one != nullptr && isWanted(which, pathOf(*one))) found.push_back(std::move(*one));
+        }
+    });
+    return found;
+}
+
 /// The instances or paths that an enumeration or association returns, as the plain and the pulled operations share
 /// them. All throw CimError.
 std::vector<om::Instance> instancesOfClass(const Call& call, Selection& selection);

@@ -13,7 +13,7 @@ bool declares(const Declarations& list, std::string_view name) {
 template <class Member>
 std::string_view origin(const om::Schema& schema, std::string_view className, std::string_view name, Member member) {
     std::string_view found;
-    for (const om::ClassDeclaration* c = schema.find(className); c != nullptr; c = schema.find(c->superclass)) {
+    for (const om::ClassDeclaration* c : schema.line(className)) {
         if (declares(c->*member, name)) found = c->name;
     }
     return found;
@@ -39,8 +39,7 @@ Selection::Selection(const Call& given)
 bool Selection::wants(const om::ResolvedClass* known, const std::string& property) const {
     if (known != nullptr && known->findProperty(property) == nullptr) return false;
     if (limit != nullptr && limit->findProperty(property) == nullptr) return false;
-    return !list || std::any_of(list->begin(), list->end(),
-                                [&](const std::string& name) { return om::sameName(name, property); });
+    return !list || om::containsName(*list, property);
 }
 
 om::Instance Selection::of(om::Instance instance) const {

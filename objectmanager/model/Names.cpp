@@ -10,6 +10,10 @@ bool sameName(std::string_view a, std::string_view b) {
            std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) { return lower(x) == lower(y); });
 }
 
+bool containsName(const std::vector<std::string>& names, std::string_view name) {
+    return std::any_of(names.begin(), names.end(), [name](const std::string& each) { return sameName(each, name); });
+}
+
 std::size_t NameHash::operator()(std::string_view name) const {
     std::uint64_t hash = 14695981039346656037U; // FNV-1a
     for (const char c : name) hash = (hash ^ static_cast<unsigned char>(lower(c))) * 1099511628211U;

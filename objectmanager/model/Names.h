@@ -3,6 +3,7 @@
 #include "objectmanager/model/Values.h"
 
 #include <cstddef>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -15,6 +16,8 @@ constexpr char lower(char c) {
 
 /// Whether two CIM names are the same: they compare without regard to case.
 bool sameName(std::string_view a, std::string_view b);
+/// Whether the list has the name.
+bool containsName(const std::vector<std::string>& names, std::string_view name);
 
 /// Hash and equality of CIM names, for hash tables that are searched without making a lower-case copy first.
 struct NameHash {

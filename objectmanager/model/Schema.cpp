@@ -84,6 +84,12 @@ std::vector<std::string_view> Schema::wordsFor(std::string_view className, const
     return declared == nullptr ? std::vector<std::string_view>() : om::wordsFor(declared->qualifiers, property.second);
 }
 
+std::vector<std::string> Schema::servedBelow(std::string_view className) const {
+    std::vector<std::string> found = served();
+    std::erase_if(found, [&](const std::string& each) { return !isA(each, className); });
+    return found;
+}
+
 std::vector<const ClassDeclaration*> Schema::line(std::string_view className) const {
     std::vector<const ClassDeclaration*> found;
     // The count bounds the walk, should a class be its own ancestor.

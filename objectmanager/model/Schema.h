@@ -73,6 +73,8 @@ public:
     std::vector<std::string> servedClasses() const;
     std::vector<std::string> servedAssociations() const;
     std::vector<std::string> served() const;
+    /// Those of `served` that are the class or derive from it.
+    std::vector<std::string> servedBelow(std::string_view className) const;
     /// The class, property or method of that name, or null.
     const ClassDeclaration* find(std::string_view className) const;
     const ResolvedClass* resolve(std::string_view className) const;

@@ -45,10 +45,6 @@ void remarkOnProperties(const om::Request& request, const om::ClassDeclaration& 
     }
 }
 
-bool contains(const std::vector<std::string>& names, const std::string& name) {
-    return std::any_of(names.begin(), names.end(), [&](const std::string& each) { return om::sameName(each, name); });
-}
-
 void remarkOnMethod(const om::Request& request, const om::ClassDeclaration& declared, const om::Schema& schema,
                     std::vector<std::string>& remarks) {
     const om::MethodDeclaration* method = schema.findMethod(declared.name, request.method);
@@ -59,7 +55,7 @@ void remarkOnMethod(const om::Request& request, const om::ClassDeclaration& decl
     }
     const std::vector<std::string> known = namesOf(method->parameters);
     for (const auto& [name, value] : request.values) {
-        if (!contains(known, name))
+        if (!om::containsName(known, name))
             remarks.push_back(
                 fmt::format("{} has no parameter {}{}", method->name, name, namesInstead(name, known, "parameters")));
     }
@@ -83,17 +79,10 @@ std::vector<std::string> adviceOnMethod(const om::Request& request, int status, 
     const om::MethodDeclaration* method = schema.findMethod(request.path.className, request.method);
     if (declared == nullptr || method == nullptr) return {}; // that was said before
     const std::vector<std::string> own = namesOf(declared->methods);
-    if (!contains(own, method->name))
+    if (!om::containsName(own, method->name))
         return {fmt::format("{} inherits {}; its own methods: {}", declared->name, method->name, fmt::join(own, ", "))};
     if (status == CMPI_RC_ERR_INVALID_PARAMETER) return adviceOnArguments(request, *method);
     return {};
-}
-
-std::vector<std::string> servedBelow(const std::string& className, const om::Schema& schema) {
-    std::vector<std::string> found;
-    for (const std::string& each : schema.served())
-        if (schema.isA(each, className) && !om::sameName(each, className)) found.push_back(each);
-    return found;
 }
 
 std::vector<std::string> adviceOnClass(const std::string& className, const om::Schema& schema) {
@@ -102,7 +91,8 @@ std::vector<std::string> adviceOnClass(const std::string& className, const om::S
         const auto nearest = nearestClass(className, schema);
         return {"there is no class " + className + (nearest ? didYouMean(nearest) : " in the schema")};
     }
-    const std::vector<std::string> below = servedBelow(declared->name, schema);
+    std::vector<std::string> below = schema.servedBelow(declared->name);
+    std::erase_if(below, [&](const std::string& each) { return om::sameName(each, declared->name); });
     if (below.empty()) return {};
     return {fmt::format("ask for a class below {}: {}", declared->name, fmt::join(below, ", "))};
 }

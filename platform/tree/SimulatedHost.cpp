@@ -70,7 +70,7 @@ std::shared_ptr<const SimulatedHost::State> SimulatedHost::asked() {
     if (!read || !read->settled || at != read->stamp) {
         Read fresh = readAnew();
         // At a shortage what is known stays, and is asked for again the next time.
-        if (!read || !isShortage(fresh.error)) read = keep(std::move(fresh));
+        if (!read || !isShortage(fresh.stamp.error)) read = keep(std::move(fresh));
     }
     return {read, &read->state};
 }
@@ -85,7 +85,6 @@ SimulatedHost::Read SimulatedHost::readAnew() const {
     fresh.state.tree = std::make_shared<const NodeTree>(std::move(text.nodes));
     fresh.state.product = std::move(text.product);
     fresh.state.problem = std::move(text.problem);
-    fresh.error = contents.error;
     fresh.stamp = contents.error != 0 ? FileStamp() : FileStamp(contents.status);
     fresh.stamp.error = contents.error;
     fresh.settled = fresh.stamp.tellsChangesFrom(begin) && hasExactStamps(file);

@@ -39,7 +39,6 @@ private:
         State state;
         FileStamp stamp;
         bool settled = false; ///< the stamp shows every later change
-        int error = 0;
     };
     using ReadPointer = Published<Read>::Pointer;
 
