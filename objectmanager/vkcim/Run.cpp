@@ -29,6 +29,10 @@ constexpr int unusableArguments = 2;
 constexpr int unusableLibrary = 3;
 constexpr int nothingDone = 4;
 
+void complain(const Streams& streams, const std::string& line) {
+    streams.error << wrapped("vkcim: " + shortened(line), streams.messageColumns) << '\n';
+}
+
 class Runner {
 public:
     Runner(const Arguments& given, const Streams& where)
@@ -203,7 +207,7 @@ private:
         for (const std::string& line : adviceOn(request, repeated.worst, schema)) complain(line);
     }
 
-    void complain(const std::string& line) const { streams.error << "vkcim: " << shortened(line) << '\n'; }
+    void complain(const std::string& line) const { vkcim::complain(streams, line); }
 
     void print(const std::string& text) const { streams.output << text << std::flush; }
 
@@ -228,7 +232,7 @@ private:
 };
 
 int failed(const Streams& streams, const std::exception& error, int status) {
-    streams.error << "vkcim: " << shortened(error.what()) << '\n';
+    complain(streams, error.what());
     return status;
 }
 

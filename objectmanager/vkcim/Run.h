@@ -12,7 +12,8 @@ struct Streams {
     std::istream& input;
     std::ostream& output;
     std::ostream& error;
-    Look look = {}; ///< of the output
+    Look look = {};                 ///< of the output
+    std::size_t messageColumns = 0; ///< at which messages are broken; 0 breaks none
 };
 
 /// Does what the arguments say and returns the exit status: 0 status OK, 1 another status (or the output cannot be

@@ -33,12 +33,13 @@ bool isUtf8Locale() {
     return isUtf8;
 }
 
-std::size_t widthOfStandardOutput() {
+/// COLUMNS, else a terminal's width; 0 where there is neither.
+std::size_t widthOf(int descriptor) {
     const std::string_view wanted = variable("COLUMNS");
     std::size_t width = 0;
     std::from_chars(wanted.data(), wanted.data() + wanted.size(), width);
     winsize size{};
-    if (width == 0 && ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0) width = size.ws_col;
+    if (width == 0 && ioctl(descriptor, TIOCGWINSZ, &size) == 0) width = size.ws_col;
     return width == 0 ? 0 : std::max(width, narrowest);
 }
 
@@ -103,7 +104,11 @@ void appendWrapped(std::string& to, std::string_view line, std::size_t width) {
 } // namespace
 
 Look lookOfStandardOutput() {
-    return {wantsColours(), isUtf8Locale(), widthOfStandardOutput()};
+    return {wantsColours(), isUtf8Locale(), widthOf(STDOUT_FILENO)};
+}
+
+std::size_t widthOfMessages() {
+    return isatty(STDERR_FILENO) == 1 ? widthOf(STDERR_FILENO) : 0;
 }
 
 std::string wrapped(std::string_view text, std::size_t width) {

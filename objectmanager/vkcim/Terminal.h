@@ -18,6 +18,10 @@ struct Look {
 /// else at a terminal's width.
 Look lookOfStandardOutput();
 
+/// The columns at which messages on standard error are broken: those of a terminal, or 0, so that a message in a file
+/// stays one line.
+std::size_t widthOfMessages();
+
 /// The text with lines that are longer than `width` broken at blanks, or behind commas where a single word is too long.
 /// What follows stands below the text of the line's last column, where there are columns, else below its beginning. A
 /// word longer than the width stays whole.

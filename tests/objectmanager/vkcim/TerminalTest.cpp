@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <fcntl.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
+
 #include <cstdlib>
 
 namespace vkcim {
@@ -53,6 +57,27 @@ TEST_F(LookTest, TakesTheWidthFromTheEnvironment) {
     EXPECT_EQ(lookOfStandardOutput().width, 100U);
     setenv("COLUMNS", "3", 1);
     EXPECT_EQ(lookOfStandardOutput().width, 20U) << "less than that can hold nothing";
+}
+
+TEST_F(LookTest, BreaksMessagesOnATerminalOnly) {
+    const int kept = dup(STDERR_FILENO);
+    const auto widthAt = [&](int descriptor) {
+        dup2(descriptor, STDERR_FILENO);
+        const std::size_t width = widthOfMessages();
+        dup2(kept, STDERR_FILENO);
+        close(descriptor);
+        return width;
+    };
+    const int master = posix_openpt(O_RDWR | O_NOCTTY);
+    ASSERT_EQ(grantpt(master), 0);
+    ASSERT_EQ(unlockpt(master), 0);
+    const winsize size{.ws_row = 25, .ws_col = 81, .ws_xpixel = 0, .ws_ypixel = 0};
+    ASSERT_EQ(ioctl(master, TIOCSWINSZ, &size), 0);
+    EXPECT_EQ(widthAt(open(ptsname(master), O_RDWR | O_NOCTTY | O_CLOEXEC)), 81U);
+    setenv("COLUMNS", "100", 1);
+    EXPECT_EQ(widthAt(open("/dev/null", O_WRONLY | O_CLOEXEC)), 0U) << "a message in a file stays one line";
+    close(master);
+    close(kept);
 }
 
 TEST_F(LookTest, DrawsBoxesInUtf8LocalesOnly) {
