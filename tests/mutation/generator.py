@@ -80,6 +80,8 @@ def loosened(source, node):
     is_variable = node.kind == Kind.VAR_DECL
     is_inline = not is_variable or node.semantic_parent.kind in CLASSES
     inline = "inline" if is_inline and not re.search(r"\binline\b", head) else ""
+    if is_inline and is_variable:
+        inline += ' __attribute__((visibility("hidden")))'  # a library that shares it with others could not be unloaded
     yield start_of(node) + word.start(), start_of(node) + word.end(), inline
     if is_variable and word[0] == "constexpr":
         yield node.location.offset, node.location.offset, "const "

@@ -175,15 +175,18 @@ int main() {
         reached = built.copy.reached.read_bytes()
         self.assertEqual({mutant.line for mutant, number in built.numbers.items() if reached[number]}, {2, 4})
 
-    def test_a_library_that_is_loaded_again_leaves_no_map_each_time(self):
-        built = self.built("int ask(int count) {\n    return count > 1;\n}\n\nint main() {}\n")
+    def test_a_library_can_be_unloaded_and_loaded_again_and_leaves_no_map_each_time(self):
+        built = self.built("struct Limits {\n    static constexpr int most = 1;\n};\n\n"
+                           "int ask(int count) {\n    return count > Limits::most;\n}\n\nint main() {}\n")
+        self.assertIn("1 -> 0", {mutant.change() for mutant in built.numbers})
         built.copy.reached.write_bytes(bytes(built.size))
         for name in ("first.so", "second.so"):
             subprocess.run(["g++", "-shared", "-fPIC", "-o", name, "main.cpp"], cwd=self.root, check=True)
-        load = (f"import ctypes\nfor name in ('first.so', 'second.so'): ctypes.CDLL('{self.root}/' + name)['_Z3aski'](2)\n"
-                "print(sum('reached' in line for line in open('/proc/self/maps')))")
+        load = (f"import _ctypes, ctypes\nfor name in ('first.so', 'second.so'):\n    library = ctypes.CDLL('{self.root}/' + name)\n"
+                "    library['_Z3aski'](2)\n    _ctypes.dlclose(library._handle)\n"
+                "print([line.split('/')[-1] for line in open('/proc/self/maps') if '/first.so' in line or '/reached' in line])")
         asked = subprocess.run(["prlimit", "--rss=0:", sys.executable, "-c", load], check=True, stdout=subprocess.PIPE)
-        self.assertEqual(asked.stdout, b"1\n")
+        self.assertEqual(asked.stdout, b"['reached\\n']\n")
 
 
 if __name__ == "__main__":
