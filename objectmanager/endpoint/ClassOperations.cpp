@@ -47,7 +47,7 @@ std::string enumerateClassNames(const Call& call) {
 
 std::string getQualifier(const Call& call) {
     const std::string name = call.parameters.requiredText("QualifierName");
-    const QualifierType* type = findQualifierType(name);
+    const om::QualifierType* type = om::findQualifierType(name);
     if (type == nullptr) fail(CMPI_RC_ERR_NOT_FOUND, "there is no qualifier " + name);
     cimxml::Writer writer;
     writeQualifierType(writer, *type);
@@ -56,7 +56,7 @@ std::string getQualifier(const Call& call) {
 
 std::string enumerateQualifiers(const Call&) {
     cimxml::Writer writer;
-    for (const QualifierType& type : qualifierTypes()) writeQualifierType(writer, type);
+    for (const om::QualifierType& type : om::qualifierTypes()) writeQualifierType(writer, type);
     return returned(writer.text());
 }
 

@@ -1,32 +1,15 @@
 #pragma once
 
 #include "objectmanager/cimxml/Writer.h"
+#include "objectmanager/model/QualifierTypes.h"
 #include "objectmanager/model/Qualifiers.h"
 
-#include <string_view>
 #include <vector>
 
 namespace endpoint {
 
-/// A qualifier of the standard: its type, what it may stand on, and how it is inherited.
-struct QualifierType {
-    std::string_view name;
-    CMPIType type;
-    std::string_view scopes; ///< a letter each: c class, a association, r reference, p property, m method, i parameter,
-                             ///< n indication
-    bool overridable;
-    bool inherited;
-    bool translatable;
-    std::string_view otherwise; ///< the default's text; empty for none
-};
-
-/// All that may stand in a schema.
-const std::vector<QualifierType>& qualifierTypes();
-/// Without regard to case; null for an unknown one.
-const QualifierType* findQualifierType(std::string_view name);
-
 /// Writes QUALIFIER.DECLARATION.
-void writeQualifierType(cimxml::Writer& writer, const QualifierType& type);
+void writeQualifierType(cimxml::Writer& writer, const om::QualifierType& type);
 /// Writes a QUALIFIER for each that a declaration carries itself, and for each that it inherits: `line` holds the
 /// declaration's own first, and then those of the declarations that it overrides.
 void writeQualifiers(cimxml::Writer& writer, const std::vector<const om::Qualifiers*>& line);

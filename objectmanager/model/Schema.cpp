@@ -20,9 +20,17 @@ const MethodDeclaration* ResolvedClass::findMethod(std::string_view name) const 
     return lookUp(methods, name);
 }
 
-Schema::Schema(std::vector<ClassDeclaration> classes) : classes_(std::move(classes)) {
+Schema::Schema(const std::vector<ClassDeclaration>& classes) : classes_(classes.begin(), classes.end()) {
     for (const ClassDeclaration& declared : classes_) index_[declared.name].declaration = &declared;
     for (auto& [name, resolved] : index_) inherit(resolved);
+}
+
+const ClassDeclaration& Schema::add(ClassDeclaration declared) {
+    const ClassDeclaration& added = classes_.emplace_back(std::move(declared));
+    ResolvedClass& resolved = index_[added.name];
+    resolved.declaration = &added;
+    inherit(resolved);
+    return added;
 }
 
 void Schema::inherit(ResolvedClass& resolved) const {

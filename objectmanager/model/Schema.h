@@ -5,12 +5,20 @@
 
 #include <cmpidt.h>
 
+#include <deque>
 #include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
 namespace om {
+
+/// Where a declaration stands in a MOF file; nowhere for those of tables.
+struct Place {
+    std::string file = {};
+    std::size_t line = 0;
+    std::vector<std::size_t> qualifierLines = {}; ///< one for each qualifier
+};
 
 /// A declared property or parameter.
 struct PropertyDeclaration {
@@ -19,6 +27,8 @@ struct PropertyDeclaration {
     bool key = false;
     std::string referenceClass = {}; ///< for CMPI_ref only
     Qualifiers qualifiers = {};
+    Value defaultValue = {}; ///< null for none, and in tables
+    Place place = {};
 };
 
 struct ParameterDeclaration : PropertyDeclaration {
@@ -31,6 +41,7 @@ struct MethodDeclaration {
     CMPIType returnType = CMPI_null;
     std::vector<ParameterDeclaration> parameters;
     Qualifiers qualifiers = {};
+    Place place = {};
 };
 
 struct ClassDeclaration {
@@ -40,6 +51,7 @@ struct ClassDeclaration {
     std::vector<PropertyDeclaration> properties; ///< its own, without inherited ones
     std::vector<MethodDeclaration> methods;
     Qualifiers qualifiers = {};
+    Place place = {};
 };
 
 /// A class with all that it inherits, for look-ups by name.
@@ -60,14 +72,17 @@ struct ResolvedClass {
 /// methods go up the line of inheritance, nearest class first.
 class Schema {
 public:
-    explicit Schema(std::vector<ClassDeclaration> classes);
+    explicit Schema(const std::vector<ClassDeclaration>& classes);
     Schema(const Schema&) = delete;
     Schema& operator=(const Schema&) = delete;
 
     /// The classes built in, those served by the default provider and their ancestry.
     static const Schema& builtin();
 
-    const std::vector<ClassDeclaration>& classes() const { return classes_; }
+    /// Adds a class whose name is new and whose superclass is there.
+    const ClassDeclaration& add(ClassDeclaration declared);
+
+    const std::deque<ClassDeclaration>& classes() const { return classes_; }
     /// Names of the classes, or of the associations, that are not the standard's (CIM_): the ones that a provider
     /// serves, in the order of their declaration. `served` is the classes and then the associations.
     std::vector<std::string> servedClasses() const;
@@ -91,7 +106,7 @@ private:
     void inherit(ResolvedClass& resolved) const;
     std::vector<std::string> served(bool associations) const;
 
-    std::vector<ClassDeclaration> classes_; ///< never changed again: the tables point into it
+    std::deque<ClassDeclaration> classes_; ///< only ever added to: the tables point into it
     std::unordered_map<std::string_view, ResolvedClass, NameHash, NameEqual> index_;
 };
 

@@ -13,7 +13,8 @@ using namespace VK::BaseServerProvider;
 /// The built-in schema with one more class above the three associations, and one below two of them that has no
 /// relation to the third.
 om::Schema schemaWithCommonAncestor() {
-    std::vector<om::ClassDeclaration> classes = om::Schema::builtin().classes();
+    const auto& builtin = om::Schema::builtin().classes();
+    std::vector<om::ClassDeclaration> classes(builtin.begin(), builtin.end());
     for (om::ClassDeclaration& each : classes)
         if (each.name == "CIM_ElementCapabilities" || each.name == "CIM_ComputerSystemPackage" ||
             each.name == "CIM_ServiceAffectsElement")

@@ -41,7 +41,8 @@ namespace {
 
 /// Declares "Description" as a number, so that the broker refuses the text.
 om::Schema schemaWithNumericDescription() {
-    std::vector<om::ClassDeclaration> classes = om::Schema::builtin().classes();
+    const auto& builtin = om::Schema::builtin().classes();
+    std::vector<om::ClassDeclaration> classes(builtin.begin(), builtin.end());
     for (om::ClassDeclaration& each : classes)
         for (om::PropertyDeclaration& property : each.properties)
             if (property.name == "Description") property.type = CMPI_uint16;
