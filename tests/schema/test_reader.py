@@ -1,19 +1,13 @@
-"""What the MOF reader takes and refuses. Run by `python3 -m unittest` with schema/ in PYTHONPATH."""
+"""What the compiler of the MOF files takes, refuses and writes. The command that runs it is this program's arguments."""
 
+import json
 import subprocess
 import sys
 import tempfile
 import unittest
 from pathlib import Path
 
-SCHEMA = Path(__file__).resolve().parents[2] / "schema"
-sys.path.insert(0, str(SCHEMA))
-sys.dont_write_bytecode = True
-
-from mof import facts, output, registration  # noqa: E402
-from mof.check import Checker  # noqa: E402
-from mof.model import MofError  # noqa: E402
-from mof.parser import parse  # noqa: E402
+COMPILER = sys.argv[1:]
 
 STUB = """
 CIM_Top
@@ -45,15 +39,33 @@ class VESKA_Link : CIM_Link {
 """
 
 
-def compiled(text):
-    checker = Checker()
-    checker.add(parse(facts.stub(STUB, "facts"), "stub"), ours=False)
-    assert not checker.errors, checker.errors
-    try:
-        checker.add(parse(text, "t.mof"))
-    except MofError as error:
-        return [str(error)], checker.schema
-    return [str(e) for e in checker.errors], checker.schema
+class Compiler(unittest.TestCase):
+    """Runs the compiler on files of its own."""
+
+    def setUp(self):
+        directory = tempfile.TemporaryDirectory()
+        self.addCleanup(directory.cleanup)
+        self.directory = Path(directory.name)
+
+    def file(self, name, text):
+        (self.directory / name).write_text(text, encoding="utf-8")
+        return self.directory / name
+
+    def run_it(self, *arguments):
+        return subprocess.run([*COMPILER, *map(str, arguments)], capture_output=True, text=True, check=False, cwd=self.directory)
+
+    def compiled(self, text, *arguments):
+        """The complaints about a text over the stub, each a line that begins with t.mof and a number."""
+        self.file("facts", STUB)
+        self.file("t.mof", text)
+        done = self.run_it("--facts", "facts", *arguments, "t.mof")
+        self.assertEqual(done.returncode, 1 if done.stderr else 0, done.stderr)
+        return done.stderr.splitlines()
+
+    def output(self, option, text, *arguments):
+        """What is made of a text without mistakes."""
+        self.assertEqual(self.compiled(text, option, "out", *arguments), [])
+        return (self.directory / "out").read_text(encoding="utf-8")
 
 
 def thing(body, head='Version("1.0.0"), Description("d")', above=" : CIM_Keyed", name="VESKA_Thing"):
@@ -65,7 +77,7 @@ REFUSED = [
     ("an undeclared superclass", thing("", above=" : CIM_Gone"), "t.mof:2: superclass CIM_Gone of VESKA_Thing is not"),
     ("a class twice", GOOD + thing(""), "class VESKA_Thing is declared already at t.mof:5"),
     ("a superclass redefined", thing("", name="CIM_Keyed", above=" : CIM_Top"),
-     "class CIM_Keyed is declared already at stub:"),
+     "class CIM_Keyed is declared already at stub of facts:"),
     ("a class of the standard's", thing("", name="CIM_New"), "class CIM_New is one of the standard's"),
     ("a name without prefix", thing("", name="Thing"), "class name Thing lacks a schema's prefix"),
     ("a property type", thing('[Description("d")] uint17 A;'), "t.mof:3: 'uint17' is no type"),
@@ -133,37 +145,39 @@ REFUSED = [
 ]
 
 
-class Reader(unittest.TestCase):
+class Reader(Compiler):
     def test_takes_what_a_compiler_takes(self):
-        errors, schema = compiled(GOOD)
-        self.assertEqual(errors, [])
-        declared = schema.find("veska_THING")
-        self.assertEqual(declared.qualifier("description"), "A joined text")
-        self.assertEqual([(p.name, str(p.type), p.default) for p in declared.properties],
-                         [("Name", "string", None), ("States", "uint16[]", None), ("Small", "sint8", -128),
-                          ("Height", "real32", 1.5)])
-        self.assertEqual(schema.keys(declared), ["Name"])
-        self.assertEqual(schema.keys(schema.find("VESKA_Link")), ["From", "To"])
+        declared, link = json.loads(self.output("--json", GOOD))["classes"]
+        self.assertEqual([(p["name"], p["type"]) for p in declared["properties"]],
+                         [("Name", "string"), ("States", "uint16[]"), ("Small", "sint8"), ("Height", "real32")])
+        self.assertEqual(declared["keys"], ["Name"])
+        self.assertEqual(link["keys"], ["From", "To"])
+        self.assertIn('{"Description", qualifierValue("A joined text")}', self.output("--cpp", GOOD))
 
     def test_refuses_with_file_and_line(self):
         for what, text, complaint in REFUSED:
             with self.subTest(what):
-                errors, _ = compiled(text)
+                errors = self.compiled(text)
                 self.assertTrue(any(complaint in e for e in errors), f"expected: {complaint}\ncame: {errors}")
 
     def test_names_every_complaint_of_a_file(self):
-        errors, _ = compiled(thing('[Colour, Description("d")] string A;\nstring B;'))
+        errors = self.compiled(thing('[Colour, Description("d")] string A;\nstring B;'))
         self.assertEqual(len(errors), 2, errors)
 
 
-class Facts(unittest.TestCase):
+class Facts(Compiler):
+    def stub(self, text):
+        done = self.run_it("--facts", self.file("f", text), "--list", self.file("none", ""), "--stub", "stub")
+        self.assertEqual((done.returncode, done.stderr), (0, ""))
+        return (self.directory / "stub").read_text(encoding="utf-8")
+
     def test_become_a_stub_with_keys_overrides_and_methods(self):
-        stub = facts.stub("CIM_A\n  string Name\nCIM_B < CIM_A\n  key string Name # c\n  uint8 F(in out string S[])\n", "f")
+        stub = self.stub("CIM_A\n  string Name\nCIM_B < CIM_A\n  key string Name # c\n  uint8 F(in out string S[])\n")
         self.assertIn('[Override("Name"), Key] string Name;', stub)
         self.assertIn("uint8 F([In, Out] string S[]);", stub)
 
     def test_carry_default_values(self):
-        stub = facts.stub("CIM_A\n  uint16 State = 12\n  uint16 Other=2 # c\n", "f")
+        stub = self.stub("CIM_A\n  uint16 State = 12\n  uint16 Other=2 # c\n")
         self.assertIn("uint16 State = 12;", stub)
         self.assertIn("uint16 Other = 2;", stub)
 
@@ -173,92 +187,78 @@ class Facts(unittest.TestCase):
                                 ("CIM_A\n  key key string A", "f:2: 'key key string A' is not a property"),
                                 ("CIM_A\n  string A = ", "f:2: 'string A =' is not a property"),
                                 ("CIM_A\n  uint8 F(in)", "f:2: 'in' is not a parameter")]:
-            with self.subTest(text), self.assertRaises(MofError) as caught:
-                facts.stub(text, "f")
-            self.assertIn(complaint, str(caught.exception))
+            with self.subTest(text):
+                done = self.run_it("--facts", self.file("f", text), "--list", self.file("none", ""))
+                self.assertEqual(done.returncode, 1)
+                self.assertIn(complaint, done.stderr)
 
 
-class Output(unittest.TestCase):
-    def setUp(self):
-        _, self.schema = compiled(GOOD)
-
+class Output(Compiler):
     def test_table_carries_inherited_keys_into_overrides(self):
-        table = output.cpp(self.schema)
+        table = self.output("--cpp", GOOD)
         self.assertIn('{"Name", CMPI_string, true, "", {', table)
         self.assertIn('{"States", CMPI_uint16A, false, "", {', table)
         self.assertIn('{"To", CMPI_ref, true, "VESKA_Thing", {', table)
         self.assertRegex(table, r'\{\{"When", CMPI_dateTime, false, "", \{.*\}\}, true, true\}')
 
     def test_table_carries_qualifiers_in_their_order(self):
-        _, schema = compiled(thing('[Key, Description("a \\"d\\"")] string A; [Write, Description("d"), ValueMap {"1"}, '
-                                   'Values {"One"}] uint8 B;'))
-        table = output.cpp(schema)
+        table = self.output("--cpp", thing('[Key, Description("a \\"d\\"")] string A; [Write, Description("d"), ValueMap {"1"}, '
+                                           'Values {"One"}] uint8 B;', above=" : CIM_Top"))
         self.assertIn(r'{{"Key", qualifierValue(true)}, {"Description", qualifierValue("a \"d\"")}}', table)
         self.assertIn('{"ValueMap", qualifierValue({"1"})}, {"Values", qualifierValue({"One"})}}', table)
 
     def test_registration_names_each_class_once_with_its_kinds(self):
-        provider = registration.Provider("M", "P", "loc", "1.2.3", "V", "D", "root/x")
-        classes = [self.schema.find("VESKA_Thing"), self.schema.find("VESKA_Link")]
-        self.assertEqual(registration.stanzas(provider, classes),
+        provider = ["--module", "M", "--provider", "P", "--location", "loc", "--provider-version", "1.2.3", "--vendor", "V",
+                    "--description", "D", "--namespace", "root/x"]
+        self.assertEqual(self.output("--reg", GOOD, *provider),
                          "[VESKA_Thing]\n   provider: P\n   location: loc\n   type: instance method\n"
                          "   namespace: root/x\n#\n"
                          "[VESKA_Link]\n   provider: P\n   location: loc\n   type: instance association\n"
                          "   namespace: root/x\n#\n")
-        instances = registration.module_instances(provider, classes)
+        instances = self.output("--module-mof", GOOD, *provider)
         self.assertEqual(instances.count("instance of PG_ProviderCapabilities"), 2)
+        self.assertIn('Version = "1.2.3";', instances)
         self.assertIn("ProviderType = {2, 5};", instances)
         self.assertIn("ProviderType = {2, 3};", instances)
         self.assertIn('Namespaces = {"root/x"};', instances)
         self.assertIn("SupportedMethods = NULL;", instances)
 
+    def test_frames_are_filled(self):
+        self.file("frame", "@CLASS_LIST@ @ASSOCIATION_WORDS@ @ROLE_WORDS@ @METHOD_WORDS@ @OTHER@\n")
+        self.assertEqual(self.compiled(GOOD, "--fill", "frame", "one", "--fill", "frame", "two"), [])
+        for name in ("one", "two"):
+            self.assertEqual((self.directory / name).read_text(encoding="utf-8"),
+                             '["VESKA_Thing"] VESKA_Link To VESKA_Thing=Do @OTHER@\n')
 
-class Command(unittest.TestCase):
-    def run_it(self, *arguments):
-        return subprocess.run([sys.executable, SCHEMA / "vk-mof", *arguments], capture_output=True, text=True, check=False)
+    def test_manual_escapes_what_roff_would_read(self):
+        self.file("frame", "@CLASSES@")
+        self.compiled(thing('[Description(".a-b\\n\'c\\\\"), Write] uint8 A;'), "--fill", "frame", "out")
+        self.assertIn("\\fBA\\fR, uint8 (writable)\n\\&.a\\-b\n\\&'c\\e", (self.directory / "out").read_text(encoding="utf-8"))
 
+
+class Command(Compiler):
     def test_our_files_compile_silently(self):
         done = self.run_it()
         self.assertEqual((done.returncode, done.stdout, done.stderr), (0, "", ""))
 
     def test_writes_nothing_after_a_complaint(self):
-        with tempfile.TemporaryDirectory() as directory:
-            bad = Path(directory) / "bad.mof"
-            bad.write_text(thing('[Colour, Description("d")] string A;', above=" : CIM_System"), encoding="utf-8")
-            done = self.run_it("--json", Path(directory) / "out.json", bad)
-            self.assertEqual(done.returncode, 1)
-            self.assertEqual(done.stderr, f"{bad}:3: unknown qualifier Colour on VESKA_Thing.A\n")
-            self.assertFalse((Path(directory) / "out.json").exists())
+        bad = self.file("bad.mof", thing('[Colour, Description("d")] string A;', above=" : CIM_System"))
+        done = self.run_it("--json", "out.json", bad)
+        self.assertEqual(done.returncode, 1)
+        self.assertEqual(done.stderr, f"{bad}:3: unknown qualifier Colour on VESKA_Thing.A\n")
+        self.assertFalse((self.directory / "out.json").exists())
 
+    def test_names_a_file_that_cannot_be_read_or_written(self):
+        self.file("file", "")
+        for arguments, complaint in [(["gone.mof"], "gone.mof: No such file or directory\n"),
+                                     ([self.directory], f"{self.directory}: Is a directory\n"),
+                                     (["--json", "file/out.json"], "file/out.json: Not a directory\n")]:
+            done = self.run_it(*arguments)
+            self.assertEqual((done.returncode, done.stderr), (1, complaint))
 
-class Descriptions(unittest.TestCase):
-    """What a class of ours says of the properties that it inherits and does not declare."""
-
-    def setUp(self):
-        checker = Checker()
-        checker.add(parse(facts.stub((SCHEMA / "superclasses.facts").read_text(encoding="utf-8"), "facts"), "stub"), ours=False)
-        names = facts.split((SCHEMA / "classes.list").read_text(encoding="utf-8"))
-        for name in names:
-            checker.add(parse((SCHEMA / name).read_text(encoding="utf-8"), name))
-        self.schema = checker.schema
-        self.ours = [self.schema.find(Path(name).stem) for name in names]
-
-    def inherited_defaults(self, declared):
-        own = {p.name for p in declared.properties}
-        above = self.schema.find(declared.superclass)
-        while above is not None:
-            for prop in above.properties:
-                if prop.default is not None and prop.name not in own:
-                    yield f"{prop.name} {prop.default}"
-            above = self.schema.find(above.superclass) if above.superclass else None
-
-    def test_name_the_default_values_that_an_object_manager_adds(self):
-        for declared in self.ours:
-            defaults = list(self.inherited_defaults(declared))
-            for default in defaults:
-                self.assertIn(default, declared.qualifier("Description"), declared.name)
-            if declared.name == "VESKA_TimeService":
-                self.assertEqual(len(defaults), 4)
+    def test_refuses_options_that_it_does_not_know(self):
+        self.assertEqual(self.run_it("--colour").returncode, 2)
 
 
 if __name__ == "__main__":
-    unittest.main()
+    unittest.main(argv=sys.argv[:1])

@@ -1,0 +1,275 @@
+#include "objectmanager/mof/ClassCheck.h"
+
+#include "objectmanager/model/QualifierTypes.h"
+#include "objectmanager/vkcim/Names.h"
+#include "objectmanager/vkcim/NumberText.h"
+
+#include <fmt/format.h>
+
+#include <algorithm>
+#include <set>
+
+namespace mof {
+namespace {
+
+using fmt::format;
+
+/// What may carry qualifiers: a class, a property, a method or a parameter.
+struct Feature {
+    std::string name; ///< in full
+    char scope;       ///< as in om::QualifierType
+    const om::Qualifiers& qualifiers;
+    const om::Place& place;
+    CMPIType type = CMPI_null;
+    std::string_view referenceClass = {};
+};
+
+/// A qualifier's value, or null where it has none.
+const om::Value* valueOf(const om::Qualifiers& qualifiers, std::string_view name) {
+    const om::Value* value = om::findValue(qualifiers, name);
+    return value == nullptr || value->isNull() ? nullptr : value;
+}
+
+std::string_view scopeText(char scope) {
+    switch (scope) {
+    case 'c':
+        return "a class";
+    case 'a':
+        return "an association";
+    case 'p':
+        return "a property";
+    case 'r':
+        return "a reference";
+    case 'm':
+        return "a method";
+    default:
+        return "a parameter";
+    }
+}
+
+/// A number of the type, or an open or closed range of two.
+bool isRange(std::string_view text, CMPIType type) {
+    const auto isEnd = [type](std::string_view end) {
+        om::Value number;
+        return end.empty() || vkcim::readNumber(end, type, number) == vkcim::NumberError::None;
+    };
+    const std::size_t dots = text.find("..");
+    if (dots == std::string_view::npos) return isEnd(text);
+    return isEnd(text.substr(0, dots)) && isEnd(text.substr(dots + 2));
+}
+
+bool sameParameter(const om::ParameterDeclaration& a, const om::ParameterDeclaration& b) {
+    return om::sameName(a.name, b.name) && a.type == b.type && om::sameName(a.referenceClass, b.referenceClass) &&
+           a.in == b.in && a.out == b.out;
+}
+
+bool sameSignature(const om::MethodDeclaration& a, const om::MethodDeclaration& b) {
+    return a.returnType == b.returnType && std::equal(a.parameters.begin(), a.parameters.end(), b.parameters.begin(),
+                                                      b.parameters.end(), sameParameter);
+}
+
+/// What a MOF compiler checks of a class that is in the schema, and what we ask of our own beyond that.
+class ClassCheck {
+public:
+    ClassCheck(const om::Schema& classes, const om::ClassDeclaration& checked, bool isOurs,
+               std::vector<std::string>& found)
+        : schema(classes), declared(checked), above(classes.resolve(checked.superclass)), ours(isOurs),
+          complaints(found) {}
+
+    void run() {
+        checkClass();
+        if (ours) checkOurClass();
+        checkFeature({declared.name, declared.association ? 'a' : 'c', declared.qualifiers, declared.place});
+        for (const om::PropertyDeclaration& property : declared.properties) {
+            const std::string name = format("{}.{}", declared.name, property.name);
+            const char scope = vkcim::elementType(property.type) == CMPI_ref ? 'r' : 'p';
+            checkFeature({name, scope, property.qualifiers, property.place, property.type, property.referenceClass});
+            checkProperty(property, name);
+        }
+        for (const om::MethodDeclaration& method : declared.methods) {
+            const std::string name = format("{}.{}", declared.name, method.name);
+            checkFeature({name, 'm', method.qualifiers, method.place, method.returnType});
+            checkMethod(method, name);
+            for (const om::ParameterDeclaration& each : method.parameters) checkParameter(each, name);
+        }
+    }
+
+private:
+    void complain(bool wrong, const om::Place& place, const std::string& text) {
+        if (wrong) complaints.push_back(format("{}: {}", shown(place), text));
+    }
+
+    void checkClass() {
+        const std::string& name = declared.name;
+        const std::size_t mark = name.find('_');
+        complain(mark == std::string::npos || mark == 0 || mark + 1 == name.size(), declared.place,
+                 format("class name {} lacks a schema's prefix", name));
+        complain(declared.association && !om::sameName(declared.qualifiers.front().first, "Association"),
+                 declared.place, format("Association is not the first qualifier of {}", name));
+        if (above != nullptr) {
+            complain(above->declaration->association != declared.association, declared.place,
+                     format("{} and its superclass {} are not both associations", name, above->declaration->name));
+        }
+        const om::ResolvedClass& whole = *schema.resolve(name);
+        const auto references = std::count_if(whole.properties.begin(), whole.properties.end(), [](const auto& each) {
+            return vkcim::elementType(each.second->type) == CMPI_ref;
+        });
+        complain(declared.association && references < 2, declared.place,
+                 format("association {} has fewer than two references", name));
+        complain(!declared.association && references > 0, declared.place,
+                 format("class {} has references and is no association", name));
+    }
+
+    void checkOurClass() {
+        const std::string& name = declared.name;
+        complain(om::sameName(std::string_view(name).substr(0, name.find('_')), "CIM"), declared.place,
+                 format("class {} is one of the standard's", name));
+        complain(schema.resolve(name)->keys.empty() && !om::isMarked(declared.qualifiers, "Abstract"), declared.place,
+                 format("class {} has no key", name));
+        complain(!isVersion(om::textOf(declared.qualifiers, "Version")), declared.place,
+                 format("class {} has no version of three numbers", name));
+    }
+
+    static bool isVersion(std::string_view text) {
+        int numbers = 0;
+        for (std::size_t begin = 0; begin <= text.size();) {
+            const std::size_t end = std::min(text.find('.', begin), text.size());
+            const std::string_view part = text.substr(begin, end - begin);
+            numbers += !part.empty() && part.find_first_not_of("0123456789") == std::string_view::npos;
+            begin = end + 1;
+        }
+        return numbers == 3;
+    }
+
+    void checkFeature(const Feature& feature) {
+        checkQualifiers(feature);
+        if (vkcim::elementType(feature.type) == CMPI_ref) {
+            complain(schema.find(feature.referenceClass) == nullptr, feature.place,
+                     format("{} refers to {}, which is not declared", feature.name, feature.referenceClass));
+        }
+        checkValues(feature);
+        complain(ours && om::textOf(feature.qualifiers, "Description").empty(), feature.place,
+                 format("{} has no description", feature.name));
+        const auto [first, added] = seen.emplace(feature.name, &feature.place);
+        if (added) return;
+        complain(true, feature.place,
+                 feature.scope == 'i' ? format("parameter {} stands there twice", feature.name)
+                                      : format("{} is declared already at {}", feature.name, shown(*first->second)));
+    }
+
+    void checkQualifiers(const Feature& feature) {
+        for (std::size_t i = 0; i < feature.qualifiers.size(); ++i) {
+            const auto& [name, value] = feature.qualifiers[i];
+            const om::Place place{feature.place.file, feature.place.qualifierLines[i]};
+            const om::QualifierType* type = om::findQualifierType(name);
+            if (type == nullptr) {
+                complain(true, place, format("unknown qualifier {} on {}", name, feature.name));
+                continue;
+            }
+            const bool number = type->type == CMPI_uint32 || type->type == CMPI_sint64;
+            complain(type->scopes.find(feature.scope) == std::string_view::npos, place,
+                     format("{} may not stand on {}, as {} is", name, scopeText(feature.scope), feature.name));
+            complain(value.type != type->type, place,
+                     format("{} of {} takes a {}", name, feature.name, number ? "integer" : typeText(type->type)));
+        }
+    }
+
+    void checkValues(const Feature& feature) {
+        const bool mapped = valueOf(feature.qualifiers, "ValueMap") != nullptr;
+        if (!mapped && valueOf(feature.qualifiers, "Values") == nullptr) return;
+        const std::vector<std::string_view> numbers = om::textsOf(feature.qualifiers, "ValueMap");
+        if (!mapped || numbers.size() != om::textsOf(feature.qualifiers, "Values").size()) {
+            complain(true, feature.place, format("ValueMap and Values of {} do not pair", feature.name));
+            return;
+        }
+        const CMPIType type = vkcim::elementType(feature.type);
+        for (const std::string_view number : numbers) {
+            complain((type & CMPI_UINT) != 0 && !isRange(number, type), feature.place,
+                     format("'{}' in the ValueMap of {} is no {}", number, feature.name, typeText(type)));
+        }
+        complain(std::set(numbers.begin(), numbers.end()).size() != numbers.size(), feature.place,
+                 format("a value stands twice in the ValueMap of {}", feature.name));
+    }
+
+    void checkProperty(const om::PropertyDeclaration& property, const std::string& name) {
+        complain(property.type == CMPI_refA, property.place, format("reference {} is an array", name));
+        complain(!property.defaultValue.isNull() && property.defaultValue.type != property.type, property.place,
+                 format("the default of {} is no {}", name, typeText(property.type, property.referenceClass)));
+        const om::PropertyDeclaration* inherited = above == nullptr ? nullptr : above->findProperty(property.name);
+        checkOverride(property, inherited, name);
+        if (inherited != nullptr) {
+            complain(!narrows(property, *inherited), property.place,
+                     format("{} is {}, but {} in a superclass", name, typeText(property.type, property.referenceClass),
+                            typeText(inherited->type, inherited->referenceClass)));
+        }
+        if (om::isMarked(property.qualifiers, "Key")) checkKey(property, name);
+    }
+
+    void checkKey(const om::PropertyDeclaration& property, const std::string& name) {
+        complain(vkcim::isArray(property.type), property.place, format("key {} is an array", name));
+        if (!ours || above == nullptr || above->keys.empty()) return;
+        const om::PropertyDeclaration* inherited = above->findProperty(property.name);
+        if (inherited != nullptr && inherited->key) {
+            complain(true, property.place, format("{} redefines an inherited key", name));
+        } else {
+            complain(true, property.place, format("{} adds a key to those of {}", name, above->declaration->name));
+        }
+    }
+
+    void checkMethod(const om::MethodDeclaration& method, const std::string& name) {
+        const om::MethodDeclaration* inherited = above == nullptr ? nullptr : above->findMethod(method.name);
+        checkOverride(method, inherited, name);
+        if (inherited == nullptr) return;
+        complain(!sameSignature(method, *inherited), method.place,
+                 format("{} differs from the method that it overrides, at {}", name, shown(inherited->place)));
+    }
+
+    void checkParameter(const om::ParameterDeclaration& parameter, const std::string& method) {
+        const std::string name = format("{}({})", method, parameter.name);
+        checkFeature({name, 'i', parameter.qualifiers, parameter.place, parameter.type, parameter.referenceClass});
+        complain(!valueOf(parameter.qualifiers, "In") && !valueOf(parameter.qualifiers, "Out"), parameter.place,
+                 format("{} is neither In nor Out", name));
+    }
+
+    template <class Declaration>
+    void checkOverride(const Declaration& feature, const Declaration* inherited, const std::string& name) {
+        const bool overrides = valueOf(feature.qualifiers, "Override") != nullptr;
+        const std::string_view overridden = om::textOf(feature.qualifiers, "Override");
+        complain(inherited == nullptr && overrides, feature.place,
+                 format("{} overrides what no superclass declares", name));
+        complain(inherited != nullptr && !overrides, feature.place,
+                 format("{} is inherited and declared again without Override", name));
+        complain(!overridden.empty() && !om::sameName(overridden, feature.name), feature.place,
+                 format("{} overrides {}, which is named otherwise", name, overridden));
+    }
+
+    bool narrows(const om::PropertyDeclaration& property, const om::PropertyDeclaration& inherited) const {
+        return property.type == inherited.type && (vkcim::elementType(property.type) != CMPI_ref ||
+                                                   schema.isA(property.referenceClass, inherited.referenceClass));
+    }
+
+    const om::Schema& schema;
+    const om::ClassDeclaration& declared;
+    const om::ResolvedClass* above; ///< the superclass, or null
+    const bool ours;
+    std::vector<std::string>& complaints;
+    std::unordered_map<std::string, const om::Place*, om::NameHash, om::NameEqual> seen;
+};
+
+} // namespace
+
+void checkClass(const om::Schema& schema, const om::ClassDeclaration& declared, bool ours,
+                std::vector<std::string>& complaints) {
+    ClassCheck(schema, declared, ours, complaints).run();
+}
+
+std::string shown(const om::Place& place) {
+    return format("{}:{}", place.file, place.line);
+}
+
+std::string typeText(CMPIType type, const std::string& referenceClass) {
+    if (vkcim::elementType(type) != CMPI_ref) return vkcim::typeName(type);
+    return referenceClass + (vkcim::isArray(type) ? " ref[]" : " ref");
+}
+
+} // namespace mof

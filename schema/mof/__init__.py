@@ -1,1 +1,0 @@
-"""A reader of MOF class declarations, with every check that a MOF compiler makes of them."""
