@@ -43,6 +43,10 @@ ParsedSettings parseSettings(const std::vector<std::string>& words) {
     app.add_option("--provider", settings.provider, "Provider name, the prefix of the factory functions")
         ->capture_default_str()
         ->type_name("NAME");
+    app.add_option("--schema", settings.schema,
+                   "MOF file with the provider's classes, each behind those that it refers to; may be repeated (the "
+                   "classes built in)")
+        ->type_name("FILE");
     app.add_option("--idle-exit", idle,
                    "Exit after so many seconds without a connection, 0: never (300 for a socket that the service "
                    "manager holds)")

@@ -17,7 +17,8 @@ struct Settings {
     bool anonymousRead = false;
     bool foreground = false;
     bool checkOnly = false;
-    std::string library; ///< empty: the one installed beside the program
+    std::vector<std::string> schema; ///< MOF files; none: the classes built in
+    std::string library;             ///< empty: the one installed beside the program
     std::string provider = "BaseServerProvider";
     std::optional<std::chrono::seconds> idleExit;
 };

@@ -1,4 +1,5 @@
 #include "objectmanager/broker/ObjectManager.h"
+#include "objectmanager/endpoint/Files.h"
 #include "objectmanager/endpoint/Interop.h"
 #include "objectmanager/endpoint/Log.h"
 #include "objectmanager/endpoint/Server.h"
@@ -11,9 +12,7 @@
 
 #include <atomic>
 #include <csignal>
-#include <fstream>
 #include <iostream>
-#include <sstream>
 
 namespace {
 
@@ -38,16 +37,6 @@ void handleSignals() {
 std::string hostName() {
     utsname names{};
     return uname(&names) == 0 && names.nodename[0] != '\0' ? names.nodename : "localhost";
-}
-
-/// The file's text; throws std::runtime_error where it cannot be read.
-std::string contentOf(const std::string& file) {
-    if (file.empty()) return {};
-    std::ifstream stream(file, std::ios::binary);
-    std::ostringstream content;
-    content << stream.rdbuf();
-    if (!stream || content.str().empty()) throw std::invalid_argument("cannot read " + file);
-    return content.str();
 }
 
 /// The service manager's sockets, and those of the configuration that are not among them.
@@ -75,16 +64,19 @@ std::chrono::seconds idleOf(const endpoint::Settings& settings) {
 
 int serve(const endpoint::Settings& settings) {
     endpoint::ServerSettings served;
-    served.certificate = contentOf(settings.certificate);
-    served.key = contentOf(settings.key);
+    if (!settings.certificate.empty()) {
+        served.certificate = endpoint::contentOf(settings.certificate);
+        served.key = endpoint::contentOf(settings.key);
+    }
     served.anonymousRead = settings.anonymousRead;
+    const endpoint::SchemaFiles classes(settings.schema);
     if (settings.checkOnly) return 0;
     const std::string library = settings.library.empty() ? vkcim::defaultLibrary(vkcim::programDirectory())
                                                          : vkcim::libraryPath(settings.library);
-    om::ObjectManager manager(library, settings.provider, "root/cimv2");
+    om::ObjectManager manager(library, settings.provider, "root/cimv2", classes.schema());
     manager.instanceMI(); // so that a library that is none is known now
     endpoint::NameSpace provided{
-        "root/cimv2", {}, &om::Schema::builtin(), endpoint::noting([&manager](const om::Request& request) {
+        "root/cimv2", {}, &classes.schema(), endpoint::noting([&manager](const om::Request& request) {
             return manager.run(request);
         })};
     endpoint::Operations operations({provided, endpoint::interopNameSpace({"root/cimv2"}, hostName())}, hostName());

@@ -57,12 +57,13 @@ protected:
 TEST_F(SettingsFile, EverySettingIsAKey) {
     const ParsedSettings parsed = parse("listen = [\"unix:/run/a\", \"https://[::]:5989\"]\ncertificate = \"/c\"\n"
                                         "key = \"/k\"\nanonymous-read = true\nlibrary = \"/l\"\nprovider = \"P\"\n"
-                                        "idle-exit = 60\n# a comment\n");
+                                        "schema = [\"/a.mof\", \"/b.mof\"]\nidle-exit = 60\n# a comment\n");
     ASSERT_TRUE(parsed.settings) << parsed.error;
     EXPECT_EQ(parsed.settings->listen.size(), 2U);
     EXPECT_EQ(parsed.settings->certificate, "/c");
     EXPECT_TRUE(parsed.settings->anonymousRead);
     EXPECT_EQ(parsed.settings->provider, "P");
+    EXPECT_THAT(parsed.settings->schema, testing::ElementsAre("/a.mof", "/b.mof"));
     EXPECT_EQ(parsed.settings->idleExit, std::chrono::seconds(60));
 }
 
