@@ -4,15 +4,11 @@
 #include "objectmanager/vkcim/Names.h"
 #include "objectmanager/vkcim/NumberText.h"
 
-#include <fmt/format.h>
-
 #include <algorithm>
 #include <set>
 
 namespace mof {
 namespace {
-
-using fmt::format;
 
 /// What may carry qualifiers: a class, a property, a method or a parameter.
 struct Feature {
@@ -21,7 +17,7 @@ struct Feature {
     const om::Qualifiers& qualifiers;
     const om::Place& place;
     CMPIType type = CMPI_null;
-    std::string_view referenceClass = {};
+    std::string referenceClass = {};
 };
 
 /// A qualifier's value, or null where it has none.
@@ -30,7 +26,7 @@ const om::Value* valueOf(const om::Qualifiers& qualifiers, std::string_view name
     return value == nullptr || value->isNull() ? nullptr : value;
 }
 
-std::string_view scopeText(char scope) {
+const char* scopeText(char scope) {
     switch (scope) {
     case 'c':
         return "a class";
@@ -81,13 +77,13 @@ public:
         if (ours) checkOurClass();
         checkFeature({declared.name, declared.association ? 'a' : 'c', declared.qualifiers, declared.place});
         for (const om::PropertyDeclaration& property : declared.properties) {
-            const std::string name = format("{}.{}", declared.name, property.name);
+            const std::string name = declared.name + '.' + property.name;
             const char scope = vkcim::elementType(property.type) == CMPI_ref ? 'r' : 'p';
             checkFeature({name, scope, property.qualifiers, property.place, property.type, property.referenceClass});
             checkProperty(property, name);
         }
         for (const om::MethodDeclaration& method : declared.methods) {
-            const std::string name = format("{}.{}", declared.name, method.name);
+            const std::string name = declared.name + '.' + method.name;
             checkFeature({name, 'm', method.qualifiers, method.place, method.returnType});
             checkMethod(method, name);
             for (const om::ParameterDeclaration& each : method.parameters) checkParameter(each, name);
@@ -96,38 +92,38 @@ public:
 
 private:
     void complain(bool wrong, const om::Place& place, const std::string& text) {
-        if (wrong) complaints.push_back(format("{}: {}", shown(place), text));
+        if (wrong) complaints.push_back(shown(place) + ": " + text);
     }
 
     void checkClass() {
         const std::string& name = declared.name;
         const std::size_t mark = name.find('_');
         complain(mark == std::string::npos || mark == 0 || mark + 1 == name.size(), declared.place,
-                 format("class name {} lacks a schema's prefix", name));
+                 "class name " + name + " lacks a schema's prefix");
         complain(declared.association && !om::sameName(declared.qualifiers.front().first, "Association"),
-                 declared.place, format("Association is not the first qualifier of {}", name));
+                 declared.place, "Association is not the first qualifier of " + name);
         if (above != nullptr) {
             complain(above->declaration->association != declared.association, declared.place,
-                     format("{} and its superclass {} are not both associations", name, above->declaration->name));
+                     name + " and its superclass " + above->declaration->name + " are not both associations");
         }
         const om::ResolvedClass& whole = *schema.resolve(name);
         const auto references = std::count_if(whole.properties.begin(), whole.properties.end(), [](const auto& each) {
             return vkcim::elementType(each.second->type) == CMPI_ref;
         });
         complain(declared.association && references < 2, declared.place,
-                 format("association {} has fewer than two references", name));
+                 "association " + name + " has fewer than two references");
         complain(!declared.association && references > 0, declared.place,
-                 format("class {} has references and is no association", name));
+                 "class " + name + " has references and is no association");
     }
 
     void checkOurClass() {
         const std::string& name = declared.name;
         complain(om::sameName(std::string_view(name).substr(0, name.find('_')), "CIM"), declared.place,
-                 format("class {} is one of the standard's", name));
+                 "class " + name + " is one of the standard's");
         complain(schema.resolve(name)->keys.empty() && !om::isMarked(declared.qualifiers, "Abstract"), declared.place,
-                 format("class {} has no key", name));
+                 "class " + name + " has no key");
         complain(!isVersion(om::textOf(declared.qualifiers, "Version")), declared.place,
-                 format("class {} has no version of three numbers", name));
+                 "class " + name + " has no version of three numbers");
     }
 
     static bool isVersion(std::string_view text) {
@@ -145,16 +141,16 @@ private:
         checkQualifiers(feature);
         if (vkcim::elementType(feature.type) == CMPI_ref) {
             complain(schema.find(feature.referenceClass) == nullptr, feature.place,
-                     format("{} refers to {}, which is not declared", feature.name, feature.referenceClass));
+                     feature.name + " refers to " + feature.referenceClass + ", which is not declared");
         }
         checkValues(feature);
         complain(ours && om::textOf(feature.qualifiers, "Description").empty(), feature.place,
-                 format("{} has no description", feature.name));
+                 feature.name + " has no description");
         const auto [first, added] = seen.emplace(feature.name, &feature.place);
         if (added) return;
         complain(true, feature.place,
-                 feature.scope == 'i' ? format("parameter {} stands there twice", feature.name)
-                                      : format("{} is declared already at {}", feature.name, shown(*first->second)));
+                 feature.scope == 'i' ? "parameter " + feature.name + " stands there twice"
+                                      : feature.name + " is declared already at " + shown(*first->second));
     }
 
     void checkQualifiers(const Feature& feature) {
@@ -163,14 +159,14 @@ private:
             const om::Place place{feature.place.file, feature.place.qualifierLines[i]};
             const om::QualifierType* type = om::findQualifierType(name);
             if (type == nullptr) {
-                complain(true, place, format("unknown qualifier {} on {}", name, feature.name));
+                complain(true, place, "unknown qualifier " + name + " on " + feature.name);
                 continue;
             }
             const bool number = type->type == CMPI_uint32 || type->type == CMPI_sint64;
             complain(type->scopes.find(feature.scope) == std::string_view::npos, place,
-                     format("{} may not stand on {}, as {} is", name, scopeText(feature.scope), feature.name));
+                     name + " may not stand on " + scopeText(feature.scope) + ", as " + feature.name + " is");
             complain(value.type != type->type, place,
-                     format("{} of {} takes a {}", name, feature.name, number ? "integer" : typeText(type->type)));
+                     name + " of " + feature.name + " takes a " + (number ? "integer" : typeText(type->type)));
         }
     }
 
@@ -179,40 +175,40 @@ private:
         if (!mapped && valueOf(feature.qualifiers, "Values") == nullptr) return;
         const std::vector<std::string_view> numbers = om::textsOf(feature.qualifiers, "ValueMap");
         if (!mapped || numbers.size() != om::textsOf(feature.qualifiers, "Values").size()) {
-            complain(true, feature.place, format("ValueMap and Values of {} do not pair", feature.name));
+            complain(true, feature.place, "ValueMap and Values of " + feature.name + " do not pair");
             return;
         }
         const CMPIType type = vkcim::elementType(feature.type);
         for (const std::string_view number : numbers) {
             complain((type & CMPI_UINT) != 0 && !isRange(number, type), feature.place,
-                     format("'{}' in the ValueMap of {} is no {}", number, feature.name, typeText(type)));
+                     "'" + std::string(number) + "' in the ValueMap of " + feature.name + " is no " + typeText(type));
         }
         complain(std::set(numbers.begin(), numbers.end()).size() != numbers.size(), feature.place,
-                 format("a value stands twice in the ValueMap of {}", feature.name));
+                 "a value stands twice in the ValueMap of " + feature.name);
     }
 
     void checkProperty(const om::PropertyDeclaration& property, const std::string& name) {
-        complain(property.type == CMPI_refA, property.place, format("reference {} is an array", name));
+        complain(property.type == CMPI_refA, property.place, "reference " + name + " is an array");
         complain(!property.defaultValue.isNull() && property.defaultValue.type != property.type, property.place,
-                 format("the default of {} is no {}", name, typeText(property.type, property.referenceClass)));
+                 "the default of " + name + " is no " + typeText(property.type, property.referenceClass));
         const om::PropertyDeclaration* inherited = above == nullptr ? nullptr : above->findProperty(property.name);
         checkOverride(property, inherited, name);
         if (inherited != nullptr) {
             complain(!narrows(property, *inherited), property.place,
-                     format("{} is {}, but {} in a superclass", name, typeText(property.type, property.referenceClass),
-                            typeText(inherited->type, inherited->referenceClass)));
+                     name + " is " + typeText(property.type, property.referenceClass) + ", but " +
+                         typeText(inherited->type, inherited->referenceClass) + " in a superclass");
         }
         if (om::isMarked(property.qualifiers, "Key")) checkKey(property, name);
     }
 
     void checkKey(const om::PropertyDeclaration& property, const std::string& name) {
-        complain(vkcim::isArray(property.type), property.place, format("key {} is an array", name));
+        complain(vkcim::isArray(property.type), property.place, "key " + name + " is an array");
         if (!ours || above == nullptr || above->keys.empty()) return;
         const om::PropertyDeclaration* inherited = above->findProperty(property.name);
         if (inherited != nullptr && inherited->key) {
-            complain(true, property.place, format("{} redefines an inherited key", name));
+            complain(true, property.place, name + " redefines an inherited key");
         } else {
-            complain(true, property.place, format("{} adds a key to those of {}", name, above->declaration->name));
+            complain(true, property.place, name + " adds a key to those of " + above->declaration->name);
         }
     }
 
@@ -221,26 +217,25 @@ private:
         checkOverride(method, inherited, name);
         if (inherited == nullptr) return;
         complain(!sameSignature(method, *inherited), method.place,
-                 format("{} differs from the method that it overrides, at {}", name, shown(inherited->place)));
+                 name + " differs from the method that it overrides, at " + shown(inherited->place));
     }
 
     void checkParameter(const om::ParameterDeclaration& parameter, const std::string& method) {
-        const std::string name = format("{}({})", method, parameter.name);
+        const std::string name = method + '(' + parameter.name + ')';
         checkFeature({name, 'i', parameter.qualifiers, parameter.place, parameter.type, parameter.referenceClass});
         complain(!valueOf(parameter.qualifiers, "In") && !valueOf(parameter.qualifiers, "Out"), parameter.place,
-                 format("{} is neither In nor Out", name));
+                 name + " is neither In nor Out");
     }
 
     template <class Declaration>
     void checkOverride(const Declaration& feature, const Declaration* inherited, const std::string& name) {
         const bool overrides = valueOf(feature.qualifiers, "Override") != nullptr;
-        const std::string_view overridden = om::textOf(feature.qualifiers, "Override");
-        complain(inherited == nullptr && overrides, feature.place,
-                 format("{} overrides what no superclass declares", name));
+        const std::string overridden(om::textOf(feature.qualifiers, "Override"));
+        complain(inherited == nullptr && overrides, feature.place, name + " overrides what no superclass declares");
         complain(inherited != nullptr && !overrides, feature.place,
-                 format("{} is inherited and declared again without Override", name));
+                 name + " is inherited and declared again without Override");
         complain(!overridden.empty() && !om::sameName(overridden, feature.name), feature.place,
-                 format("{} overrides {}, which is named otherwise", name, overridden));
+                 name + " overrides " + overridden + ", which is named otherwise");
     }
 
     bool narrows(const om::PropertyDeclaration& property, const om::PropertyDeclaration& inherited) const {
@@ -264,7 +259,7 @@ void checkClass(const om::Schema& schema, const om::ClassDeclaration& declared, 
 }
 
 std::string shown(const om::Place& place) {
-    return format("{}:{}", place.file, place.line);
+    return place.file + ':' + std::to_string(place.line);
 }
 
 std::string typeText(CMPIType type, const std::string& referenceClass) {

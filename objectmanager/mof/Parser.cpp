@@ -5,8 +5,6 @@
 #include "objectmanager/mof/MofError.h"
 #include "objectmanager/vkcim/Names.h"
 
-#include <fmt/format.h>
-
 #include <algorithm>
 
 namespace mof {
@@ -46,8 +44,8 @@ private:
         throw MofError(file, token.line, what);
     }
 
-    [[noreturn]] void failAt(const Token& token, std::string_view expected) const {
-        fail(token, fmt::format("expected {}, found {}", expected, shown(token)));
+    [[noreturn]] void failAt(const Token& token, const std::string& expected) const {
+        fail(token, "expected " + expected + ", found " + shown(token));
     }
 
     bool stands(std::string_view word) const {
@@ -61,10 +59,10 @@ private:
     }
 
     void expect(std::string_view word) {
-        if (!take(word)) failAt(now(), fmt::format("'{}'", word));
+        if (!take(word)) failAt(now(), '\'' + std::string(word) + '\'');
     }
 
-    const Token& name(std::string_view what) {
+    const Token& name(const char* what) {
         const Token& token = next();
         if (token.kind != Kind::Name) failAt(token, what);
         return token;
@@ -109,7 +107,7 @@ private:
     }
 
     /// What properties, methods and parameters begin with.
-    om::PropertyDeclaration feature(std::string_view what) {
+    om::PropertyDeclaration feature(const char* what) {
         om::PropertyDeclaration found;
         found.qualifiers = qualifiers(found.place);
         const Token& type = name("a type");

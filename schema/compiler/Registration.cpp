@@ -1,27 +1,22 @@
 #include "schema/compiler/Outputs.h"
 
 #include <fmt/format.h>
-#include <fmt/ranges.h>
+
+#include <array>
 
 namespace compiler {
 namespace {
 
 using fmt::format;
 
-/// A kind of provider, as instances and as stanzas name it.
-struct Kind {
-    int number;
-    const char* word;
-};
-
-/// What the provider does for a class. It runs the methods that the class itself declares, and no inherited one.
-template <class Member>
-std::string kinds(const om::ClassDeclaration& declared, Member member, const char* separator) {
-    using Named = std::remove_reference_t<decltype(Kind().*member)>;
-    std::vector<Named> found{Kind{2, "instance"}.*member};
-    if (declared.association) found.push_back(Kind{3, "association"}.*member);
-    if (!declared.methods.empty()) found.push_back(Kind{5, "method"}.*member);
-    return format("{}", fmt::join(found, separator));
+/// What the provider does for a class, in words for instances, associations and methods. It runs the methods that the
+/// class itself declares, and no inherited one.
+std::string kinds(const om::ClassDeclaration& declared, const std::array<const char*, 3>& words,
+                  const char* separator) {
+    std::string text = words[0];
+    if (declared.association) text += std::string(separator) + words[1];
+    if (!declared.methods.empty()) text += std::string(separator) + words[2];
+    return text;
 }
 
 using Properties = std::vector<std::pair<const char*, std::string>>;
@@ -51,7 +46,7 @@ std::string moduleInstances(const Provider& provider, const Classes& ours) {
                                  {"CapabilityID", quoted(provider.module + '.' + declared->name)},
                                  {"ClassName", quoted(declared->name)},
                                  {"Namespaces", '{' + quoted(provider.nameSpace) + '}'},
-                                 {"ProviderType", '{' + kinds(*declared, &Kind::number, ", ") + '}'},
+                                 {"ProviderType", '{' + kinds(*declared, {"2", "3", "5"}, ", ") + '}'},
                                  {"SupportedProperties", "NULL"},
                                  {"SupportedMethods", "NULL"}});
     }
@@ -62,7 +57,8 @@ std::string stanzas(const Provider& provider, const Classes& ours) {
     std::string text;
     for (const om::ClassDeclaration* declared : ours) {
         text += format("[{}]\n   provider: {}\n   location: {}\n   type: {}\n   namespace: {}\n#\n", declared->name,
-                       provider.name, provider.location, kinds(*declared, &Kind::word, " "), provider.nameSpace);
+                       provider.name, provider.location, kinds(*declared, {"instance", "association", "method"}, " "),
+                       provider.nameSpace);
     }
     return text;
 }
