@@ -26,7 +26,7 @@ Classes standardBefore(const Classes& others) {
     const std::vector<std::string> served = builtin.served();
     Classes standard;
     for (const om::ClassDeclaration& declared : builtin.classes()) {
-        if (std::find(served.begin(), served.end(), declared.name) != served.end()) continue;
+        if (om::containsName(served, declared.name)) continue;
         const bool again = std::any_of(others.begin(), others.end(), [&](const om::ClassDeclaration& other) {
             return om::sameName(other.name, declared.name);
         });

@@ -69,9 +69,7 @@ Strings keyNames(const om::Schema& schema, const om::ClassDeclaration& declared)
     const std::vector<const om::ClassDeclaration*> line = schema.line(declared.name);
     for (auto c = line.rbegin(); c != line.rend(); ++c) {
         for (const om::PropertyDeclaration& property : (*c)->properties) {
-            const bool known = std::any_of(names.begin(), names.end(),
-                                           [&](const std::string& name) { return om::sameName(name, property.name); });
-            if (property.key && !known) names.push_back(property.name);
+            if (property.key && !om::containsName(names, property.name)) names.push_back(property.name);
         }
     }
     return names;
