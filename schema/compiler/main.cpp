@@ -125,20 +125,26 @@ private:
     Strings texts;
 };
 
-} // namespace
-
-int main(int argc, char** argv) {
+int run(int argc, char** argv) {
     CLI::App app("Compiles this directory's MOF files over a stub of the standard classes, and writes what is made of "
                  "them.\nWithout an output it only checks. Every complaint is FILE:LINE: TEXT on standard error; then "
                  "nothing is written and the exit status is 1.",
                  "vk-mof");
+    Options options;
+    addOptions(app, options);
     try {
-        Options options;
-        addOptions(app, options);
         app.parse(argc, argv);
-        return Compilation(options).finish() ? 0 : 1;
     } catch (const CLI::Error& error) {
         return app.exit(error) == 0 ? 0 : unusableArguments;
+    }
+    return Compilation(options).finish() ? 0 : 1;
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    try {
+        return run(argc, argv);
     } catch (const std::exception& error) {
         std::cerr << error.what() << '\n';
         return 1;
