@@ -8,7 +8,7 @@ class ArrayObject final : public Object<ArrayObject, CMPIArray> {
 public:
     static const CMPIArrayFT table;
     /// More elements are refused; nobody needs them, and the memory would be the whole machine's.
-    static constexpr CMPICount MostElements = 1U << 20U;
+    static constexpr CMPICount mostElements = 1U << 20U;
 
     /// An array of nulls.
     ArrayObject(Broker& broker, CMPICount size, CMPIType declaredType);

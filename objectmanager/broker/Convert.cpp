@@ -11,10 +11,10 @@ namespace om {
 
 namespace {
 
-constexpr CMPIType ArrayBit = CMPI_ARRAY;
+constexpr CMPIType arrayBit = CMPI_ARRAY;
 
 CMPIType elementType(CMPIType type) {
-    return static_cast<CMPIType>(type & ~ArrayBit);
+    return static_cast<CMPIType>(type & ~arrayBit);
 }
 
 /// Reads the type's own bytes: callers pass the address of a plain scalar, too.

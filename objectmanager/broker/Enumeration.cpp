@@ -8,12 +8,12 @@ namespace om {
 namespace {
 
 /// The code of the end of an enumeration; older headers have no name for it.
-constexpr auto NoMoreElements = static_cast<CMPIrc>(18);
+constexpr auto noMoreElements = static_cast<CMPIrc>(18);
 
 CMPIData getNext(const CMPIEnumeration* handle, CMPIStatus* rc) {
     auto& self = open<EnumerationObject>(handle);
     if (self.next >= self.elements.size()) {
-        report(rc, NoMoreElements);
+        report(rc, noMoreElements);
         return noData();
     }
     return give(self, self.elements[self.next++]);

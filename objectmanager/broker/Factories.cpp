@@ -44,7 +44,7 @@ CMPIArray* newArray(const CMPIBroker* handle, CMPICount size, CMPIType type, CMP
     Broker& broker = open(handle);
     const auto elementType = static_cast<CMPIType>(type & ~static_cast<CMPIType>(CMPI_ARRAY));
     if (!isValueType(elementType)) throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
-    if (size > ArrayObject::MostElements) throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
+    if (size > ArrayObject::mostElements) throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
     return &make<ArrayObject>(broker, size, elementType);
 }
 

@@ -14,7 +14,7 @@ namespace om {
 namespace {
 
 /// Provider calls within provider calls, on one thread. More would be a provider that calls itself without end.
-constexpr int DeepestCall = 32;
+constexpr int deepestCall = 32;
 
 const char* orNull(const std::optional<std::string>& text) {
     return text ? text->c_str() : nullptr;
@@ -155,7 +155,7 @@ __attribute__((no_sanitize("null"))) Answer
 invoke(Broker& broker, const Request& request, std::vector<ContextEntry> entries, std::chrono::nanoseconds* elapsed) {
     Answer answer;
     const Call call;
-    if (call.depth() > DeepestCall) {
+    if (call.depth() > deepestCall) {
         answer.code = CMPI_RC_ERR_FAILED;
         answer.message = "too many calls within calls";
         return answer;

@@ -22,7 +22,7 @@ struct alignas(std::max_align_t) MemoryBlocks::Block {
 namespace {
 
 /// No object is larger; asking for more is a mistake in a calculation.
-constexpr std::size_t MostBytes = PTRDIFF_MAX / 2;
+constexpr std::size_t mostBytes = PTRDIFF_MAX / 2;
 
 } // namespace
 
@@ -49,7 +49,7 @@ void MemoryBlocks::unlink(Block* block) {
 }
 
 void* MemoryBlocks::allocate(std::size_t size) {
-    if (size > MostBytes) return nullptr;
+    if (size > mostBytes) return nullptr;
     auto* block = static_cast<Block*>(std::malloc(sizeof(Block) + size));
     if (block == nullptr) return nullptr;
     link(block);
@@ -66,7 +66,7 @@ void* MemoryBlocks::allocateZeroed(std::size_t count, std::size_t size) {
 
 void* MemoryBlocks::resize(void* pointer, std::size_t size) {
     if (pointer == nullptr) return allocate(size);
-    if (size > MostBytes) return nullptr;
+    if (size > mostBytes) return nullptr;
     Block* old = static_cast<Block*>(pointer) - 1;
     unlink(old);
     auto* block = static_cast<Block*>(std::realloc(old, sizeof(Block) + size));

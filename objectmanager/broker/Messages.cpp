@@ -12,7 +12,7 @@ namespace om {
 
 namespace {
 
-constexpr CMPICount MostInserts = 10;
+constexpr CMPICount mostInserts = 10;
 
 /// Variable arguments, in a struct so that they can be handed on.
 struct Arguments {
@@ -54,7 +54,7 @@ std::string expand(const std::string& pattern, const std::vector<std::string>& i
     std::string result;
     for (std::size_t i = 0; i < pattern.size(); ++i) {
         const std::size_t number =
-            i + 1 < pattern.size() ? static_cast<std::size_t>(pattern[i + 1] - '0') : MostInserts;
+            i + 1 < pattern.size() ? static_cast<std::size_t>(pattern[i + 1] - '0') : mostInserts;
         if (pattern[i] == '$' && number < inserts.size()) {
             result += inserts[number];
             ++i;
@@ -66,7 +66,7 @@ std::string expand(const std::string& pattern, const std::vector<std::string>& i
 }
 
 std::vector<std::string> readInserts(CMPICount pairs, Arguments& arguments) {
-    if (pairs > MostInserts) throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
+    if (pairs > mostInserts) throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
     std::vector<std::string> inserts;
     for (CMPICount i = 0; i < pairs; ++i) inserts.push_back(nextInsert(arguments));
     return inserts;

@@ -59,17 +59,17 @@ int threadSleep(CMPIUint32 milliseconds) {
 /// The variable starts as 0; others wait until the function of the first has returned. If that ends by an exception
 /// or with its thread, the next one runs it again.
 int threadOnce(int* once, void (*initialise)()) {
-    constexpr int Fresh = 0;
-    constexpr int Done = 1;
-    constexpr int Running = 2;
+    constexpr int fresh = 0;
+    constexpr int done = 1;
+    constexpr int running = 2;
     if (once == nullptr || initialise == nullptr) return EINVAL;
-    if (__atomic_load_n(once, __ATOMIC_ACQUIRE) == Done) return 0;
+    if (__atomic_load_n(once, __ATOMIC_ACQUIRE) == done) return 0;
     static std::mutex mutex;
     static std::condition_variable changed;
     std::unique_lock lock(mutex);
-    changed.wait(lock, [once] { return __atomic_load_n(once, __ATOMIC_RELAXED) != Running; });
-    if (__atomic_load_n(once, __ATOMIC_RELAXED) == Done) return 0;
-    __atomic_store_n(once, Running, __ATOMIC_RELAXED);
+    changed.wait(lock, [once] { return __atomic_load_n(once, __ATOMIC_RELAXED) != running; });
+    if (__atomic_load_n(once, __ATOMIC_RELAXED) == done) return 0;
+    __atomic_store_n(once, running, __ATOMIC_RELAXED);
     lock.unlock();
     const auto finish = [&](int state) {
         lock.lock();
@@ -79,10 +79,10 @@ int threadOnce(int* once, void (*initialise)()) {
     try {
         initialise();
     } catch (...) {
-        finish(Fresh);
+        finish(fresh);
         throw;
     }
-    finish(Done);
+    finish(done);
     return 0;
 }
 

@@ -2,8 +2,8 @@
 
 #include "objectmanager/cimxml/Errors.h"
 #include "objectmanager/model/DateTime.h"
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <utf8.h>
 
@@ -12,8 +12,8 @@
 namespace cimxml {
 namespace {
 
-using vkcim::elementType;
-using vkcim::isArray;
+using om::elementType;
+using om::isArray;
 
 [[noreturn]] void mismatch(std::string_view text, CMPIType type) {
     constexpr std::size_t shown = 60;
@@ -70,7 +70,7 @@ std::string realText(std::string_view text) {
 om::Value numberOf(std::string_view text, CMPIType type) {
     const bool real = type == CMPI_real32 || type == CMPI_real64;
     om::Value value;
-    if (vkcim::readNumber(real ? realText(text) : decimal(text), type, value) != vkcim::NumberError::None) {
+    if (om::readNumber(real ? realText(text) : decimal(text), type, value) != om::NumberError::None) {
         mismatch(text, type);
     }
     return value;
@@ -117,8 +117,8 @@ CMPIType statedType(const KeyElement& key) {
     if (key.valueType == "boolean") return CMPI_boolean;
     if (key.valueType != "numeric") return CMPI_string;
     om::Value probe;
-    return vkcim::readNumber(trimmed(key.value.text), CMPI_sint64, probe) == vkcim::NumberError::None ? CMPI_sint64
-                                                                                                      : CMPI_uint64;
+    return om::readNumber(trimmed(key.value.text), CMPI_sint64, probe) == om::NumberError::None ? CMPI_sint64
+                                                                                                : CMPI_uint64;
 }
 
 om::NamedValue typedKey(const KeyElement& element, const om::ResolvedClass* known, const Reading& reading) {
@@ -145,14 +145,14 @@ CMPIType propertyType(const PropertyElement& element, const om::PropertyDeclarat
 
 std::optional<CMPIType> typeNamed(std::string_view word) {
     if (word == "reference") return CMPI_ref;
-    const std::optional<CMPIType> type = vkcim::typeNamed(word);
+    const std::optional<CMPIType> type = om::typeNamed(word);
     return type && (*type == CMPI_ref || isArray(*type)) ? std::nullopt : type;
 }
 
 std::string typeName(CMPIType type) {
     const CMPIType element = elementType(type);
     if (element == CMPI_ref) return "reference";
-    return element == CMPI_instance ? "string" : vkcim::typeName(element);
+    return element == CMPI_instance ? "string" : om::typeName(element);
 }
 
 om::Value typedValue(const ValueElement& element, CMPIType type, const Reading& reading) {

@@ -2,7 +2,7 @@
 
 #include "objectmanager/cimxml/Escape.h"
 #include "objectmanager/cimxml/Typing.h"
-#include "objectmanager/vkcim/Names.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <cmath>
 #include <cstdio>
@@ -12,8 +12,8 @@ namespace {
 
 using Path = std::shared_ptr<const om::ObjectPath>;
 using Embedded = std::shared_ptr<const om::Instance>;
-using vkcim::elementType;
-using vkcim::isArray;
+using om::elementType;
+using om::isArray;
 
 /// Digits enough to read back the same number in its width.
 std::string realText(double number, CMPIType type) {

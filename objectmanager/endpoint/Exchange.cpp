@@ -1,6 +1,7 @@
 #include "objectmanager/endpoint/Exchange.h"
 
 #include "objectmanager/cimxml/Errors.h"
+#include "objectmanager/model/Characters.h"
 #include "objectmanager/model/Names.h"
 
 #include <algorithm>
@@ -19,10 +20,6 @@ std::string_view trimmed(std::string_view text) {
     return text.substr(first, text.find_last_not_of(" \t") - first + 1);
 }
 
-bool isDigit(char c) {
-    return c >= '0' && c <= '9';
-}
-
 /// The two digits that an M-POST puts before its headers: `Man: "URI" ; ns=NN`.
 std::optional<std::string> prefixOf(std::string_view man) {
     const std::size_t semicolon = man.find(';');
@@ -33,7 +30,7 @@ std::optional<std::string> prefixOf(std::string_view man) {
     const std::size_t equals = digits.find('=');
     if (equals == std::string_view::npos || !om::sameName(trimmed(digits.substr(0, equals)), "ns")) return std::nullopt;
     digits = trimmed(digits.substr(equals + 1));
-    if (digits.size() != 2 || !isDigit(digits[0]) || !isDigit(digits[1])) return std::nullopt;
+    if (digits.size() != 2 || !om::isDigit(digits[0]) || !om::isDigit(digits[1])) return std::nullopt;
     return std::string(digits) + '-';
 }
 
@@ -47,7 +44,7 @@ std::string prefixOf(const HttpRequest& request) {
 }
 
 int hexDigit(char c) {
-    if (isDigit(c)) return c - '0';
+    if (om::isDigit(c)) return c - '0';
     const char letter = om::lower(c);
     return letter >= 'a' && letter <= 'f' ? letter - 'a' + 10 : -1;
 }

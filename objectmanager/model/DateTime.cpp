@@ -1,5 +1,7 @@
 #include "objectmanager/model/DateTime.h"
 
+#include "objectmanager/model/Characters.h"
+
 #include <algorithm>
 #include <chrono>
 #include <cstdio>
@@ -8,12 +10,12 @@ namespace om {
 
 namespace {
 
-constexpr std::size_t TextLength = 25;
-constexpr std::size_t PointAt = 14;
-constexpr std::size_t MicrosecondsAt = 15;
-constexpr std::size_t SignAt = 21;
-constexpr std::int64_t Million = 1'000'000;
-constexpr std::int64_t SecondsPerDay = 86'400;
+constexpr std::size_t textLength = 25;
+constexpr std::size_t pointAt = 14;
+constexpr std::size_t microsecondsAt = 15;
+constexpr std::size_t signAt = 21;
+constexpr std::int64_t million = 1'000'000;
+constexpr std::int64_t secondsPerDay = 86'400;
 
 struct Field {
     std::size_t at;
@@ -22,19 +24,15 @@ struct Field {
     unsigned most;
 };
 
-constexpr Field Year{0, 4, 0, 9999};
-constexpr Field Month{4, 2, 1, 12};
-constexpr Field Day{6, 2, 1, 31};
-constexpr Field Days{0, 8, 0, 99'999'999};
-constexpr Field Hour{8, 2, 0, 23};
-constexpr Field Minute{10, 2, 0, 59};
-constexpr Field Second{12, 2, 0, 59};
-constexpr Field Fraction{MicrosecondsAt, 6, 0, 999'999};
-constexpr Field Offset{22, 3, 0, 999};
-
-bool isDigit(char c) {
-    return c >= '0' && c <= '9';
-}
+constexpr Field yearField{0, 4, 0, 9999};
+constexpr Field monthField{4, 2, 1, 12};
+constexpr Field dayField{6, 2, 1, 31};
+constexpr Field daysField{0, 8, 0, 99'999'999};
+constexpr Field hourField{8, 2, 0, 23};
+constexpr Field minuteField{10, 2, 0, 59};
+constexpr Field secondField{12, 2, 0, 59};
+constexpr Field fractionField{microsecondsAt, 6, 0, 999'999};
+constexpr Field offsetField{22, 3, 0, 999};
 
 std::string_view part(std::string_view text, Field field) {
     return text.substr(field.at, field.length);
@@ -67,19 +65,19 @@ bool isField(std::string_view text, Field field, bool& unknown) {
 }
 
 bool isFraction(std::string_view text, bool unknown) {
-    const std::string_view digits = part(text, Fraction);
+    const std::string_view digits = part(text, fractionField);
     const std::size_t known = std::min(digits.find('*'), digits.size());
     return std::all_of(digits.begin(), digits.begin() + static_cast<std::ptrdiff_t>(known), isDigit) &&
            digits.find_first_not_of('*', known) == std::string_view::npos && (!unknown || known == 0);
 }
 
 std::chrono::year_month_day dateOf(std::string_view text) {
-    return {std::chrono::year{static_cast<int>(number(text, Year))}, std::chrono::month{number(text, Month)},
-            std::chrono::day{number(text, Day)}};
+    return {std::chrono::year{static_cast<int>(number(text, yearField))}, std::chrono::month{number(text, monthField)},
+            std::chrono::day{number(text, dayField)}};
 }
 
 bool dayExists(std::string_view text) {
-    if (isUnknown(text, Day)) return true;
+    if (isUnknown(text, dayField)) return true;
     return dateOf(text).ok();
 }
 
@@ -100,60 +98,60 @@ std::int64_t floorDivide(std::int64_t a, std::int64_t b) {
 } // namespace
 
 bool isInterval(std::string_view dateTime) {
-    return dateTime.size() == TextLength && dateTime[SignAt] == ':';
+    return dateTime.size() == textLength && dateTime[signAt] == ':';
 }
 
 bool isDateTime(std::string_view text) {
-    if (text.size() != TextLength || text[PointAt] != '.') return false;
+    if (text.size() != textLength || text[pointAt] != '.') return false;
     bool unknown = false;
     const bool interval = isInterval(text);
-    if (interval ? !isField(text, Days, unknown)
-                 : !isField(text, Year, unknown) || !isField(text, Month, unknown) || !isField(text, Day, unknown) ||
-                       !dayExists(text)) {
+    if (interval ? !isField(text, daysField, unknown)
+                 : !isField(text, yearField, unknown) || !isField(text, monthField, unknown) ||
+                       !isField(text, dayField, unknown) || !dayExists(text)) {
         return false;
     }
-    if (!isField(text, Hour, unknown) || !isField(text, Minute, unknown) || !isField(text, Second, unknown) ||
-        !isFraction(text, unknown)) {
+    if (!isField(text, hourField, unknown) || !isField(text, minuteField, unknown) ||
+        !isField(text, secondField, unknown) || !isFraction(text, unknown)) {
         return false;
     }
-    if (interval) return part(text, Offset) == "000";
-    return (text[SignAt] == '+' || text[SignAt] == '-') && hasDigits(text, Offset);
+    if (interval) return part(text, offsetField) == "000";
+    return (text[signAt] == '+' || text[signAt] == '-') && hasDigits(text, offsetField);
 }
 
 std::optional<std::int64_t> microseconds(std::string_view dateTime) {
     if (!isDateTime(dateTime) || dateTime.find('*') != std::string_view::npos) return std::nullopt;
     const auto value = [dateTime](Field field) { return static_cast<std::int64_t>(number(dateTime, field)); };
-    const std::int64_t time = (value(Hour) * 60 + value(Minute)) * 60 + value(Second);
+    const std::int64_t time = (value(hourField) * 60 + value(minuteField)) * 60 + value(secondField);
     std::int64_t seconds = 0;
     if (isInterval(dateTime)) {
-        seconds = value(Days) * SecondsPerDay + time;
+        seconds = value(daysField) * secondsPerDay + time;
     } else {
-        const std::int64_t offset = value(Offset) * (dateTime[SignAt] == '-' ? -60 : 60);
+        const std::int64_t offset = value(offsetField) * (dateTime[signAt] == '-' ? -60 : 60);
         const std::int64_t days = std::chrono::sys_days{dateOf(dateTime)}.time_since_epoch().count();
-        seconds = days * SecondsPerDay + time - offset;
+        seconds = days * secondsPerDay + time - offset;
     }
-    return seconds * Million + value(Fraction);
+    return seconds * million + value(fractionField);
 }
 
 std::optional<std::string> formatInstant(std::int64_t microseconds) {
-    const std::int64_t seconds = floorDivide(microseconds, Million);
-    const std::int64_t days = floorDivide(seconds, SecondsPerDay);
-    constexpr std::int64_t Earliest = -719'528; // 0000-01-01
-    constexpr std::int64_t Latest = 2'932'896;  // 9999-12-31
-    if (days < Earliest || days > Latest) return std::nullopt;
+    const std::int64_t seconds = floorDivide(microseconds, million);
+    const std::int64_t days = floorDivide(seconds, secondsPerDay);
+    constexpr std::int64_t earliest = -719'528; // 0000-01-01
+    constexpr std::int64_t latest = 2'932'896;  // 9999-12-31
+    if (days < earliest || days > latest) return std::nullopt;
     const std::chrono::year_month_day date{std::chrono::sys_days{std::chrono::days{days}}};
     const std::int64_t packed =
         (std::int64_t{int{date.year()}} * 100 + unsigned{date.month()}) * 100 + unsigned{date.day()};
-    return print(packed, seconds - days * SecondsPerDay, microseconds - seconds * Million) + "+000";
+    return print(packed, seconds - days * secondsPerDay, microseconds - seconds * million) + "+000";
 }
 
 std::optional<std::string> formatInterval(std::uint64_t microseconds) {
-    constexpr auto PerSecond = static_cast<std::uint64_t>(Million);
-    constexpr auto PerDay = static_cast<std::uint64_t>(SecondsPerDay) * PerSecond;
-    const std::uint64_t days = microseconds / PerDay;
-    if (days > Days.most) return std::nullopt;
-    return print(static_cast<std::int64_t>(days), static_cast<std::int64_t>(microseconds % PerDay / PerSecond),
-                 static_cast<std::int64_t>(microseconds % PerSecond)) +
+    constexpr auto perSecond = static_cast<std::uint64_t>(million);
+    constexpr auto perDay = static_cast<std::uint64_t>(secondsPerDay) * perSecond;
+    const std::uint64_t days = microseconds / perDay;
+    if (days > daysField.most) return std::nullopt;
+    return print(static_cast<std::int64_t>(days), static_cast<std::int64_t>(microseconds % perDay / perSecond),
+                 static_cast<std::int64_t>(microseconds % perSecond)) +
            ":000";
 }
 

@@ -1,8 +1,8 @@
 #include "objectmanager/mof/ClassCheck.h"
 
+#include "objectmanager/model/NumberText.h"
 #include "objectmanager/model/QualifierTypes.h"
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <algorithm>
 #include <set>
@@ -47,7 +47,7 @@ const char* scopeText(char scope) {
 bool isRange(std::string_view text, CMPIType type) {
     const auto isEnd = [type](std::string_view end) {
         om::Value number;
-        return end.empty() || vkcim::readNumber(end, type, number) == vkcim::NumberError::None;
+        return end.empty() || om::readNumber(end, type, number) == om::NumberError::None;
     };
     const std::size_t dots = text.find("..");
     if (dots == std::string_view::npos) return isEnd(text);
@@ -78,7 +78,7 @@ public:
         checkFeature({declared.name, declared.association ? 'a' : 'c', declared.qualifiers, declared.place});
         for (const om::PropertyDeclaration& property : declared.properties) {
             const std::string name = declared.name + '.' + property.name;
-            const char scope = vkcim::elementType(property.type) == CMPI_ref ? 'r' : 'p';
+            const char scope = om::elementType(property.type) == CMPI_ref ? 'r' : 'p';
             checkFeature({name, scope, property.qualifiers, property.place, property.type, property.referenceClass});
             checkProperty(property, name);
         }
@@ -108,7 +108,7 @@ private:
         }
         const om::ResolvedClass& whole = *schema.resolve(name);
         const auto references = std::count_if(whole.properties.begin(), whole.properties.end(), [](const auto& each) {
-            return vkcim::elementType(each.second->type) == CMPI_ref;
+            return om::elementType(each.second->type) == CMPI_ref;
         });
         complain(declared.association && references < 2, declared.place,
                  "association " + name + " has fewer than two references");
@@ -139,7 +139,7 @@ private:
 
     void checkFeature(const Feature& feature) {
         checkQualifiers(feature);
-        if (vkcim::elementType(feature.type) == CMPI_ref) {
+        if (om::elementType(feature.type) == CMPI_ref) {
             complain(schema.find(feature.referenceClass) == nullptr, feature.place,
                      feature.name + " refers to " + feature.referenceClass + ", which is not declared");
         }
@@ -178,7 +178,7 @@ private:
             complain(true, feature.place, "ValueMap and Values of " + feature.name + " do not pair");
             return;
         }
-        const CMPIType type = vkcim::elementType(feature.type);
+        const CMPIType type = om::elementType(feature.type);
         for (const std::string_view number : numbers) {
             complain((type & CMPI_UINT) != 0 && !isRange(number, type), feature.place,
                      "'" + std::string(number) + "' in the ValueMap of " + feature.name + " is no " + typeText(type));
@@ -202,7 +202,7 @@ private:
     }
 
     void checkKey(const om::PropertyDeclaration& property, const std::string& name) {
-        complain(vkcim::isArray(property.type), property.place, "key " + name + " is an array");
+        complain(om::isArray(property.type), property.place, "key " + name + " is an array");
         if (!ours || above == nullptr || above->keys.empty()) return;
         const om::PropertyDeclaration* inherited = above->findProperty(property.name);
         if (inherited != nullptr && inherited->key) {
@@ -239,7 +239,7 @@ private:
     }
 
     bool narrows(const om::PropertyDeclaration& property, const om::PropertyDeclaration& inherited) const {
-        return property.type == inherited.type && (vkcim::elementType(property.type) != CMPI_ref ||
+        return property.type == inherited.type && (om::elementType(property.type) != CMPI_ref ||
                                                    schema.isA(property.referenceClass, inherited.referenceClass));
     }
 
@@ -263,8 +263,8 @@ std::string shown(const om::Place& place) {
 }
 
 std::string typeText(CMPIType type, const std::string& referenceClass) {
-    if (vkcim::elementType(type) != CMPI_ref) return vkcim::typeName(type);
-    return referenceClass + (vkcim::isArray(type) ? " ref[]" : " ref");
+    if (om::elementType(type) != CMPI_ref) return om::typeName(type);
+    return referenceClass + (om::isArray(type) ? " ref[]" : " ref");
 }
 
 } // namespace mof

@@ -1,5 +1,6 @@
 #include "objectmanager/mof/Lexer.h"
 
+#include "objectmanager/model/Characters.h"
 #include "objectmanager/model/Names.h"
 #include "objectmanager/mof/MofError.h"
 
@@ -12,12 +13,8 @@ namespace {
 
 using Kind = Token::Kind;
 
-constexpr bool isDigit(char c) {
-    return c >= '0' && c <= '9';
-}
-
 constexpr bool isHexDigit(char c) {
-    return isDigit(c) || (om::lower(c) >= 'a' && om::lower(c) <= 'f');
+    return om::isDigit(c) || (om::lower(c) >= 'a' && om::lower(c) <= 'f');
 }
 
 constexpr bool isSign(char c) {
@@ -29,7 +26,7 @@ constexpr bool isLetter(char c) {
 }
 
 constexpr bool isInName(char c) {
-    return isLetter(c) || isDigit(c) || c == '_';
+    return isLetter(c) || om::isDigit(c) || c == '_';
 }
 
 constexpr std::string_view blanks = " \t\r\n";
@@ -107,12 +104,12 @@ private:
     }
 
     bool readReal() {
-        const std::size_t point = past(at + isSign(text[at]), isDigit);
-        if (peek(point) != '.' || !isDigit(peek(point + 1))) return false;
-        std::size_t end = past(point + 1, isDigit);
+        const std::size_t point = past(at + isSign(text[at]), om::isDigit);
+        if (peek(point) != '.' || !om::isDigit(peek(point + 1))) return false;
+        std::size_t end = past(point + 1, om::isDigit);
         if (om::lower(peek(end)) == 'e') {
             const std::size_t exponent = end + 1 + isSign(peek(end + 1));
-            if (isDigit(peek(exponent))) end = past(exponent, isDigit);
+            if (om::isDigit(peek(exponent))) end = past(exponent, om::isDigit);
         }
         add(Kind::Real, end);
         return true;
@@ -120,9 +117,9 @@ private:
 
     bool readInteger() {
         const std::size_t digits = at + isSign(text[at]);
-        if (!isDigit(peek(digits))) return false;
+        if (!om::isDigit(peek(digits))) return false;
         const bool hex = text[digits] == '0' && om::lower(peek(digits + 1)) == 'x' && isHexDigit(peek(digits + 2));
-        add(Kind::Integer, hex ? past(digits + 2, isHexDigit) : past(digits, isDigit));
+        add(Kind::Integer, hex ? past(digits + 2, isHexDigit) : past(digits, om::isDigit));
         return true;
     }
 

@@ -2,8 +2,8 @@
 
 #include "objectmanager/model/DateTime.h"
 #include "objectmanager/model/Names.h"
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <charconv>
 #include <limits>
@@ -11,7 +11,7 @@
 namespace mof {
 namespace {
 
-using vkcim::NumberError;
+using om::NumberError;
 
 bool isReal(CMPIType type) {
     return type == CMPI_real32 || type == CMPI_real64;
@@ -33,7 +33,7 @@ std::optional<om::Value> typedElements(const om::Value& literal, CMPIType type) 
     if (elements == nullptr) return std::nullopt;
     std::vector<om::Value> found;
     for (const om::Value& element : *elements) {
-        const std::optional<om::Value> made = typed(element, vkcim::elementType(type));
+        const std::optional<om::Value> made = typed(element, om::elementType(type));
         if (!made) return std::nullopt;
         found.push_back(*made);
     }
@@ -47,13 +47,13 @@ om::Value readLiteral(std::string_view text) {
     const std::string number = decimal(text);
     om::Value value;
     for (const CMPIType type : std::initializer_list<CMPIType>{CMPI_uint64, CMPI_sint64, CMPI_real64}) {
-        if (vkcim::readNumber(number, type, value) == NumberError::None) return value;
+        if (om::readNumber(number, type, value) == NumberError::None) return value;
     }
     return {CMPI_real64, std::numeric_limits<double>::infinity()};
 }
 
 std::optional<om::Value> typed(const om::Value& literal, CMPIType type) {
-    if (vkcim::isArray(type)) return typedElements(literal, type);
+    if (om::isArray(type)) return typedElements(literal, type);
     if (const auto* text = std::get_if<std::string>(&literal.data)) {
         const bool fits = type == CMPI_string || (type == CMPI_dateTime && om::isDateTime(*text));
         return fits ? std::optional(om::Value{type, *text}) : std::nullopt;
@@ -64,7 +64,7 @@ std::optional<om::Value> typed(const om::Value& literal, CMPIType type) {
     const bool number = (type & (CMPI_INTEGER | CMPI_REAL)) != 0 || type == CMPI_char16;
     om::Value value;
     if (!number || (isReal(literal.type) && !isReal(type)) ||
-        vkcim::readNumber(vkcim::numberText(literal), type, value) != NumberError::None) {
+        om::readNumber(om::numberText(literal), type, value) != NumberError::None) {
         return std::nullopt;
     }
     return value;

@@ -1,9 +1,9 @@
 #include "objectmanager/mof/Parser.h"
 
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/mof/Lexer.h"
 #include "objectmanager/mof/Literal.h"
 #include "objectmanager/mof/MofError.h"
-#include "objectmanager/vkcim/Names.h"
 
 #include <algorithm>
 
@@ -115,7 +115,7 @@ private:
             found.type = CMPI_ref;
             found.referenceClass = type.text;
         } else {
-            found.type = vkcim::typeNamed(lowerCase(type.text)).value_or(CMPI_ref);
+            found.type = om::typeNamed(lowerCase(type.text)).value_or(CMPI_ref);
             if (found.type == CMPI_ref) fail(type, shown(type) + " is no type");
         }
         found.name = placed(name(what), found.place);

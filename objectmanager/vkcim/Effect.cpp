@@ -1,6 +1,6 @@
 #include "objectmanager/vkcim/Effect.h"
 
-#include "objectmanager/vkcim/Names.h"
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/ValueText.h"
 
 #include <fmt/format.h>

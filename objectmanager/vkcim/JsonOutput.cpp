@@ -1,7 +1,7 @@
 #include "objectmanager/vkcim/JsonOutput.h"
 
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/Utf8.h"
 
@@ -25,7 +25,7 @@ public:
 
     std::string answer(const om::Answer& answer) const {
         const std::string status = object({member("code", std::to_string(static_cast<int>(answer.code))),
-                                           member("name", string(statusName(static_cast<int>(answer.code)))),
+                                           member("name", string(om::statusName(static_cast<int>(answer.code)))),
                                            member("message", answer.message ? string(*answer.message) : "null")});
         return object({member("status", status), member("done", answer.done ? "true" : "false"),
                        member("results", list(answer.results, [this](const auto& each) { return result(each); })),
@@ -69,7 +69,8 @@ private:
     }
 
     std::string typed(const om::Value& value, const std::vector<std::string_view>& words = {}) const {
-        std::vector<std::string> members = {member("type", string(typeName(value.type))), member("value", bare(value))};
+        std::vector<std::string> members = {member("type", string(om::typeName(value.type))),
+                                            member("value", bare(value))};
         if (!words.empty())
             members.push_back(member("words", list(words, [](std::string_view word) {
                                          return word.empty() ? std::string("null") : string(word);
@@ -111,7 +112,7 @@ private:
             return list(*elements, [this](const om::Value& each) { return bare(each); });
         }
         const auto* real = std::get_if<double>(&value.data);
-        return real && !std::isfinite(*real) ? string(numberText(value)) : numberText(value);
+        return real && !std::isfinite(*real) ? string(om::numberText(value)) : om::numberText(value);
     }
 
     const std::string& nameSpace;

@@ -1,7 +1,7 @@
 #include "objectmanager/vkcim/MofOutput.h"
 
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/Utf8.h"
 #include "objectmanager/vkcim/ValueText.h"
@@ -42,7 +42,7 @@ std::string inQuotes(std::string_view text) {
 
 /// MOF knows no literal for NaN and the infinities: they become NULL with a comment.
 std::string realLiteral(const om::Value& value, double number) {
-    std::string text = numberText(value);
+    std::string text = om::numberText(value);
     if (!std::isfinite(number)) return "NULL /* " + text + " */";
     if (text.find('.') != std::string::npos) return text;
     // A point is required, also before an exponent.
@@ -75,7 +75,7 @@ public:
         std::string text = "// Host " + printable(report.host) + "\n";
         for (const Report::Answers* group : {&report.classes, &report.associations}) {
             for (const auto& [name, each] : *group) {
-                text += fmt::format("\n// {}: {}\n", name, statusName(static_cast<int>(each.code)));
+                text += fmt::format("\n// {}: {}\n", name, om::statusName(static_cast<int>(each.code)));
                 text += answer(each);
             }
         }
@@ -105,7 +105,7 @@ private:
         if (const auto* embedded = std::get_if<std::shared_ptr<const om::Instance>>(&value.data)) {
             return *embedded ? inQuotes(instance(**embedded)) : "NULL";
         }
-        std::string number = numberText(value);
+        std::string number = om::numberText(value);
         if (!number.empty()) return number;
         return inQuotes(plainText(value, {nameSpace, schema}));
     }

@@ -1,8 +1,8 @@
 #include "objectmanager/vkcim/PathText.h"
 
-#include "objectmanager/vkcim/Characters.h"
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/Characters.h"
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/ParseError.h"
 #include "objectmanager/vkcim/Suggestion.h"
 
@@ -18,7 +18,7 @@ std::string shown(char c) {
 }
 
 bool isNameSpaceByte(char c) {
-    return isNameByte(c) || c == '/' || c == '-';
+    return om::isNameByte(c) || c == '/' || c == '-';
 }
 
 /// The kind of key that a type is written as in a path: all integers are one.
@@ -83,8 +83,8 @@ private:
     std::string readName(const char* what) {
         const std::size_t first = at;
         if (atEnd()) fail(at, fmt::format("a {} is missing", what));
-        if (!isNameStart(text[at])) fail(at, fmt::format("a {} cannot start with {}", what, shown(text[at])));
-        while (!atEnd() && isNameByte(text[at])) ++at;
+        if (!om::isNameStart(text[at])) fail(at, fmt::format("a {} cannot start with {}", what, shown(text[at])));
+        while (!atEnd() && om::isNameByte(text[at])) ++at;
         return std::string(text.text().substr(first, at - first));
     }
 
@@ -161,14 +161,14 @@ private:
         const std::string_view word = text.text().substr(first, at - first);
         if (om::sameName(word, "TRUE")) return {CMPI_boolean, true};
         if (om::sameName(word, "FALSE")) return {CMPI_boolean, false};
-        if (!looksLikeInteger(word)) {
+        if (!om::looksLikeInteger(word)) {
             fail(first, fmt::format("the value of key {} is no quoted text, integer, TRUE or FALSE", key));
         }
         om::Value value;
-        if (readNumber(word, CMPI_sint64, value) == NumberError::None) return value;
-        if (readNumber(word, CMPI_uint64, value) == NumberError::None) return value;
+        if (om::readNumber(word, CMPI_sint64, value) == om::NumberError::None) return value;
+        if (om::readNumber(word, CMPI_uint64, value) == om::NumberError::None) return value;
         fail(first, fmt::format("{} is out of range ({} as sint64, up to 18446744073709551615 as uint64)", word,
-                                rangeOf(CMPI_sint64)));
+                                om::rangeOf(CMPI_sint64)));
     }
 
     const SourceText& text;
@@ -198,8 +198,8 @@ std::string keyText(const om::ObjectPath& path, const om::NamedValue& key, const
         const char* prefix = declared && declared->type == CMPI_ref ? "" : "ref:";
         return prefix + inQuotes(qualifiedPathText(**reference, nameSpace, schema));
     }
-    if (std::holds_alternative<double>(value.data)) return inQuotes(numberText(value));
-    const std::string number = numberText(value);
+    if (std::holds_alternative<double>(value.data)) return inQuotes(om::numberText(value));
+    const std::string number = om::numberText(value);
     return number.empty() ? "NULL" : number;
 }
 

@@ -4,7 +4,7 @@
 #include "objectmanager/cimxml/Errors.h"
 #include "objectmanager/cimxml/Typing.h"
 #include "objectmanager/cimxml/Writer.h"
-#include "objectmanager/vkcim/Characters.h"
+#include "objectmanager/model/Characters.h"
 #include "objectmanager/vkcim/PathText.h"
 
 #include <algorithm>
@@ -35,7 +35,7 @@ std::string encoded(std::string_view text) {
     std::string result;
     for (const char c : text) {
         const auto byte = static_cast<unsigned char>(c);
-        if (isNameByte(c) && byte < 0x80) {
+        if (om::isNameByte(c) && byte < 0x80) {
             result += c;
         } else {
             result += '%';

@@ -1,7 +1,7 @@
 #include "objectmanager/vkcim/Requests.h"
 
+#include "objectmanager/model/Characters.h"
 #include "objectmanager/vkcim/Advice.h"
-#include "objectmanager/vkcim/Characters.h"
 #include "objectmanager/vkcim/ParseError.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/ValueText.h"
@@ -44,7 +44,7 @@ std::string queriedClass(const std::string& query) {
     bool next = false;
     while (at < query.size()) {
         std::size_t end = at;
-        while (end < query.size() && isNameByte(query[end])) ++end;
+        while (end < query.size() && om::isNameByte(query[end])) ++end;
         std::string word = query.substr(at, end - at);
         if (next && !word.empty()) return word;
         next = next || om::sameName(word, "FROM");

@@ -1,12 +1,12 @@
 #include "objectmanager/vkcim/Run.h"
 
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/Advice.h"
 #include "objectmanager/vkcim/DefaultLibrary.h"
 #include "objectmanager/vkcim/Effect.h"
 #include "objectmanager/vkcim/HostNotes.h"
 #include "objectmanager/vkcim/JsonOutput.h"
 #include "objectmanager/vkcim/MofOutput.h"
-#include "objectmanager/vkcim/Names.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/QuietErrors.h"
 #include "objectmanager/vkcim/Repetition.h"
@@ -203,7 +203,7 @@ private:
 
     void explain(const Repeated& repeated, const om::Request& request) const {
         const std::string message = repeated.worstMessage ? ": " + *repeated.worstMessage : "";
-        complain(fmt::format("{} ({}){}", statusName(repeated.worst), repeated.worst, message));
+        complain(fmt::format("{} ({}){}", om::statusName(repeated.worst), repeated.worst, message));
         for (const std::string& line : adviceOn(request, repeated.worst, schema)) complain(line);
     }
 

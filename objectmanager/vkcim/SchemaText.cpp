@@ -1,6 +1,6 @@
 #include "objectmanager/vkcim/SchemaText.h"
 
-#include "objectmanager/vkcim/Names.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <fmt/format.h>
 
@@ -14,7 +14,7 @@ const char* kindOf(const om::ClassDeclaration& declared) {
 }
 
 std::string typeText(const om::PropertyDeclaration& declared) {
-    const std::string type = typeName(declared.type);
+    const std::string type = om::typeName(declared.type);
     return declared.referenceClass.empty() ? type : type + " to " + declared.referenceClass;
 }
 
@@ -40,7 +40,7 @@ std::string propertyText(const om::PropertyDeclaration& property) {
 }
 
 std::string methodText(const om::MethodDeclaration& method) {
-    std::string text = fmt::format("  {}(): {}\n", method.name, typeName(method.returnType)) +
+    std::string text = fmt::format("  {}(): {}\n", method.name, om::typeName(method.returnType)) +
                        explanation(method.qualifiers, "      ");
     for (const om::ParameterDeclaration& parameter : method.parameters)
         text += fmt::format("    {}: {}\n", parameter.name, parameterText(parameter)) +

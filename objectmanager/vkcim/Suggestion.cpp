@@ -1,6 +1,6 @@
 #include "objectmanager/vkcim/Suggestion.h"
 
-#include "objectmanager/vkcim/Characters.h"
+#include "objectmanager/model/Characters.h"
 
 #include <algorithm>
 #include <numeric>

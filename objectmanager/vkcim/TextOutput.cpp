@@ -1,7 +1,7 @@
 #include "objectmanager/vkcim/TextOutput.h"
 
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/LinkTree.h"
-#include "objectmanager/vkcim/Names.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/Utf8.h"
 #include "objectmanager/vkcim/ValueText.h"
@@ -64,7 +64,7 @@ using Row = std::pair<std::string, std::string>;
 std::string rowText(const om::NamedValue& each, const Words& words, const TextStyle& style) {
     const std::string text = withWords(each.second, words, ", ", style);
     // An empty text would look like a value that is missing from the table.
-    return text.empty() && !each.second.isNull() && !isArray(each.second.type) ? faint("(empty)", style) : text;
+    return text.empty() && !each.second.isNull() && !om::isArray(each.second.type) ? faint("(empty)", style) : text;
 }
 
 std::string table(const std::vector<Row>& rows, const TextStyle& style) {
@@ -117,7 +117,7 @@ std::string results(const om::Answer& answer, const TextStyle& style) {
 }
 
 std::string group(const std::string& className, const om::Answer& answer, const TextStyle& style) {
-    const std::string status = statusName(static_cast<int>(answer.code));
+    const std::string status = om::statusName(static_cast<int>(answer.code));
     if (answer.code == CMPI_RC_ERR_INVALID_CLASS) {
         return heading(className, style) + "  " + faint("not served: " + status, style) + '\n';
     }

@@ -2,8 +2,8 @@
 
 #include "objectmanager/model/DateTime.h"
 #include "objectmanager/model/Names.h"
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/ParseError.h"
 #include "objectmanager/vkcim/PathText.h"
 
@@ -18,13 +18,14 @@ bool isBoolean(std::string_view text) {
 
 om::Value parseNumber(std::string_view text, CMPIType type, std::size_t offset) {
     om::Value value;
-    switch (readNumber(text, type, value)) {
-    case NumberError::None:
+    switch (om::readNumber(text, type, value)) {
+    case om::NumberError::None:
         return value;
-    case NumberError::OutOfRange:
-        throw ParseError(offset, fmt::format("{} is out of range for {} ({})", text, typeName(type), rangeOf(type)));
+    case om::NumberError::OutOfRange:
+        throw ParseError(offset,
+                         fmt::format("{} is out of range for {} ({})", text, om::typeName(type), om::rangeOf(type)));
     default:
-        throw ParseError(offset, fmt::format("\"{}\" is no {}", text, typeName(type)));
+        throw ParseError(offset, fmt::format("\"{}\" is no {}", text, om::typeName(type)));
     }
 }
 
@@ -60,7 +61,7 @@ om::Value parseArray(const SourceText& source, CMPIType type, const ValueContext
         const std::size_t offset = source.offsetOf(i);
         if (source[i] == ',') {
             element.end(offset);
-            elements.push_back(parseScalar(element, elementType(type), context));
+            elements.push_back(parseScalar(element, om::elementType(type), context));
             element = SourceText();
             continue;
         }
@@ -73,21 +74,21 @@ om::Value parseArray(const SourceText& source, CMPIType type, const ValueContext
         element.append(source[i], offset);
     }
     element.end(source.offsetOf(source.size()));
-    elements.push_back(parseScalar(element, elementType(type), context));
+    elements.push_back(parseScalar(element, om::elementType(type), context));
     return {type, elements};
 }
 
 om::Value parseTyped(const SourceText& source, CMPIType type, const ValueContext& context) {
-    return isArray(type) ? parseArray(source, type, context) : parseScalar(source, type, context);
+    return om::isArray(type) ? parseArray(source, type, context) : parseScalar(source, type, context);
 }
 
 CMPIType guessType(std::string_view text) {
     if (isBoolean(text)) return CMPI_boolean;
-    if (looksLikeReal(text)) return CMPI_real64;
-    if (!looksLikeInteger(text)) return CMPI_string;
+    if (om::looksLikeReal(text)) return CMPI_real64;
+    if (!om::looksLikeInteger(text)) return CMPI_string;
     if (text.front() == '-') return CMPI_sint64;
     om::Value value;
-    return readNumber(text, CMPI_uint32, value) == NumberError::None ? CMPI_uint32 : CMPI_uint64;
+    return om::readNumber(text, CMPI_uint32, value) == om::NumberError::None ? CMPI_uint32 : CMPI_uint64;
 }
 
 std::string joined(const std::vector<om::Value>& elements, const char* separator, bool escape,
@@ -112,15 +113,15 @@ om::Value parseValue(std::string_view text, std::optional<CMPIType> declared, co
     const std::size_t colon = text.find(':');
     if (colon != std::string_view::npos) {
         const std::string_view word = text.substr(0, colon);
-        if (const auto type = typeNamed(word)) return parseTyped(source.from(colon + 1), *type, context);
+        if (const auto type = om::typeNamed(word)) return parseTyped(source.from(colon + 1), *type, context);
         if (word == "null") {
             const std::string_view name = text.substr(colon + 1);
-            if (const auto type = typeNamed(name)) return {*type, std::monostate()};
+            if (const auto type = om::typeNamed(name)) return {*type, std::monostate()};
             throw ParseError(offset + colon + 1, fmt::format("\"{}\" is no type", name));
         }
     }
     // A declared type that has no word (an embedded instance) cannot be written.
-    const bool usable = declared && typeNamed(typeName(*declared));
+    const bool usable = declared && om::typeNamed(om::typeName(*declared));
     return parseTyped(source, usable ? *declared : guessType(text), context);
 }
 
@@ -146,13 +147,14 @@ std::string plainText(const om::Value& value, const ValueContext& context) {
     if (const auto* elements = std::get_if<std::vector<om::Value>>(&value.data)) {
         return joined(*elements, ", ", false, context);
     }
-    return numberText(value);
+    return om::numberText(value);
 }
 
 std::string valueText(const om::Value& value, const ValueContext& context) {
-    if (value.isNull()) return "null:" + typeName(value.type);
+    if (value.isNull()) return "null:" + om::typeName(value.type);
     const auto* elements = std::get_if<std::vector<om::Value>>(&value.data);
-    return typeName(value.type) + ':' + (elements ? joined(*elements, ",", true, context) : plainText(value, context));
+    return om::typeName(value.type) + ':' +
+           (elements ? joined(*elements, ",", true, context) : plainText(value, context));
 }
 
 } // namespace vkcim

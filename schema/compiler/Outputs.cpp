@@ -1,8 +1,8 @@
 #include "schema/compiler/Outputs.h"
 
+#include "objectmanager/model/NumberText.h"
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/mof/ClassCheck.h"
-#include "objectmanager/vkcim/Names.h"
-#include "objectmanager/vkcim/NumberText.h"
 
 #include <fmt/format.h>
 #include <fmt/ranges.h>
@@ -32,16 +32,16 @@ std::string lines(const Strings& items) {
 }
 
 std::string typeCode(CMPIType type) {
-    const CMPIType element = vkcim::elementType(type);
-    const std::string name = element == CMPI_dateTime ? "dateTime" : vkcim::typeName(element);
-    return format("CMPI_{}{}", name, vkcim::isArray(type) ? "A" : "");
+    const CMPIType element = om::elementType(type);
+    const std::string name = element == CMPI_dateTime ? "dateTime" : om::typeName(element);
+    return format("CMPI_{}{}", name, om::isArray(type) ? "A" : "");
 }
 
 std::string printed(const om::Value& value) {
     if (const auto* elements = std::get_if<std::vector<om::Value>>(&value.data)) return list(each(*elements, printed));
     if (const auto* text = std::get_if<std::string>(&value.data)) return quoted(*text);
     if (const auto* flag = std::get_if<bool>(&value.data)) return format("{}", *flag);
-    return vkcim::numberText(value);
+    return om::numberText(value);
 }
 
 std::string qualifiers(const om::Qualifiers& qualifiers) {

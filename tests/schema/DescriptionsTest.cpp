@@ -1,7 +1,7 @@
 // What a class of ours says of the properties that it inherits and does not declare.
+#include "objectmanager/model/NumberText.h"
 #include "objectmanager/mof/Checker.h"
 #include "objectmanager/mof/Parser.h"
-#include "objectmanager/vkcim/NumberText.h"
 
 #include <gmock/gmock.h>
 
@@ -22,7 +22,7 @@ std::vector<std::string> inheritedDefaults(const om::Schema& schema, const std::
     for (const om::ClassDeclaration* above : schema.line(schema.find(className)->superclass)) {
         for (const om::PropertyDeclaration& property : above->properties) {
             if (!property.defaultValue.isNull() && schema.findProperty(className, property.name) == &property)
-                found.push_back(property.name + ' ' + vkcim::numberText(property.defaultValue));
+                found.push_back(property.name + ' ' + om::numberText(property.defaultValue));
         }
     }
     return found;

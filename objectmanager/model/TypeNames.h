@@ -7,7 +7,7 @@
 #include <string_view>
 
 /// The words for types and statuses.
-namespace vkcim {
+namespace om {
 
 /// The type that a word stands for (`uint16`, `datetime[]`, …), or nothing.
 std::optional<CMPIType> typeNamed(std::string_view word);
@@ -26,4 +26,4 @@ inline CMPIType elementType(CMPIType type) {
 /// `CMPI_RC_OK` and so on; `UNKNOWN` for a code without a name.
 const char* statusName(int code);
 
-} // namespace vkcim
+} // namespace om

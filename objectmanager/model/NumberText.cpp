@@ -1,6 +1,6 @@
-#include "objectmanager/vkcim/NumberText.h"
+#include "objectmanager/model/NumberText.h"
 
-#include "objectmanager/vkcim/Characters.h"
+#include "objectmanager/model/Characters.h"
 
 #include <fmt/format.h>
 
@@ -8,7 +8,7 @@
 #include <cmath>
 #include <limits>
 
-namespace vkcim {
+namespace om {
 namespace {
 
 template <typename Number>
@@ -149,4 +149,4 @@ bool looksLikeReal(std::string_view text) {
     return !text.empty() && countDigits(text) == text.size();
 }
 
-} // namespace vkcim
+} // namespace om

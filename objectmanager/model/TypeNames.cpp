@@ -1,8 +1,8 @@
-#include "objectmanager/vkcim/Names.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <fmt/format.h>
 
-namespace vkcim {
+namespace om {
 namespace {
 
 struct TypeWord {
@@ -86,4 +86,4 @@ const char* statusName(int code) {
     return "UNKNOWN";
 }
 
-} // namespace vkcim
+} // namespace om

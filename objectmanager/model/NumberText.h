@@ -7,7 +7,7 @@
 #include <string_view>
 
 /// Numbers as texts and back, exactly.
-namespace vkcim {
+namespace om {
 
 /// The decimal text of an integer value or char16 with all its digits, or of a real: the shortest that reads back the
 /// same in its width, `NaN`, `Infinity` or `-Infinity`. Empty for values that are no numbers.
@@ -26,4 +26,4 @@ bool looksLikeInteger(std::string_view text);
 /// Whether `text` is a number with a point or an exponent.
 bool looksLikeReal(std::string_view text);
 
-} // namespace vkcim
+} // namespace om
