@@ -104,11 +104,11 @@ TEST(DateTimeText, FormattingIsTheInverseOfReading) {
 }
 
 TEST(DateTimeText, EveryDayOfFourCenturiesComesBack) {
-    constexpr std::int64_t day = 86'400'000'000;
+    constexpr std::int64_t microsecondsOfDay = 86'400'000'000;
     for (std::int64_t day = -146'097; day <= 146'097; ++day) {
-        const auto text = formatInstant(day * day);
+        const auto text = formatInstant(day * microsecondsOfDay);
         ASSERT_TRUE(text && isDateTime(*text)) << day;
-        ASSERT_EQ(microseconds(*text), day * day) << *text;
+        ASSERT_EQ(microseconds(*text), day * microsecondsOfDay) << *text;
     }
 }
 
