@@ -24,6 +24,9 @@ set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
 set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/lib)
 set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${CMAKE_BINARY_DIR}/bin)
 set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+# The linker's own list of what it read holds blanks of paths as they are, and what has one in its path would be linked again
+# each time. Linker scripts are named with LINK_DEPENDS.
+set(CMAKE_LINK_DEPENDS_USE_LINKER OFF)
 
 add_library(vk_settings INTERFACE)
 target_compile_options(vk_settings INTERFACE

@@ -54,7 +54,8 @@ show_progress() {
         printf '%s\n' "$line"
         if [[ $line == "-- "* ]]; then
             step=configuring
-        elif [[ $line =~ ^\[([0-9]+)/([0-9]+)\]\  ]]; then
+        # At its step 0 ninja only looks whether there are new files.
+        elif [[ $line =~ ^\[([1-9][0-9]*)/([0-9]+)\]\  ]]; then
             step="building: ${BASH_REMATCH[1]} of ${BASH_REMATCH[2]}"
         else
             continue

@@ -47,11 +47,13 @@ make_root() {
     if [ -n "$kept" ]; then mkdir -p "$VK_FRESH_ROOTS" && tar -C "$2" -cf "$kept.new" . && mv "$kept.new" "$kept"; fi
 }
 
-# in_root DIRECTORY COMMAND...: in namespaces of its own, so that nothing stays mounted and nothing goes on running.
+# in_root DIRECTORY COMMAND...: in namespaces of its own, so that nothing stays mounted and nothing goes on running. The
+# directory becomes the root of all mounts: after a mere chroot nobody there could make namespaces.
 in_root() {
     # shellcheck disable=SC2016 # variables of the inner shell
     unshare --mount --pid --fork --kill-child sh -c '
-        root=$1; shift
-        mount -t proc proc "$root/proc" && mount -t devpts -o newinstance,ptmxmode=0666 devpts "$root/dev/pts" || exit
-        exec chroot "$root" /usr/bin/env -i PATH=/usr/sbin:/usr/bin:/sbin:/bin LC_ALL=C HOME=/root "$@"' in_root "$@"
+        cd "$1" && mount --bind . . && cd "$1" && shift &&
+            mount -t proc proc proc && mount -t devpts -o newinstance,ptmxmode=0666 devpts dev/pts &&
+            pivot_root . mnt && cd / && umount -l /mnt || exit
+        exec /usr/bin/env -i PATH=/usr/sbin:/usr/bin:/sbin:/bin LC_ALL=C HOME=/root "$@"' in_root "$@"
 }

@@ -4,6 +4,7 @@
 #include "objectmanager/cimxml/Typing.h"
 #include "objectmanager/model/TypeNames.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 

@@ -23,8 +23,8 @@ std::vector<const om::ClassDeclaration*> subclasses(const Call& call) {
 
 std::string getClass(const Call& call) {
     const ClassSelection selection = ClassSelection::of(call, true);
-    const om::ResolvedClass& known =
-        knownClass(call, call.parameters.requiredClassName("ClassName"), CMPI_RC_ERR_NOT_FOUND);
+    const std::string name = call.parameters.requiredClassName("ClassName");
+    const om::ResolvedClass& known = knownClass(call, name, CMPI_RC_ERR_NOT_FOUND);
     cimxml::Writer writer;
     writeClass(writer, call.schema(), *known.declaration, selection);
     return returned(writer.text());

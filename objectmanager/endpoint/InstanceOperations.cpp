@@ -169,8 +169,8 @@ std::string getProperty(const Call& call) {
 std::string setProperty(const Call& call) {
     const om::ObjectPath path = servedPath(call, call.parameters.requiredInstanceName("InstanceName"));
     expectAllKeys(call, path);
-    const om::PropertyDeclaration& declared =
-        declaredProperty(call, path, call.parameters.requiredText("PropertyName"));
+    const std::string name = call.parameters.requiredText("PropertyName");
+    const om::PropertyDeclaration& declared = declaredProperty(call, path, name);
     const cimxml::ValueElement* given = call.parameters.find("NewValue");
     om::Request request = requestFor(call, om::Operation::ModifyInstance, path);
     request.propertyList = std::vector<std::string>{declared.name};

@@ -105,6 +105,12 @@ class Progress(Checkout):
         self.build()
         self.assertEqual(self.build(), (0, "first\n", ""))
 
+    def test_is_silent_where_only_new_files_were_looked_for(self):
+        (self.here / "CMakeLists.txt").write_text(f"{PROJECT}file(GLOB found CONFIGURE_DEPENDS *.cpp)\n", encoding="ascii")
+        self.build()
+        self.assertEqual(self.build(), (0, "first\n", ""))
+        self.assertIn("Re-checking globbed directories", (self.here / "build/build.log").read_text(encoding="ascii"))
+
     def test_is_a_step_and_a_count_in_one_line_of_a_terminal_that_is_gone_at_the_end(self):
         output, shown = self.build_on_a_terminal()
         self.assertEqual(output, "first\n")
