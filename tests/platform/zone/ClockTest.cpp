@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <cstdlib>
 #include <ctime>
 #include <unistd.h>
 
@@ -70,6 +71,8 @@ double seconds(clockid_t clock) {
 }
 
 TEST(Clock, SetToNowStaysWhereItIs) {
+    if (std::getenv("VK_TEST_CLOCK") == nullptr)
+        GTEST_SKIP() << "the machine's clocks are set, to now, only where VK_TEST_CLOCK is in the environment";
     takeLog();
     const double before = seconds(CLOCK_REALTIME) - seconds(CLOCK_MONOTONIC);
     const bool done = changeClock(Root("/"), nowText());
