@@ -7,7 +7,7 @@ build_packages="cmake ninja-build g++ pkg-config libcli11-dev nlohmann-json3-dev
 
 # What single tests take; they are skipped without.
 # shellcheck disable=SC2034
-test_packages="sblim-wbemcli python3-clang python3-jsonschema groff bubblewrap strace iproute2 util-linux procps"
+test_packages="curl git sblim-wbemcli python3-clang python3-jsonschema groff bubblewrap strace iproute2 util-linux procps"
 
 die() {
     echo "$0: $*" >&2

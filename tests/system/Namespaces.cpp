@@ -84,6 +84,11 @@ void NamespaceTest::SetUp() {
 }
 
 CoveredDirectory::CoveredDirectory(const std::filesystem::path& theDirectory) : directory(theDirectory) {
+    // A chroot may have no /sys: then all of it is covered, with the directory that was asked for.
+    if (!exists(directory)) {
+        below.emplace_back(directory.parent_path());
+        create_directory(directory);
+    }
     checked(mount("tmpfs", directory.c_str(), "tmpfs", MS_NOSUID | MS_NODEV, "mode=755"),
             "covering " + directory.string());
 }

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <list>
 #include <string>
 
 namespace test {
@@ -25,6 +26,7 @@ public:
     CoveredDirectory& operator=(const CoveredDirectory&) = delete;
 
 private:
+    std::list<CoveredDirectory> below; ///< what was covered before, where the directory was missing
     const std::filesystem::path directory;
 };
 

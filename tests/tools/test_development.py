@@ -12,6 +12,7 @@ SOURCE = Path(__file__).resolve().parents[2]
 LIBRARIES = ["nvlog", "vkcommon", "vkproduct", "vkinstrumentation", "vkproviderutilities"]
 PREFIX = directory() / "installed"
 install(PREFIX)
+os.environ["CMAKE_GENERATOR"] = "Ninja"  # as for our own tree; there need be no make
 EXAMPLE = PREFIX / "share/vk-baseserver/examples/rack-server.json"
 EXPECTED = "architecture x86_64\nkeys 1\nclass 22\ncomputer Example RX200 rack server\nCMPI 200\n"
 

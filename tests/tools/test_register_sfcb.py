@@ -107,6 +107,14 @@ class Sfcb(Register):
         manager.calls()
         self.assertEqual(snapshot_of(self.root), before)
 
+    def test_output_that_cannot_be_written_at_the_end_is_a_failure(self):
+        fakes.sfcb(self.root, up=True)
+        with open("/dev/full", "wb") as full:
+            done = subprocess.run([PREFIX / "sbin/vk-provider-register", "--root", self.root, "--dry-run", "remove"],
+                                  stdout=full, stderr=subprocess.PIPE, check=False)
+        self.assertEqual(done.returncode, 1, done.stderr)
+        self.assertIn(b"No space left on device", done.stderr)
+
     def test_a_failed_install_leaves_nothing_staged_and_the_repository_as_it_was(self):
         for harm in ("schema", "sfcbmofpp"):
             with self.subTest(harm):
