@@ -6,16 +6,11 @@
 #include "objectmanager/broker/ObjectPath.h"
 #include "objectmanager/broker/String.h"
 #include "objectmanager/model/Names.h"
+#include "objectmanager/model/TypeNames.h"
 
 namespace om {
 
 namespace {
-
-constexpr CMPIType arrayBit = CMPI_ARRAY;
-
-CMPIType elementType(CMPIType type) {
-    return static_cast<CMPIType>(type & ~arrayBit);
-}
 
 /// Reads the type's own bytes: callers pass the address of a plain scalar, too.
 template <class T>
@@ -136,7 +131,7 @@ void giveScalar(CMPIValue& out, const Value& value) {
 }
 
 void giveObject(CMPIValue& out, CMPIType type, Managed& part) {
-    if ((type & CMPI_ARRAY) != 0) {
+    if (isArray(type)) {
         out.array = &static_cast<ArrayObject&>(part);
     } else if (type == CMPI_string) {
         out.string = &static_cast<StringObject&>(part);
@@ -191,7 +186,7 @@ Value read(const CMPIValue* value, CMPIType type) {
     if (type == CMPI_null) return {};
     if (!isValueType(type)) throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     if (value == nullptr) return {storedType(type), {}};
-    if ((type & CMPI_ARRAY) != 0) return readArray(value, type);
+    if (isArray(type)) return readArray(value, type);
     if (type == CMPI_chars) return readText(static_cast<const char*>(static_cast<const void*>(value)));
     if (type == CMPI_charsptr) return readText(take<const char*>(value));
     return isObjectType(type) ? readObject(value, type) : readScalar(value, type);
@@ -212,7 +207,7 @@ CMPIData give(const Managed& parent, const Value& value, CMPIValueState state) {
 }
 
 std::unique_ptr<Managed> wrap(Broker& broker, Value value) {
-    if ((value.type & CMPI_ARRAY) != 0) {
+    if (isArray(value.type)) {
         return std::make_unique<ArrayObject>(broker, elementType(value.type),
                                              std::move(std::get<std::vector<Value>>(value.data)));
     }

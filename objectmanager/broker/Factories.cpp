@@ -10,6 +10,7 @@
 #include "objectmanager/broker/ObjectPath.h"
 #include "objectmanager/broker/String.h"
 #include "objectmanager/model/DateTime.h"
+#include "objectmanager/model/TypeNames.h"
 
 namespace om {
 
@@ -42,10 +43,10 @@ CMPIString* newStringSlot(const CMPIBroker* handle, const char* chars, CMPIStatu
 
 CMPIArray* newArray(const CMPIBroker* handle, CMPICount size, CMPIType type, CMPIStatus*) {
     Broker& broker = open(handle);
-    const auto elementType = static_cast<CMPIType>(type & ~static_cast<CMPIType>(CMPI_ARRAY));
-    if (!isValueType(elementType)) throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
+    const CMPIType element = elementType(type);
+    if (!isValueType(element)) throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     if (size > ArrayObject::mostElements) throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
-    return &make<ArrayObject>(broker, size, elementType);
+    return &make<ArrayObject>(broker, size, element);
 }
 
 CMPIDateTime* newDateTime(const CMPIBroker* handle, CMPIStatus*) {

@@ -4,6 +4,7 @@
 #include "objectmanager/broker/Describe.h"
 #include "objectmanager/broker/String.h"
 #include "objectmanager/model/Names.h"
+#include "objectmanager/model/TypeNames.h"
 
 namespace om {
 
@@ -26,7 +27,7 @@ CMPIString* get(const CMPIObjectPath* handle, CMPIStatus*) {
 CMPIStatus addKey(const CMPIObjectPath* handle, const char* name, const CMPIValue* value, CMPIType type) {
     auto& self = open<PathObject>(handle);
     const char* key = text(name);
-    if (type == CMPI_null || (type & CMPI_ARRAY) != 0 || type == CMPI_instance) {
+    if (type == CMPI_null || isArray(type) || type == CMPI_instance) {
         throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     }
     Value given = read(value, type);

@@ -1,6 +1,7 @@
 #include "objectmanager/cimxml/Typing.h"
 
 #include "objectmanager/cimxml/Errors.h"
+#include "objectmanager/model/Characters.h"
 #include "objectmanager/model/DateTime.h"
 #include "objectmanager/model/NumberText.h"
 #include "objectmanager/model/TypeNames.h"
@@ -22,13 +23,6 @@ using om::isArray;
 
 [[noreturn]] void unusable(const std::string& what) {
     throw CimError(CMPI_RC_ERR_INVALID_PARAMETER, what);
-}
-
-std::string_view trimmed(std::string_view text) {
-    constexpr std::string_view blanks = " \t\r\n";
-    const std::size_t first = text.find_first_not_of(blanks);
-    if (first == std::string_view::npos) return {};
-    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
 }
 
 om::Value booleanOf(std::string_view text) {
@@ -93,14 +87,14 @@ om::Value scalarOf(const std::string& text, CMPIType type, const Reading& readin
     case CMPI_char16:
         return characterOf(text);
     case CMPI_boolean:
-        return booleanOf(trimmed(text));
+        return booleanOf(om::trimmed(text));
     case CMPI_dateTime:
-        if (!om::isDateTime(trimmed(text))) mismatch(text, type);
-        return {type, std::string(trimmed(text))};
+        if (!om::isDateTime(om::trimmed(text))) mismatch(text, type);
+        return {type, std::string(om::trimmed(text))};
     case CMPI_ref:
         mismatch(text, type);
     default:
-        return numberOf(trimmed(text), type);
+        return numberOf(om::trimmed(text), type);
     }
 }
 
@@ -117,8 +111,8 @@ CMPIType statedType(const KeyElement& key) {
     if (key.valueType == "boolean") return CMPI_boolean;
     if (key.valueType != "numeric") return CMPI_string;
     om::Value probe;
-    return om::readNumber(trimmed(key.value.text), CMPI_sint64, probe) == om::NumberError::None ? CMPI_sint64
-                                                                                                : CMPI_uint64;
+    return om::readNumber(om::trimmed(key.value.text), CMPI_sint64, probe) == om::NumberError::None ? CMPI_sint64
+                                                                                                    : CMPI_uint64;
 }
 
 om::NamedValue typedKey(const KeyElement& element, const om::ResolvedClass* known, const Reading& reading) {

@@ -2,6 +2,7 @@
 
 #include "objectmanager/endpoint/Qualifiers.h"
 #include "objectmanager/endpoint/Selection.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <algorithm>
 
@@ -74,7 +75,7 @@ private:
     void property(const Line<om::PropertyDeclaration>& each) {
         const om::PropertyDeclaration& nearest = *each.front();
         if (!wants(nearest.name)) return;
-        const bool array = (nearest.type & CMPI_ARRAY) != 0;
+        const bool array = om::isArray(nearest.type);
         const bool reference = nearest.type == CMPI_ref;
         const char* const element = reference ? "PROPERTY.REFERENCE" : array ? "PROPERTY.ARRAY" : "PROPERTY";
         std::vector<std::pair<std::string_view, std::string_view>> attributes = {{"NAME", nearest.name}};
@@ -109,8 +110,8 @@ private:
     }
 
     void parameter(const om::ParameterDeclaration& parameter) {
-        const bool array = (parameter.type & CMPI_ARRAY) != 0;
-        const bool reference = (parameter.type & ~CMPI_ARRAY) == CMPI_ref;
+        const bool array = om::isArray(parameter.type);
+        const bool reference = om::elementType(parameter.type) == CMPI_ref;
         const char* const element = reference ? (array ? "PARAMETER.REFARRAY" : "PARAMETER.REFERENCE")
                                               : (array ? "PARAMETER.ARRAY" : "PARAMETER");
         if (reference) {

@@ -15,9 +15,7 @@ using cimxml::Refusal;
 constexpr std::string_view mapping = "http://www.dmtf.org/cim/mapping/http/v1.0";
 
 std::string_view trimmed(std::string_view text) {
-    const std::size_t first = text.find_first_not_of(" \t");
-    if (first == std::string_view::npos) return {};
-    return text.substr(first, text.find_last_not_of(" \t") - first + 1);
+    return om::trimmed(text, " \t"); // the blanks of HTTP's headers
 }
 
 /// The two digits that an M-POST puts before its headers: `Man: "URI" ; ns=NN`.

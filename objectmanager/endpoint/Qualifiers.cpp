@@ -1,6 +1,7 @@
 #include "objectmanager/endpoint/Qualifiers.h"
 
 #include "objectmanager/cimxml/Typing.h"
+#include "objectmanager/model/TypeNames.h"
 
 #include <set>
 
@@ -9,10 +10,6 @@ namespace {
 
 constexpr std::string_view flag(bool value) {
     return value ? "true" : "false";
-}
-
-bool isArray(CMPIType type) {
-    return (type & CMPI_ARRAY) != 0;
 }
 
 bool has(const om::QualifierType& type, char scope) {
@@ -45,7 +42,7 @@ void writeQualifier(cimxml::Writer& writer, const om::NamedValue& qualifier, boo
 void writeQualifierType(cimxml::Writer& writer, const om::QualifierType& type) {
     writer.open("QUALIFIER.DECLARATION", {{"NAME", type.name},
                                           {"TYPE", cimxml::typeName(type.type)},
-                                          {"ISARRAY", flag(isArray(type.type))},
+                                          {"ISARRAY", flag(om::isArray(type.type))},
                                           {"OVERRIDABLE", flag(type.overridable)},
                                           {"TOSUBCLASS", flag(type.inherited)},
                                           {"TRANSLATABLE", flag(type.translatable)}});

@@ -67,7 +67,7 @@ bool isSigned(CMPIType type) {
 }
 
 template <typename Stored>
-NumberError readInteger(std::string_view text, Limits<Stored> limits, om::Value& value) {
+NumberError readInteger(std::string_view text, Limits<Stored> limits, Value& value) {
     Stored number{};
     const std::from_chars_result read = std::from_chars(text.data(), text.data() + text.size(), number);
     if (read.ec != std::errc() || number < limits.lowest || number > limits.highest) return NumberError::OutOfRange;
@@ -76,7 +76,7 @@ NumberError readInteger(std::string_view text, Limits<Stored> limits, om::Value&
 }
 
 template <typename Real>
-NumberError readReal(std::string_view text, om::Value& value) {
+NumberError readReal(std::string_view text, Value& value) {
     Real number{};
     if (text == "NaN") {
         number = std::numeric_limits<Real>::quiet_NaN();
@@ -99,14 +99,14 @@ std::size_t countDigits(std::string_view text) {
 
 } // namespace
 
-std::string numberText(const om::Value& value) {
+std::string numberText(const Value& value) {
     if (const auto* number = std::get_if<std::uint64_t>(&value.data)) return std::to_string(*number);
     if (const auto* number = std::get_if<std::int64_t>(&value.data)) return std::to_string(*number);
     if (const auto* number = std::get_if<double>(&value.data)) return realText(*number, value.type);
     return {};
 }
 
-NumberError readNumber(std::string_view text, CMPIType type, om::Value& value) {
+NumberError readNumber(std::string_view text, CMPIType type, Value& value) {
     value.type = type;
     if (type == CMPI_real32) return readReal<float>(text, value);
     if (type == CMPI_real64) return readReal<double>(text, value);
@@ -143,7 +143,7 @@ bool looksLikeReal(std::string_view text) {
     }
     if (whole + fraction == 0) return false;
     if (text.empty()) return point;
-    if (om::lower(text.front()) != 'e') return false;
+    if (lower(text.front()) != 'e') return false;
     text.remove_prefix(1);
     if (!text.empty() && (text.front() == '+' || text.front() == '-')) text.remove_prefix(1);
     return !text.empty() && countDigits(text) == text.size();

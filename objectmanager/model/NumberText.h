@@ -11,12 +11,12 @@ namespace om {
 
 /// The decimal text of an integer value or char16 with all its digits, or of a real: the shortest that reads back the
 /// same in its width, `NaN`, `Infinity` or `-Infinity`. Empty for values that are no numbers.
-std::string numberText(const om::Value& value);
+std::string numberText(const Value& value);
 
 enum class NumberError { None, NotANumber, OutOfRange };
 
 /// Reads `text` as a value of an integer type, char16 or a real type.
-NumberError readNumber(std::string_view text, CMPIType type, om::Value& value);
+NumberError readNumber(std::string_view text, CMPIType type, Value& value);
 
 /// The values that a type can hold, for messages: `0 to 255`.
 std::string rangeOf(CMPIType type);

@@ -1,5 +1,6 @@
 #include "schema/compiler/Facts.h"
 
+#include "objectmanager/model/Characters.h"
 #include "objectmanager/mof/MofError.h"
 
 #include <fmt/format.h>
@@ -27,10 +28,8 @@ const Form methodForm{"a method", std::regex(R"((\w+)\s+(\w+)\((.*)\))")};
 const Form propertyForm{"a property", std::regex(R"((key\s+)?(\w+)(\s+ref)?\s+(\w+)(\[\])?(?:\s*=\s*(\d+))?)")};
 const Form parameterForm{"a parameter", std::regex(R"((in\s+)?(out\s+)?(\w+)(\s+ref)?\s+(\w+)(\[\])?)")};
 
-std::string trimmed(const std::string& text) {
-    constexpr const char* blanks = " \t\r";
-    const std::size_t begin = text.find_first_not_of(blanks);
-    return begin == std::string::npos ? std::string() : text.substr(begin, text.find_last_not_of(blanks) + 1 - begin);
+std::string trimmed(std::string_view text) {
+    return std::string(om::trimmed(text));
 }
 
 Strings split(const std::string& text, char separator) {

@@ -1,3 +1,4 @@
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/mof/ClassCheck.h"
 #include "schema/compiler/Outputs.h"
 
@@ -100,7 +101,7 @@ std::string filled(std::string frame, const Classes& ours) {
         for (const om::MethodDeclaration& method : declared->methods) methods.add(declared->name + '=' + method.name);
         for (const om::PropertyDeclaration& property : declared->properties) {
             properties.add(declared->name + '=' + property.name);
-            if ((property.type & ~CMPI_ARRAY) == CMPI_ref) roles.add(property.name);
+            if (om::elementType(property.type) == CMPI_ref) roles.add(property.name);
         }
     }
     const std::map<std::string, std::string> texts = {

@@ -1,6 +1,6 @@
 #include "objectmanager/mof/Lexer.h"
 
-#include "objectmanager/mof/MofError.h"
+#include "objectmanager/mof/Complaint.h"
 
 #include <gmock/gmock.h>
 
@@ -18,12 +18,7 @@ std::vector<std::string> texts(const std::string& text) {
 }
 
 std::string complaint(const std::string& text) {
-    try {
-        readTokens(text, "f");
-    } catch (const MofError& error) {
-        return error.what();
-    }
-    return {};
+    return complaintOf([&] { readTokens(text, "f"); });
 }
 
 TEST(Lexer, ReadsEveryKindOfToken) {

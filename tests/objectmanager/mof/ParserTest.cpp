@@ -1,6 +1,6 @@
 #include "objectmanager/mof/Parser.h"
 
-#include "objectmanager/mof/MofError.h"
+#include "objectmanager/mof/Complaint.h"
 
 #include <gmock/gmock.h>
 
@@ -10,12 +10,7 @@ namespace {
 using testing::ElementsAre;
 
 std::string complaint(const std::string& text) {
-    try {
-        parse(text, "f");
-    } catch (const MofError& error) {
-        return error.what();
-    }
-    return {};
+    return complaintOf([&] { parse(text, "f"); });
 }
 
 TEST(Parser, ReadsClassesWithTheirPlaces) {
