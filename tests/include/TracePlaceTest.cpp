@@ -243,6 +243,9 @@ TEST(ParameterTraceScope, KeepsItsLineWhileOthersOfThePlaceAreOpen) {
 }
 
 TEST(Fork, LeavesTheChildItsLinesWhateverOtherThreadsHadInHand) {
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+    GTEST_SKIP() << "a sanitizer's own memory stays locked in a child that is forked while another thread takes some";
+#endif
     std::atomic<bool> stop{false};
     std::vector<std::thread> busy;
     quiet = true;
