@@ -70,7 +70,7 @@ foreach(program IN ITEMS vk-provider-check vk-host-snapshot) # bash-completion l
     install(FILES tools/vk-tools.bash-completion DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-completion/completions
         RENAME ${program} COMPONENT tools)
 endforeach()
-install(FILES ${VK_SCHEMA_DIR}/vkcim.schema.json docs/json/vk-provider-check.schema.json
+install(FILES ${VK_SCHEMA_DIR}/vkcim.schema.json docs/json/vkcim-facts.schema.json docs/json/vk-provider-check.schema.json
     DESTINATION ${CMAKE_INSTALL_DATADIR}/doc/vk-baseserver-tools COMPONENT tools)
 install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/examples COMPONENT tools)
 

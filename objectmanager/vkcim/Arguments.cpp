@@ -19,7 +19,11 @@ constexpr std::size_t mostThreads = 1024;
 constexpr std::size_t mostRuns = 1000000000;
 constexpr std::size_t mostTimes = 100000000; // each is kept until the end: 8 bytes
 
-const std::map<std::string, Format> formats = {{"text", Format::Text}, {"mof", Format::Mof}, {"json", Format::Json}};
+const std::map<std::string, Format> formats = {{"text", Format::Text},
+                                               {"mof", Format::Mof},
+                                               {"json", Format::Json},
+                                               {"facts", Format::Facts},
+                                               {"openmetrics", Format::OpenMetrics}};
 
 /// The positional that is shown as NAME=VALUE: CLI11 from 2.4 on refuses a name with '=' in it.
 const std::string assignment = "ASSIGNMENT";
@@ -125,7 +129,7 @@ private:
             ->type_name("NAME")
             ->check(notEmpty);
         app.add_option("--namespace", arguments.nameSpace, "Namespace")->capture_default_str()->type_name("NS");
-        app.add_option("--format", formatName, "Output format: text, mof or json")
+        app.add_option("--format", formatName, "Output format: text, mof or json; for report also facts or openmetrics")
             ->capture_default_str()
             ->type_name("FORMAT")
             ->check(CLI::IsMember(&formats).description(""));
@@ -150,6 +154,8 @@ private:
         timing = app.add_flag("--timing", arguments.timing, "Print how long the runs took, as JSON on standard error");
         verbose =
             app.add_flag("--verbose", arguments.verbose, "For report: show what commands print on standard error");
+        withSerials = app.add_flag("--with-serials", arguments.withSerials,
+                                   "For report --format openmetrics: with serial numbers");
         dryRun = app.add_flag("--dry-run", arguments.dryRun,
                               "For modify and invoke: say what would be asked of which host, and do not ask");
         addFaults();
@@ -262,10 +268,13 @@ private:
         refuse(operates, {repeat, threads, fault});
         refuse(answers, {timing});
         refuse(command.action == Action::Report, {verbose});
+        refuse(command.action == Action::Report && arguments.format == Format::OpenMetrics, {withSerials});
         refuse(command.operation == om::Operation::ModifyInstance || command.operation == om::Operation::InvokeMethod,
                {dryRun});
         if (arguments.format != Format::Text && (!answers || arguments.dryRun))
             throw CLI::ValidationError(arguments.dryRun ? "--dry-run" : command.name, "its output is text alone");
+        if (isForEngines(arguments.format) && command.action != Action::Report)
+            throw CLI::ValidationError(command.name, "--format " + formatName + " is a format of report");
     }
 
     om::Fault readFault() const {
@@ -287,6 +296,7 @@ private:
     CLI::Option* url = nullptr;
     CLI::Option* timing = nullptr;
     CLI::Option* verbose = nullptr;
+    CLI::Option* withSerials = nullptr;
     CLI::Option* dryRun = nullptr;
 };
 

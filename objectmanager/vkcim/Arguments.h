@@ -10,7 +10,12 @@
 
 namespace vkcim {
 
-enum class Format { Text, Mof, Json };
+enum class Format { Text, Mof, Json, Facts, OpenMetrics };
+
+/// Whether it is a format of the report alone, for programs that collect from many hosts.
+constexpr bool isForEngines(Format format) {
+    return format == Format::Facts || format == Format::OpenMetrics;
+}
 
 /// What the user asked for, its texts not yet read.
 struct Arguments {
@@ -29,6 +34,7 @@ struct Arguments {
     std::size_t threads = 1;
     bool timing = false;
     bool verbose = false;
+    bool withSerials = false;
     bool dryRun = false;
     std::optional<om::Fault> fault;
     RemoteOptions remote; ///< the server that is asked instead of a library

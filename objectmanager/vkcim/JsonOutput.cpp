@@ -10,11 +10,12 @@
 #include <cmath>
 
 namespace vkcim {
-namespace {
 
-std::string string(std::string_view text) {
+std::string jsonString(std::string_view text) {
     return nlohmann::json(cleanUtf8(text)).dump();
 }
+
+namespace {
 
 /// Writes the texts by hand rather than through a tree of JSON values: only so do integers above 2^53 and reals of 32
 /// bits keep exactly the digits they should.
@@ -25,8 +26,8 @@ public:
 
     std::string answer(const om::Answer& answer) const {
         const std::string status = object({member("code", std::to_string(static_cast<int>(answer.code))),
-                                           member("name", string(om::statusName(static_cast<int>(answer.code)))),
-                                           member("message", answer.message ? string(*answer.message) : "null")});
+                                           member("name", jsonString(om::statusName(static_cast<int>(answer.code)))),
+                                           member("message", answer.message ? jsonString(*answer.message) : "null")});
         return object({member("status", status), member("done", answer.done ? "true" : "false"),
                        member("results", list(answer.results, [this](const auto& each) { return result(each); })),
                        member("returnValue", answer.returnValue ? typed(*answer.returnValue) : "null"),
@@ -34,14 +35,34 @@ public:
     }
 
     std::string report(const Report& report) const {
-        return object({member("host", string(report.host)), member("version", string(report.version)),
-                       member("time", string(report.time)), member("classes", answers(report.classes)),
+        return object({member("host", jsonString(report.host)), member("version", jsonString(report.version)),
+                       member("time", jsonString(report.time)), member("classes", answers(report.classes)),
                        member("associations", answers(report.associations)),
-                       member("notes", list(report.notes, [](const std::string& note) { return string(note); }))});
+                       member("notes", list(report.notes, [](const std::string& note) { return jsonString(note); }))});
+    }
+
+    /// The value without its type.
+    std::string bare(const om::Value& value) const {
+        if (value.isNull()) return "null";
+        if (const auto* flag = std::get_if<bool>(&value.data)) return *flag ? "true" : "false";
+        if (const auto* text = std::get_if<std::string>(&value.data)) return jsonString(*text);
+        if (const auto* path = std::get_if<std::shared_ptr<const om::ObjectPath>>(&value.data)) {
+            return *path ? jsonString(qualifiedPathText(**path, nameSpace, schema)) : "null";
+        }
+        if (const auto* embedded = std::get_if<std::shared_ptr<const om::Instance>>(&value.data)) {
+            return *embedded ? instance(**embedded) : "null";
+        }
+        if (const auto* elements = std::get_if<std::vector<om::Value>>(&value.data)) {
+            return list(*elements, [this](const om::Value& each) { return bare(each); });
+        }
+        const auto* real = std::get_if<double>(&value.data);
+        return real && !std::isfinite(*real) ? jsonString(om::numberText(value)) : om::numberText(value);
     }
 
 private:
-    static std::string member(std::string_view name, const std::string& value) { return string(name) + ':' + value; }
+    static std::string member(std::string_view name, const std::string& value) {
+        return jsonString(name) + ':' + value;
+    }
 
     template <typename List, typename Text>
     static std::string joined(char open, const List& items, char close, const Text& text) {
@@ -69,11 +90,11 @@ private:
     }
 
     std::string typed(const om::Value& value, const std::vector<std::string_view>& words = {}) const {
-        std::vector<std::string> members = {member("type", string(om::typeName(value.type))),
+        std::vector<std::string> members = {member("type", jsonString(om::typeName(value.type))),
                                             member("value", bare(value))};
         if (!words.empty())
             members.push_back(member("words", list(words, [](std::string_view word) {
-                                         return word.empty() ? std::string("null") : string(word);
+                                         return word.empty() ? std::string("null") : jsonString(word);
                                      })));
         return object(members);
     }
@@ -92,27 +113,9 @@ private:
     std::string instance(const om::Instance& instance) const { return element(instance.path, properties(instance)); }
 
     std::string element(const om::ObjectPath& path, const std::string& properties) const {
-        return object({member("path", string(pathText(path, nameSpace, schema))),
-                       member("namespace", string(path.nameSpace)), member("class", string(path.className)),
+        return object({member("path", jsonString(pathText(path, nameSpace, schema))),
+                       member("namespace", jsonString(path.nameSpace)), member("class", jsonString(path.className)),
                        member("keys", named(path.keys)), member("properties", properties)});
-    }
-
-    /// The value without its type.
-    std::string bare(const om::Value& value) const {
-        if (value.isNull()) return "null";
-        if (const auto* flag = std::get_if<bool>(&value.data)) return *flag ? "true" : "false";
-        if (const auto* text = std::get_if<std::string>(&value.data)) return string(*text);
-        if (const auto* path = std::get_if<std::shared_ptr<const om::ObjectPath>>(&value.data)) {
-            return *path ? string(qualifiedPathText(**path, nameSpace, schema)) : "null";
-        }
-        if (const auto* embedded = std::get_if<std::shared_ptr<const om::Instance>>(&value.data)) {
-            return *embedded ? instance(**embedded) : "null";
-        }
-        if (const auto* elements = std::get_if<std::vector<om::Value>>(&value.data)) {
-            return list(*elements, [this](const om::Value& each) { return bare(each); });
-        }
-        const auto* real = std::get_if<double>(&value.data);
-        return real && !std::isfinite(*real) ? string(om::numberText(value)) : om::numberText(value);
     }
 
     const std::string& nameSpace;
@@ -127,6 +130,10 @@ std::string jsonText(const om::Answer& answer, const std::string& nameSpace, con
 
 std::string jsonText(const Report& report, const std::string& nameSpace, const om::Schema& schema) {
     return JsonWriter(nameSpace, schema).report(report);
+}
+
+std::string jsonText(const om::Value& value, const std::string& nameSpace, const om::Schema& schema) {
+    return JsonWriter(nameSpace, schema).bare(value);
 }
 
 } // namespace vkcim

@@ -5,6 +5,7 @@
 #include "objectmanager/vkcim/Report.h"
 
 #include <string>
+#include <string_view>
 
 /// Answers as JSON: one object on one line, without the line's end.
 namespace vkcim {
@@ -12,5 +13,8 @@ namespace vkcim {
 /// `nameSpace` is the request's: references that lie in another one carry it.
 std::string jsonText(const om::Answer& answer, const std::string& nameSpace, const om::Schema& schema);
 std::string jsonText(const Report& report, const std::string& nameSpace, const om::Schema& schema);
+/// The bare value, without its type.
+std::string jsonText(const om::Value& value, const std::string& nameSpace, const om::Schema& schema);
+std::string jsonString(std::string_view text);
 
 } // namespace vkcim

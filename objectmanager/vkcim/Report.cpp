@@ -69,7 +69,11 @@ std::string referenceText(const om::Instance& instance, const char* name, const 
 
 } // namespace
 
-Report makeReport(const om::Schema& schema, const std::string& nameSpace,
+Subjects everythingServed(const om::Schema& schema) {
+    return {schema.servedClasses(), schema.servedAssociations()};
+}
+
+Report makeReport(const Subjects& subjects, const std::string& nameSpace,
                   const std::optional<std::vector<std::string>>& properties,
                   const std::function<om::Answer(const om::Request&)>& run,
                   const std::function<std::vector<std::string>()>& notes) {
@@ -86,9 +90,9 @@ Report makeReport(const om::Schema& schema, const std::string& nameSpace,
         return answers;
     };
     Report report;
-    report.classes = ask(schema.servedClasses());
+    report.classes = ask(subjects.classes);
     report.host = hostName(report.classes);
-    report.associations = ask(schema.servedAssociations());
+    report.associations = ask(subjects.associations);
     report.notes = notes();
     report.version = VKCIM_VERSION;
     report.time = timeNow();

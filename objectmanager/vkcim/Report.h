@@ -21,9 +21,17 @@ struct Report {
     std::string time;    ///< of the end, in UTC: `2026-11-21T06:00:00Z`
 };
 
-/// Asks every class and then every association that the schema says is served for its instances. `run` runs one
-/// request; `notes` is asked last.
-Report makeReport(const om::Schema& schema, const std::string& nameSpace,
+/// The classes and associations of a report, in its order.
+struct Subjects {
+    std::vector<std::string> classes;
+    std::vector<std::string> associations;
+};
+
+/// Every class and every association that the schema says is served.
+Subjects everythingServed(const om::Schema& schema);
+
+/// Asks every class and then every association for its instances. `run` runs one request; `notes` is asked last.
+Report makeReport(const Subjects& subjects, const std::string& nameSpace,
                   const std::optional<std::vector<std::string>>& properties,
                   const std::function<om::Answer(const om::Request&)>& run,
                   const std::function<std::vector<std::string>()>& notes);

@@ -4,8 +4,10 @@
 #include "objectmanager/vkcim/Advice.h"
 #include "objectmanager/vkcim/DefaultLibrary.h"
 #include "objectmanager/vkcim/Effect.h"
+#include "objectmanager/vkcim/FactsOutput.h"
 #include "objectmanager/vkcim/HostNotes.h"
 #include "objectmanager/vkcim/JsonOutput.h"
+#include "objectmanager/vkcim/MetricsOutput.h"
 #include "objectmanager/vkcim/MofOutput.h"
 #include "objectmanager/vkcim/PathText.h"
 #include "objectmanager/vkcim/QuietErrors.h"
@@ -41,7 +43,7 @@ public:
     int run() {
         switch (arguments.command->action) {
         case Action::Report:
-            return report();
+            return isForEngines(arguments.format) ? facts() : report();
         case Action::Classes:
             return show(classesText(schema));
         case Action::Describe:
@@ -63,7 +65,12 @@ private:
         Timing timing;
         std::string problem;
         const auto started = std::chrono::steady_clock::now();
-        const Report report = askEverything(timing, problem);
+        const Report report = askReport<Report>(timing, [&](const Run& run, const Notes& notes) {
+            return makeReport(everythingServed(schema), arguments.nameSpace, arguments.properties, run, [&] {
+                problem = hostProblemHere();
+                return notes();
+            });
+        });
         timing.wall = std::chrono::steady_clock::now() - started;
         print(arguments.format == Format::Json  ? jsonText(report, arguments.nameSpace, schema) + '\n'
               : arguments.format == Format::Mof ? mofText(report, arguments.nameSpace, schema)
@@ -71,6 +78,20 @@ private:
         if (!problem.empty()) complain(cannotRead(problem));
         printTiming(timing);
         return written(problem.empty() ? 0 : nothingDone);
+    }
+
+    /// For programs that collect from many hosts: one that cannot be read says so in what they collect.
+    int facts() {
+        Timing timing;
+        const auto started = std::chrono::steady_clock::now();
+        const Facts facts = askReport<Facts>(timing, [&](const Run& run, const Notes& notes) {
+            return gatherFacts(schema, arguments.nameSpace, arguments.properties, run, notes);
+        });
+        timing.wall = std::chrono::steady_clock::now() - started;
+        print(arguments.format == Format::Facts ? factsText(facts, arguments.nameSpace, schema) + '\n'
+                                                : metricsText(facts, schema, arguments.withSerials));
+        printTiming(timing);
+        return written(0);
     }
 
     int describe() {
@@ -152,17 +173,16 @@ private:
         return outcome;
     }
 
-    Report askEverything(Timing& timing, std::string& problem) const {
+    using Run = std::function<om::Answer(const om::Request&)>;
+    using Notes = std::function<std::vector<std::string>()>;
+
+    template <typename Result, typename Make>
+    Result askReport(Timing& timing, const Make& make) const {
         Answering manager(*this, arguments.nameSpace);
         std::optional<QuietErrors> quiet;
         if (!arguments.verbose) quiet.emplace();
-        return makeReport(
-            schema, arguments.nameSpace, arguments.properties,
-            [&](const om::Request& request) { return manager.run(request, &timing.runs.emplace_back()); },
-            [&] {
-                problem = hostProblemHere();
-                return isRemote() ? std::vector<std::string>() : hostNotes(arguments.provider);
-            });
+        return make([&](const om::Request& request) { return manager.run(request, &timing.runs.emplace_back()); },
+                    [&] { return isRemote() ? std::vector<std::string>() : hostNotes(arguments.provider); });
     }
 
     /// What an operation that was answered with OK did not find or did not do, a line each.

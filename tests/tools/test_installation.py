@@ -38,6 +38,7 @@ class Contents(unittest.TestCase):
                      "share/vk-baseserver/vk-baseserver.reg",
                      "share/vk-baseserver/examples/rack-server.json",
                      "share/doc/vk-baseserver-tools/vkcim.schema.json",
+                     "share/doc/vk-baseserver-tools/vkcim-facts.schema.json",
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
         expected += ["lib/vk/ntp/daemons.sh", "lib/vk/ntp/ntp", "lib/vk/ntp/ntpd", "sbin/vk-ntp-setup",
                      "share/man/man8/vk-ntp-setup.8"]

@@ -88,6 +88,7 @@ class Completion(unittest.TestCase):
 
     def test_completes_behind_an_equals_sign(self):
         self.assertEqual(self.complete("--format=j"), ["--format=json"])
+        self.assertEqual(self.complete("--with-serials --format=op"), ["--with-serials", "--format=openmetrics"])
         self.assertEqual(self.complete("--format=json rep"), ["--format=json", "report"])
         self.assertEqual(self.complete("--provider="), ["--provider=BaseServerProvider"])
 

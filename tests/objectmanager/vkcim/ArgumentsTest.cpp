@@ -98,7 +98,12 @@ TEST(Arguments, OptionsThatACommandWouldIgnoreAreRefused) {
     EXPECT_TRUE(good({"report", "--verbose"}).verbose);
     EXPECT_TRUE(good({"modify", "A", "x=1", "--dry-run"}).dryRun);
     EXPECT_TRUE(good({"--dry-run", "invoke", "A", "m"}).dryRun);
+    EXPECT_TRUE(good({"report", "--format", "openmetrics", "--with-serials"}).withSerials);
     const std::pair<Words, const char*> refused[] = {
+        {{"report", "--with-serials"}, "report: --with-serials does not go with it"},
+        {{"report", "--format", "facts", "--with-serials"}, "report: --with-serials does not go with it"},
+        {{"instances", "A", "--format", "facts"}, "instances: --format facts is a format of report"},
+        {{"names", "A", "--format", "openmetrics"}, "names: --format openmetrics is a format of report"},
         {{"names", "A", "--verbose"}, "names: --verbose does not go with it"},
         {{"create", "A", "x=1", "--dry-run"}, "create: --dry-run does not go with it"},
         {{"delete", "A", "--dry-run"}, "delete: --dry-run does not go with it"},

@@ -41,7 +41,7 @@ Report::Answers servedAssociations() {
 TEST(Report, AsksEveryClassAndThenEveryAssociationOfTheSchema) {
     std::vector<std::string> asked;
     const Report report = makeReport(
-        testSchema(), nameSpace, std::vector<std::string>{"Name"},
+        everythingServed(testSchema()), nameSpace, std::vector<std::string>{"Name"},
         [&](const om::Request& request) {
             asked.push_back(request.path.className);
             EXPECT_EQ(request.operation, om::Operation::EnumInstances);
@@ -60,7 +60,7 @@ std::string hostOf(const om::Answer& computers) {
     const auto run = [&](const om::Request& request) {
         return request.path.className == "VESKA_ComputerSystem" ? computers : om::Answer();
     };
-    return makeReport(om::Schema::builtin(), nameSpace, {}, run, [] { return std::vector<std::string>(); }).host;
+    return makeReport(everythingServed(om::Schema::builtin()), nameSpace, {}, run, [] { return std::vector<std::string>(); }).host;
 }
 
 TEST(Report, IsHeadedByTheNameOfTheHostThatIsDescribed) {

@@ -1,0 +1,133 @@
+#include "objectmanager/vkcim/Facts.h"
+
+#include <charconv>
+#include <string_view>
+
+namespace vkcim {
+namespace {
+
+constexpr const char* computerClass = "VESKA_ComputerSystem";
+constexpr const char* chassisClass = "VESKA_PhysicalPackage";
+constexpr const char* timeServiceClass = "VESKA_TimeService";
+
+using Elements = std::vector<om::Value>;
+
+bool isKnownText(const om::Value& value) {
+    const auto* text = std::get_if<std::string>(&value.data);
+    return text == nullptr || (!text->empty() && *text != unknownWord);
+}
+
+/// What is known of a value, perhaps null.
+om::Value knownPart(const om::NamedValue& property, const std::string& className, const om::Schema& schema) {
+    const std::vector<std::string_view> words = schema.wordsFor(className, property);
+    const auto* elements = std::get_if<Elements>(&property.second.data);
+    if (elements == nullptr) {
+        const bool known = isKnownText(property.second) && (words.empty() || words.front() != unknownWord);
+        return known ? property.second : om::Value{property.second.type, {}};
+    }
+    Elements known;
+    for (std::size_t i = 0; i < elements->size(); ++i) {
+        const om::Value& each = (*elements)[i];
+        if (!each.isNull() && isKnownText(each) && (words.empty() || words[i] != unknownWord)) known.push_back(each);
+    }
+    om::Value part{property.second.type, {}};
+    if (!known.empty()) part.data = std::move(known);
+    return part;
+}
+
+/// The texts of the one say what those of the other at the same place are: with one of them both go.
+void dropUnknownIdentifiers(std::vector<om::NamedValue>& properties) {
+    const auto find = [&](const char* name) -> Elements* {
+        for (auto& [each, value] : properties)
+            if (om::sameName(each, name)) return std::get_if<Elements>(&value.data);
+        return nullptr;
+    };
+    Elements* identifiers = find("OtherIdentifyingInfo");
+    Elements* descriptions = find("IdentifyingDescriptions");
+    if (identifiers == nullptr || descriptions == nullptr || identifiers->size() != descriptions->size()) return;
+    for (std::size_t i = identifiers->size(); i-- > 0;) {
+        const om::Value& identifier = (*identifiers)[i];
+        if (!identifier.isNull() && isKnownText(identifier)) continue;
+        identifiers->erase(identifiers->begin() + static_cast<std::ptrdiff_t>(i));
+        descriptions->erase(descriptions->begin() + static_cast<std::ptrdiff_t>(i));
+    }
+}
+
+bool namesClass(const std::string& property) {
+    return om::sameName(property, "CreationClassName") || om::sameName(property, "SystemCreationClassName");
+}
+
+om::Instance whatIsKnown(om::Instance instance, const om::Schema& schema) {
+    dropUnknownIdentifiers(instance.properties);
+    std::vector<om::NamedValue> known;
+    for (const om::NamedValue& each : instance.properties) {
+        if (namesClass(each.first)) continue;
+        om::Value part = knownPart(each, instance.path.className, schema);
+        if (!part.isNull()) known.emplace_back(each.first, std::move(part));
+    }
+    instance.properties = std::move(known);
+    return instance;
+}
+
+std::vector<om::Instance> instancesOf(const std::string& className, const Report& report, const om::Schema& schema) {
+    std::vector<om::Instance> instances;
+    for (const auto& [name, answer] : report.classes) {
+        if (name != className) continue;
+        for (const auto& result : answer.results)
+            if (const auto* instance = std::get_if<om::Instance>(&result))
+                instances.push_back(whatIsKnown(*instance, schema));
+    }
+    return instances;
+}
+
+/// Asks for the time, which changes nothing.
+std::optional<std::string> timeOf(const om::ObjectPath& computer, const std::string& nameSpace,
+                                  const std::function<om::Answer(const om::Request&)>& run) {
+    om::Request request;
+    request.operation = om::Operation::InvokeMethod;
+    request.path.nameSpace = nameSpace;
+    request.path.className = timeServiceClass;
+    request.method = "ManageTime";
+    request.values = {{"GetRequest", {CMPI_boolean, true}},
+                      {"ManagedElement", {CMPI_ref, std::make_shared<const om::ObjectPath>(computer)}}};
+    const om::Answer answer = run(request);
+    const om::Value* time = om::findValue(answer.out, "TimeData");
+    const auto* text = time != nullptr ? std::get_if<std::string>(&time->data) : nullptr;
+    return answer.code == CMPI_RC_OK && text != nullptr ? std::optional(*text) : std::nullopt;
+}
+
+} // namespace
+
+Facts gatherFacts(const om::Schema& schema, const std::string& nameSpace,
+                  const std::optional<std::vector<std::string>>& properties,
+                  const std::function<om::Answer(const om::Request&)>& run,
+                  const std::function<std::vector<std::string>()>& notes) {
+    const Subjects subjects = {{computerClass, chassisClass, timeServiceClass}, {}};
+    const Report report = makeReport(subjects, nameSpace, properties, run, notes);
+    Facts facts;
+    facts.computers = instancesOf(computerClass, report, schema);
+    facts.chassis = instancesOf(chassisClass, report, schema);
+    facts.timeServices = instancesOf(timeServiceClass, report, schema);
+    if (!facts.computers.empty()) {
+        facts.host = report.host;
+        facts.timeData = timeOf(facts.computers.front().path, nameSpace, run);
+    }
+    facts.notes = report.notes;
+    facts.version = report.version;
+    facts.time = report.time;
+    return facts;
+}
+
+std::optional<int> offsetInMinutes(const Facts& facts) {
+    constexpr std::size_t length = 25; // yyyymmddhhmmss.mmmmmmsutc
+    constexpr std::size_t sign = 21;
+    if (!facts.timeData || facts.timeData->size() != length) return std::nullopt;
+    const std::string_view text = *facts.timeData;
+    int minutes = 0;
+    const auto [end, error] = std::from_chars(text.data() + sign + 1, text.data() + length, minutes);
+    if (error != std::errc() || end != text.data() + length) return std::nullopt;
+    if (text[sign] == '+') return minutes;
+    return text[sign] == '-' ? std::optional(-minutes) : std::nullopt;
+}
+
+} // namespace vkcim
