@@ -1,6 +1,5 @@
 #include "objectmanager/vkcim/Facts.h"
 
-#include <charconv>
 #include <string_view>
 
 namespace vkcim {
@@ -80,54 +79,26 @@ std::vector<om::Instance> instancesOf(const std::string& className, const Report
     return instances;
 }
 
-/// Asks for the time, which changes nothing.
-std::optional<std::string> timeOf(const om::ObjectPath& computer, const std::string& nameSpace,
-                                  const std::function<om::Answer(const om::Request&)>& run) {
-    om::Request request;
-    request.operation = om::Operation::InvokeMethod;
-    request.path.nameSpace = nameSpace;
-    request.path.className = timeServiceClass;
-    request.method = "ManageTime";
-    request.values = {{"GetRequest", {CMPI_boolean, true}},
-                      {"ManagedElement", {CMPI_ref, std::make_shared<const om::ObjectPath>(computer)}}};
-    const om::Answer answer = run(request);
-    const om::Value* time = om::findValue(answer.out, "TimeData");
-    const auto* text = time != nullptr ? std::get_if<std::string>(&time->data) : nullptr;
-    return answer.code == CMPI_RC_OK && text != nullptr ? std::optional(*text) : std::nullopt;
-}
-
 } // namespace
 
 Facts gatherFacts(const om::Schema& schema, const std::string& nameSpace,
                   const std::optional<std::vector<std::string>>& properties,
-                  const std::function<om::Answer(const om::Request&)>& run,
+                  const std::function<om::Answer(const om::Request&)>& run, const std::function<HostClock()>& clock,
                   const std::function<std::vector<std::string>()>& notes) {
     const Subjects subjects = {{computerClass, chassisClass, timeServiceClass}, {}};
-    const Report report = makeReport(subjects, nameSpace, properties, run, notes);
     Facts facts;
+    const Report report = makeReport(subjects, nameSpace, properties, run, [&] {
+        facts.clock = clock();
+        return notes();
+    });
     facts.computers = instancesOf(computerClass, report, schema);
     facts.chassis = instancesOf(chassisClass, report, schema);
     facts.timeServices = instancesOf(timeServiceClass, report, schema);
-    if (!facts.computers.empty()) {
-        facts.host = report.host;
-        facts.timeData = timeOf(facts.computers.front().path, nameSpace, run);
-    }
+    if (!facts.computers.empty()) facts.host = report.host;
     facts.notes = report.notes;
     facts.version = report.version;
     facts.time = report.time;
     return facts;
-}
-
-std::optional<int> offsetInMinutes(const Facts& facts) {
-    constexpr std::size_t length = 25; // yyyymmddhhmmss.mmmmmmsutc
-    constexpr std::size_t sign = 21;
-    if (!facts.timeData || facts.timeData->size() != length) return std::nullopt;
-    const std::string_view text = *facts.timeData;
-    int minutes = 0;
-    const auto [end, error] = std::from_chars(text.data() + sign + 1, text.data() + length, minutes);
-    if (error != std::errc() || end != text.data() + length) return std::nullopt;
-    if (text[sign] == '+') return minutes;
-    return text[sign] == '-' ? std::optional(-minutes) : std::nullopt;
 }
 
 } // namespace vkcim

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "objectmanager/vkcim/HostNotes.h"
 #include "objectmanager/vkcim/Report.h"
 
 #include <string_view>
@@ -17,19 +18,17 @@ struct Facts {
     std::vector<om::Instance> computers;
     std::vector<om::Instance> chassis;
     std::vector<om::Instance> timeServices;
-    std::optional<std::string> timeData; ///< the time service's time, a CIM date-time
+    HostClock clock;
     std::vector<std::string> notes;
     std::string version; ///< of this program
     std::string time;    ///< of the end, in UTC: `2026-11-21T06:00:00Z`
 };
 
-/// Asks for the instances, and the time service for its time. The rest is as for makeReport.
+/// Asks for the instances, and `clock` before the notes. The rest is as for makeReport. The clock is not the time
+/// service's method: its answer is in the zone that the object manager thinks in, which for most is UTC.
 Facts gatherFacts(const om::Schema& schema, const std::string& nameSpace,
                   const std::optional<std::vector<std::string>>& properties,
-                  const std::function<om::Answer(const om::Request&)>& run,
+                  const std::function<om::Answer(const om::Request&)>& run, const std::function<HostClock()>& clock,
                   const std::function<std::vector<std::string>()>& notes);
-
-/// How far the time service's local time is ahead of UTC.
-std::optional<int> offsetInMinutes(const Facts& facts);
 
 } // namespace vkcim

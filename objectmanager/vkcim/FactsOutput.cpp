@@ -82,9 +82,8 @@ std::string factsText(const Facts& facts, const std::string& nameSpace, const om
     members.addAll("computer", facts.computers);
     members.addAll("chassis", facts.chassis);
     members.addAll("time_service", facts.timeServices);
-    if (facts.timeData) members.addText("time_service_TimeData", *facts.timeData);
-    if (const std::optional<int> minutes = offsetInMinutes(facts))
-        members.add("time_service_offset_minutes", std::to_string(*minutes));
+    if (facts.clock.time) members.addText("time_service_time", *facts.clock.time);
+    if (facts.clock.aheadMinutes) members.add("time_service_offset_minutes", *facts.clock.aheadMinutes);
     members.addTexts("notes", facts.notes);
     return members.text();
 }

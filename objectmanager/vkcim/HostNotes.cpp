@@ -53,6 +53,14 @@ std::string hostProblem(const std::string& provider) {
     return first(asked(provider, common, "vkHostProblem"));
 }
 
+HostClock hostClock(const std::string& provider) {
+    const auto known = [&](const char* name) {
+        const std::string text = first(asked(provider, common, name));
+        return text.empty() ? std::nullopt : std::optional(text);
+    };
+    return {known("vkHostTime"), known("vkHostOffset")};
+}
+
 std::string hostDescribed(const std::string& provider) {
     const std::string other = first(asked(provider, common, "vkHostSource"));
     return other.empty() ? "this host, " + kernelsHostName() : other;

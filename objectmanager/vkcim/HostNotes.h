@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -13,6 +14,13 @@ std::vector<std::string> hostNotes(const std::string& provider);
 
 /// Why the host cannot be read at all; empty where it can.
 std::string hostProblem(const std::string& provider);
+
+/// What the host's clock says, as far as it is known.
+struct HostClock {
+    std::optional<std::string> time;         ///< local time, a CIM date-time
+    std::optional<std::string> aheadMinutes; ///< how far local time is ahead of UTC, a number in decimal
+};
+HostClock hostClock(const std::string& provider);
 
 /// Which host is described, in words; `this host, NAME` also where nothing is said.
 std::string hostDescribed(const std::string& provider);

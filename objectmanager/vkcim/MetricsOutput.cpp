@@ -100,10 +100,9 @@ std::string dstAdjustment(const Facts& facts) {
 
 std::string timeOffset(const Facts& facts) {
     const std::string name = "vk_time_offset_minutes";
-    const std::optional<int> minutes = offsetInMinutes(facts);
-    return minutes
-               ? family(name, "Minutes that local time is ahead of UTC.", sample(name, {}, std::to_string(*minutes)))
-               : std::string();
+    const std::optional<std::string>& minutes = facts.clock.aheadMinutes;
+    return minutes ? family(name, "Minutes that local time is ahead of UTC.", sample(name, {}, *minutes))
+                   : std::string();
 }
 
 std::string missingSources(const Facts& facts) {

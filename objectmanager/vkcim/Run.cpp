@@ -85,7 +85,8 @@ private:
         Timing timing;
         const auto started = std::chrono::steady_clock::now();
         const Facts facts = askReport<Facts>(timing, [&](const Run& run, const Notes& notes) {
-            return gatherFacts(schema, arguments.nameSpace, arguments.properties, run, notes);
+            const auto clock = [&] { return isRemote() ? HostClock() : hostClock(arguments.provider); };
+            return gatherFacts(schema, arguments.nameSpace, arguments.properties, run, clock, notes);
         });
         timing.wall = std::chrono::steady_clock::now() - started;
         print(arguments.format == Format::Facts ? factsText(facts, arguments.nameSpace, schema) + '\n'

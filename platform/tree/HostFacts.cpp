@@ -53,13 +53,23 @@ std::vector<std::string> missingFacts() {
     return Host::notesOn(Tree::realHost().reading()->facts);
 }
 
-std::string timeServiceNote() {
-    Host::TimeFacts facts;
+/// A property of the computer; nothing where it does not say.
+template <class Value>
+std::optional<Value> ofComputer(unsigned int property) {
     Tree::Cursor computer;
     computer.selectType(NodeLexicon::ComputerSystemNode);
-    computer.read(NodeLexicon::SystemTimeProperty, facts.time);
-    if (unsigned int automatic = 0; computer.read(NodeLexicon::AutomaticDSTAdjustmentProperty, automatic))
-        facts.automaticDst = automatic;
+    Value value{};
+    return computer.read(property, value) ? std::optional(value) : std::nullopt;
+}
+
+std::string hostTime() {
+    return ofComputer<std::string>(NodeLexicon::SystemTimeProperty).value_or("");
+}
+
+std::string timeServiceNote() {
+    Host::TimeFacts facts;
+    facts.time = hostTime();
+    facts.automaticDst = ofComputer<unsigned int>(NodeLexicon::AutomaticDSTAdjustmentProperty);
     if (Tree::simulatedHost() == nullptr)
         facts.zone = Zone::zoneNameOf(Root::host().readLink(Zone::localTimeFile).text);
     facts.ntpDaemonRuns = Host::isNtpDaemonRunning(Root("/")); // commands run on this machine, also for a snapshot
@@ -88,4 +98,13 @@ void vkHostSource(VkHostNote take, void* context) {
     if (source.kind == VK::HostSource::Live) return;
     const char* what = source.kind == VK::HostSource::Snapshot ? "the snapshot in " : "the simulated host in ";
     take(context, (what + source.location).c_str());
+}
+
+void vkHostTime(VkHostNote take, void* context) {
+    if (const std::string time = VK::hostTime(); !time.empty()) take(context, time.c_str());
+}
+
+void vkHostOffset(VkHostNote take, void* context) {
+    const std::optional<unsigned int> minutes = VK::ofComputer<unsigned int>(VK::NodeLexicon::GmtOffsetProperty);
+    if (minutes) take(context, std::to_string(static_cast<int>(*minutes)).c_str()); // two's complement
 }

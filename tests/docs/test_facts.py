@@ -118,7 +118,7 @@ class Facts(Temporary):
         report = json.loads(output)
         facts = facts_of(**environment)
         steady = {key: value for key, value in facts.items() if key not in (
-            "time", "notes", "time_service_TimeData", "time_service_offset_minutes")}
+            "time", "notes", "time_service_time", "time_service_offset_minutes")}
         self.assertEqual(steady, expected_of(report), environment)
         self.assertEqual(len(facts["notes"]), len(report["notes"]))
         return facts
@@ -154,9 +154,15 @@ class Facts(Temporary):
         self.assertIn("/nowhere: No such file or directory", facts["notes"])
         self.assertFalse([key for key in facts if key.startswith(("computer", "chassis", "host", "health"))])
 
-    def test_hold_the_time_and_its_offset(self):
-        facts = facts_of(VK_INSTRUMENTATION_TREE=str(EXAMPLE), TZ="<+0530>-5:30")
-        self.assertEqual(facts["time_service_offset_minutes"], int(facts["time_service_TimeData"][21:]))
+    def test_hold_the_hosts_own_time_and_offset(self):
+        (self.directory / "etc").mkdir()
+        shutil.copy("/usr/share/zoneinfo/Asia/Kolkata", self.directory / "etc/localtime")
+        facts = facts_of(VK_INSTRUMENTATION_ROOT=str(self.directory))
+        self.assertEqual((facts["time_service_time"][21:], facts["time_service_offset_minutes"]), ("+330", 330))
+
+    def test_without_a_time_have_no_offset(self):
+        facts = facts_of(VK_INSTRUMENTATION_ROOT="/nowhere")
+        self.assertFalse([key for key in facts if key.startswith("time_service") and not key.endswith("ame")])
 
 
 class Strictness(unittest.TestCase):
@@ -165,7 +171,7 @@ class Strictness(unittest.TestCase):
         for key in right:
             for wrong in (None, "", 1.5, {}, "Unknown"):
                 self.assertFalse(VALIDATOR.is_valid({**right, key: wrong}), (key, wrong))
-        for key in ("version", "time", "notes", "health", "computer_HealthState", "time_service_TimeData"):
+        for key in ("version", "time", "notes", "health", "computer_HealthState"):
             self.assertFalse(VALIDATOR.is_valid({k: v for k, v in right.items() if k != key}), key)
         for key in ("extra", "chassis1_Model", "computer_CreationClassName", "Model"):
             self.assertFalse(VALIDATOR.is_valid({**right, key: "x"}), key)

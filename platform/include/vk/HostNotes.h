@@ -17,4 +17,9 @@ void vkHostProblem(VkHostNote take, void* context);
 /// Hands over which host it is where it is not this one: `the snapshot in DIRECTORY`, `the simulated host in FILE`.
 void vkHostSource(VkHostNote take, void* context);
 
+/// Hands over the host's time, a CIM date-time, and how many minutes its local time is ahead of UTC, a number in
+/// decimal. Nothing at all where it does not say.
+void vkHostTime(VkHostNote take, void* context);
+void vkHostOffset(VkHostNote take, void* context);
+
 } // extern "C"

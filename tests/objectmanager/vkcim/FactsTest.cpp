@@ -31,24 +31,25 @@ om::Instance instance(const char* className, std::vector<om::NamedValue> propert
 }
 
 /// The facts of a host whose computer and chassis have these properties.
-Facts factsOf(const std::vector<om::NamedValue>& computer, const std::vector<std::vector<om::NamedValue>>& chassis = {},
-              const char* time = "20261121060000.123456+060") {
+Facts factsOf(const std::vector<om::NamedValue>& computer,
+              const std::vector<std::vector<om::NamedValue>>& chassis = {}) {
     const auto run = [&](const om::Request& request) {
         om::Answer answer;
         if (request.path.className == "VESKA_ComputerSystem")
             answer.results.emplace_back(instance("VESKA_ComputerSystem", computer));
         if (request.path.className == "VESKA_PhysicalPackage")
             for (const auto& each : chassis) answer.results.emplace_back(instance("VESKA_PhysicalPackage", each));
-        if (request.operation == om::Operation::InvokeMethod) {
-            EXPECT_THAT(request.values.at(0), Eq(om::NamedValue("GetRequest", {CMPI_boolean, true})))
-                << "anything else would set the clock";
-            answer.out = {{"TimeData", {CMPI_dateTime, std::string(time)}}};
-        }
+        EXPECT_EQ(request.operation, om::Operation::EnumInstances) << "facts change nothing";
         return answer;
     };
-    return gatherFacts(om::Schema::builtin(), nameSpace, {}, run, [] {
-        return std::vector<std::string>{"no UUID: the host has none", "time service: NTP daemon running"};
-    });
+    return gatherFacts(
+        om::Schema::builtin(), nameSpace, {}, run,
+        [] {
+            return HostClock{"20261121060000.123456-300", "-300"};
+        },
+        [] {
+            return std::vector<std::string>{"no UUID: the host has none", "time service: NTP daemon running"};
+        });
 }
 
 json jsonOf(const Facts& facts) {
@@ -96,14 +97,14 @@ TEST(Facts, NumberAllButTheFirst) {
     EXPECT_EQ(facts.at("chassis2_Model"), "RX300");
 }
 
-TEST(Facts, ReadTheOffsetFromTheTime) {
-    const std::pair<const char*, std::optional<int>> times[] = {{"20261121060000.123456+060", 60},
-                                                                {"20261121060000.123456-300", -300},
-                                                                {"20261121060000.123456+000", 0},
-                                                                {"00000001000000.000000:000", std::nullopt},
-                                                                {"20261121060000.123456+***", std::nullopt},
-                                                                {"", std::nullopt}};
-    for (const auto& [time, minutes] : times) EXPECT_EQ(offsetInMinutes(factsOf({}, {}, time)), minutes) << time;
+TEST(Facts, HoldTheClockWhereItIsKnown) {
+    Facts facts = factsOf({});
+    EXPECT_EQ(jsonOf(facts).at("time_service_time"), "20261121060000.123456-300");
+    EXPECT_EQ(jsonOf(facts).at("time_service_offset_minutes"), -300);
+    facts.clock = {};
+    EXPECT_FALSE(jsonOf(facts).contains("time_service_time"));
+    EXPECT_FALSE(jsonOf(facts).contains("time_service_offset_minutes"));
+    EXPECT_THAT(metricsText(facts, om::Schema::builtin(), false), Not(HasSubstr("vk_time_offset_minutes")));
 }
 
 std::string metrics(const Facts& facts, bool withSerials = false) {
@@ -131,7 +132,7 @@ vk_computer_operational_status{vk_computer_operational_status="In Service"} 0
 vk_chassis_info{chassis="1",manufacturer="Example",model="RX200",type="Rack"} 1
 # HELP vk_time_offset_minutes Minutes that local time is ahead of UTC.
 # TYPE vk_time_offset_minutes gauge
-vk_time_offset_minutes 60
+vk_time_offset_minutes -300
 # HELP vk_dst_adjustment Whether local time follows daylight saving.
 # TYPE vk_dst_adjustment gauge
 vk_dst_adjustment 1

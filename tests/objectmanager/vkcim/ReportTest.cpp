@@ -60,7 +60,9 @@ std::string hostOf(const om::Answer& computers) {
     const auto run = [&](const om::Request& request) {
         return request.path.className == "VESKA_ComputerSystem" ? computers : om::Answer();
     };
-    return makeReport(everythingServed(om::Schema::builtin()), nameSpace, {}, run, [] { return std::vector<std::string>(); }).host;
+    return makeReport(everythingServed(om::Schema::builtin()), nameSpace, {}, run,
+                      [] { return std::vector<std::string>(); })
+        .host;
 }
 
 TEST(Report, IsHeadedByTheNameOfTheHostThatIsDescribed) {

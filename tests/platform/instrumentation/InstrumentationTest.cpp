@@ -145,6 +145,20 @@ TEST_F(InstrumentationTest, SaysWhichHostItReadsAndWhyItCannot) {
     });
 }
 
+TEST_F(InstrumentationTest, HandsOverTheHostsTimeAndOffsetWhereItHasThem) {
+    directory.write("tree.json", R"({"nodes":[{"type":40,"path":"/c",
+        "properties":{"126":"20261121060000.000000-300","127":4294966996}}]})");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", directory.path("tree.json"), [] {
+        EXPECT_EQ(handed(vkHostTime), "20261121060000.000000-300\n");
+        EXPECT_EQ(handed(vkHostOffset), "-300\n");
+    });
+    directory.write("without.json", R"({"nodes":[{"type":40,"path":"/c","properties":{"126":""}}]})");
+    IN_PROCESS_WITH("VK_INSTRUMENTATION_TREE", directory.path("without.json"), [] {
+        EXPECT_EQ(handed(vkHostTime), "");
+        EXPECT_EQ(handed(vkHostOffset), "");
+    });
+}
+
 TEST_F(InstrumentationTest, KnowsASnapshotsFirmwareFromItsFilesAlone) {
     support::SmbiosImage(3, 0)
         .add(support::SmbiosSystemImage{"QEMU", "Standard PC", {}, {}, {}, {}})
