@@ -42,6 +42,12 @@ class Contents(unittest.TestCase):
                      "share/doc/vk-baseserver-tools/vk-provider-check.schema.json"]
         expected += ["lib/vk/ntp/daemons.sh", "lib/vk/ntp/ntp", "lib/vk/ntp/ntpd", "sbin/vk-ntp-setup",
                      "share/man/man8/vk-ntp-setup.8"]
+        expected += ["lib/vk/metrics/vk-metrics", "lib/systemd/system/vk-metrics.service",
+                     "lib/systemd/system/vk-metrics.timer", "share/vk-baseserver/prometheus/vk-rules.yml",
+                     "share/vk-baseserver/prometheus/vk-dashboard.json", "etc/ansible/facts.d/vk.fact"]
+        collection = SOURCE / "tools/ansible/collection"
+        expected += [f"share/ansible/collections/ansible_collections/vk/baseserver/{path.relative_to(collection)}"
+                     for path in files_below(collection)]
         expected += ENDPOINT
         expected += [f"share/vk-baseserver/register/{path.name}" for path in (SOURCE / "tools/register").glob("*.py")]
         expected += [f"lib/pkgconfig/{name}.pc" for name in LIBRARIES[:-1] + ["vk-cmpi"]]
@@ -53,7 +59,7 @@ class Contents(unittest.TestCase):
 
     def test_each_component_alone_holds_its_part_and_all_of_them_everything(self):
         parts = []
-        for component in ["provider", "tools", "development", "ntp"] + ["endpoint"] * bool(ENDPOINT):
+        for component in ["provider", "tools", "development", "ntp", "ansible"] + ["endpoint"] * bool(ENDPOINT):
             where = directory() / "p"
             install(where, component=component)
             parts += [str(p.relative_to(where)) for p in files_below(where)]
