@@ -23,6 +23,7 @@ ELSEWHERE = {
     "./test.sh": ".ci/run",
     "packaging/build": "tests/system/packages",
     "sudo apt-get": "tests/system/packages",
+    "sudo systemctl": "tests/system/fleet",
     "cmake --install": "tests/tools/test_installation.py",
     "cmake --build": ".ci/run",
     "vk-provider-register": "tests/tools/test_register.py",
