@@ -103,7 +103,7 @@ set(CPACK_RPM_PROVIDER_POST_UNINSTALL_SCRIPT_FILE ${scripts}/rpm/postun)
 set(CPACK_RPM_TOOLS_PACKAGE_REQUIRES "vk-baseserver-provider = ${PROJECT_VERSION}")
 set(CPACK_RPM_DEVELOPMENT_PACKAGE_REQUIRES "vk-baseserver-provider = ${PROJECT_VERSION}")
 set(CPACK_RPM_EXCLUDE_FROM_AUTO_FILELIST_ADDITION /usr/sbin /usr/share/man /usr/share/man/man1 /usr/share/man/man7
-    /usr/share/man/man8 /usr/lib64 /usr/lib/systemd /usr/lib/systemd/system /etc/pam.d /etc/ansible /usr/share/ansible)
+    /usr/share/man/man8 /usr/lib64 /usr/lib/systemd /usr/lib/systemd/system /etc/pam.d)
 set(CPACK_RPM_SPEC_MORE_DEFINE "%define _build_id_links none")
 
 set(CPACK_GENERATOR DEB)
