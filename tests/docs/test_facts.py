@@ -225,6 +225,20 @@ class Metrics(Temporary):
                 if key.endswith(("SerialNumber", "UUID", "Tag")):
                     self.assertNotIn(value, output)
 
+    def test_are_read_alike_by_strict_readers_of_both_formats(self):
+        try:
+            from prometheus_client import parser
+            from prometheus_client.openmetrics import parser as openmetrics
+        except ImportError:
+            self.skipTest("python3-prometheus-client is not installed")
+        for environment in hosts():
+            output = run("openmetrics", "--with-serials", **environment)[1]
+            of_both = [sorted((sample.name, *sorted(sample.labels.items()), sample.value) for family in
+                              reader.text_string_to_metric_families(output) for sample in family.samples)
+                       for reader in (openmetrics, parser)]
+            self.assertEqual(*of_both)
+            self.assertEqual(len(of_both[0]), len(self.metrics("--with-serials", **environment)))
+
     def test_are_accepted_by_promtool(self):
         if shutil.which("promtool") is None:
             self.skipTest("promtool is not installed")
