@@ -8,16 +8,16 @@ description:
 options:
   automatic_dst_adjustment:
     description:
-      - Whether local time follows daylight saving. V(false) replaces the time zone by one without, and remembers it;
-        V(true) brings it back, and fails where none is remembered.
+      - Whether local time follows daylight saving. C(false) replaces the time zone by one without, and remembers it;
+        C(true) brings it back, and fails where none is remembered.
     type: bool
   time:
     description:
-      - The time, a CIM date-time such as V(20261121060000.000000+060). ManageTime sets the clock and the time zone's offset
+      - The time, a CIM date-time such as C(20261121060000.000000+060). ManageTime sets the clock and the time zone's offset
         to it, and has the host synchronise with its time server.
     type: str
   tolerance:
-    description: How many seconds the clock may differ from O(time) and is left alone.
+    description: How many seconds the clock may differ from C(time) and is left alone.
     type: int
     default: 2
   vkcim:
@@ -52,6 +52,7 @@ after:
 import datetime
 import json
 import re
+from time import monotonic
 
 from ansible.module_utils.basic import AnsibleModule
 
@@ -114,6 +115,18 @@ def is_near(state, wanted, tolerance):
     return abs((now - then[0]).total_seconds()) <= tolerance and state.get("offset_minutes") == then[1]
 
 
+def differs(before, after, seconds, tolerance):
+    """Whether the host reads differently, but for the seconds that went by."""
+    times = [state.get("time") for state in (before, after)]
+    steady = [{name: value for name, value in state.items() if name != "time"} for state in (before, after)]
+    if steady[0] != steady[1] or times.count(None) == 1:
+        return True
+    if None in times:
+        return False
+    moved = (instant(times[1])[0] - instant(times[0])[0]).total_seconds()
+    return abs(moved - seconds) > tolerance
+
+
 def main():
     module = AnsibleModule(
         argument_spec={"automatic_dst_adjustment": {"type": "bool"}, "time": {"type": "str"},
@@ -135,11 +148,14 @@ def main():
 
     if has_it(before) or module.check_mode:
         module.exit_json(changed=not has_it(before), before=before, after=before)
+    started = monotonic()
     problem = host.adjust(dst) if time is None else host.set_time(time)
     after = host.state()
     # ManageTime may set the clock and then find no time server: both count, each for itself.
-    result = {"changed": has_it(after), "before": before, "after": after}
-    if problem is not None or not has_it(after):
+    result = {"changed": differs(before, after, monotonic() - started, tolerance), "before": before, "after": after}
+    # Which time it is then is the time server's word.
+    done = after.get("offset_minutes") == instant(time)[1] if time else has_it(after)
+    if problem is not None or not done:
         module.fail_json(msg=problem or "the host reads as before", **result)
     module.exit_json(**result)
 
