@@ -67,6 +67,6 @@ bring_zone_back() {
 
 # forget_provider [ROOT]: removes what the provider kept.
 forget_provider() {
-    rm -rf "${1:-}/var/lib/vk/instrumentation" "${1:-}/var/lib/vk/registration"
+    rm -rf "${1:-}/var/lib/vk/instrumentation" "${1:-}/var/lib/vk/registration" "${1:-}/run/vk-cimconfig.lock"
     rmdir "${1:-}/var/lib/vk" 2>/dev/null || :
 }

@@ -8,6 +8,7 @@
 #include "objectmanager/vkcim/DefaultLibrary.h"
 
 #include <sys/utsname.h>
+#include <systemd/sd-daemon.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -86,6 +87,8 @@ int serve(const endpoint::Settings& settings) {
         server.serve(listener);
         std::cerr << "listening on " << listener.url << std::endl;
     }
+    // Whoever starts us by hand asks as soon as the service manager returns.
+    sd_notify(0, "READY=1");
     server.run(stopped, idleOf(settings));
     // A provider that hangs cannot be unloaded.
     if (!server.shutDown()) _exit(0);

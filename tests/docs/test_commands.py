@@ -24,6 +24,10 @@ ELSEWHERE = {
     "packaging/build": "tests/system/packages",
     "sudo apt-get": "tests/system/packages",
     "sudo systemctl": "tests/system/fleet",
+    "sudo vkcimd-certificate": "tests/system/installed_endpoint",
+    "printf": "tests/system/installed_endpoint",
+    "wbemcli": "tests/system/installed_endpoint",
+    "vkcim --url unix:": "tests/system/installed_endpoint",
     "cmake --install": "tests/tools/test_installation.py",
     "cmake --build": ".ci/run",
     "vk-provider-register": "tests/tools/test_register.py",
@@ -32,7 +36,7 @@ ELSEWHERE = {
     "vk-ntp-setup": "tests/tools/test_ntp.py",
     "bench/": "bench/README.md",
 }
-PROGRAMS = r"(?:[A-Z_]+=\S+ )*(?:\./run\.sh|\./test\.sh|vkcim|vk-[a-z-]+|packaging/build|sudo|cmake|bench/\S+)"
+PROGRAMS = r"(?:[A-Z_]+=\S+ )*(?:\./run\.sh|\./test\.sh|vkcim|vk-[a-z-]+|packaging/build|sudo|printf|wbemcli|cmake|bench/\S+)"
 
 
 def unrolled(text):
