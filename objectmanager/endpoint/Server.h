@@ -1,5 +1,6 @@
 #pragma once
 
+#include "objectmanager/endpoint/Limits.h"
 #include "objectmanager/endpoint/Listening.h"
 #include "objectmanager/endpoint/Operations.h"
 
@@ -10,17 +11,6 @@
 
 namespace endpoint {
 
-struct Limits {
-    std::size_t body = std::size_t{1} << 20U;
-    std::size_t head = std::size_t{16} << 10U;
-    unsigned connections = 64;
-    unsigned connectionsPerAddress = 8;
-    std::chrono::milliseconds arrival = std::chrono::seconds(30); ///< of a whole request
-    std::chrono::milliseconds answer = std::chrono::seconds(60);
-    std::size_t workers = 8;
-    std::size_t queue = 64;
-};
-
 struct ServerSettings {
     std::string certificate; ///< in PEM, as is the key; for HTTPS
     std::string key;
@@ -28,11 +18,10 @@ struct ServerSettings {
     Limits limits;
 };
 
-/// The operations over HTTP. Connections are served by one thread for each listener, operations run in workers: one
-/// that hangs holds its worker, is named in the log, and its client gets an error in time.
+/// The operations over HTTP.
 class Server {
 public:
-    Server(Operations& operations, ServerSettings settings);
+    Server(Operations& operations, const ServerSettings& settings);
     ~Server();
     Server(const Server&) = delete;
     Server& operator=(const Server&) = delete;

@@ -1,0 +1,85 @@
+#include "objectmanager/endpoint/Connections.h"
+
+#include "objectmanager/endpoint/Log.h"
+
+#include <arpa/inet.h>
+#include <netinet/in.h>
+
+#include <algorithm>
+
+namespace endpoint {
+
+Connections::Connections(unsigned all, unsigned ofAnAddress) : most(all), mostOfAnAddress(ofAnAddress) {}
+
+bool Connections::isCrowded(const Connection& connection) const {
+    if (open.size() >= most) return true;
+    if (connection.kind == Listener::Kind::Unix && connection.peer == uid_t{0}) return false;
+    const auto same =
+        std::count_if(open.begin(), open.end(), [&](const auto& each) { return each->address == connection.address; });
+    return static_cast<unsigned>(same) >= mostOfAnAddress;
+}
+
+void Connections::enter(const ConnectionPointer& connection) {
+    const std::lock_guard lock(mutex);
+    lastUse = Clock::now();
+    connection->refused = isCrowded(*connection);
+    if (!connection->refused) {
+        open.insert(connection);
+        refusing = false;
+        return;
+    }
+    shutdown(connection->socket, SHUT_RDWR);
+    // Once: whoever tries again and again does not fill the log.
+    if (!refusing) {
+        log("a connection of " + connection->address + " is refused: " + std::to_string(open.size()) + " are open");
+    }
+    refusing = true;
+}
+
+void Connections::leave(const ConnectionPointer& connection) {
+    const std::lock_guard lock(mutex);
+    open.erase(connection);
+    lastUse = Clock::now();
+}
+
+void Connections::arrived(Connection& connection) {
+    const std::lock_guard lock(mutex);
+    connection.receiving = false;
+}
+
+void Connections::answered(Connection& connection) {
+    const std::lock_guard lock(mutex);
+    connection.receiving = true;
+    connection.since = Clock::now();
+}
+
+void Connections::endSlowSenders(std::chrono::milliseconds limit) {
+    const std::lock_guard lock(mutex);
+    const Clock::time_point now = Clock::now();
+    for (const ConnectionPointer& connection : open) {
+        if (connection->receiving && now - connection->since > limit) shutdown(connection->socket, SHUT_RDWR);
+    }
+}
+
+std::optional<Connections::Clock::time_point> Connections::idleSince() const {
+    const std::lock_guard lock(mutex);
+    if (!open.empty()) return std::nullopt;
+    return lastUse;
+}
+
+std::string addressText(const sockaddr* address) {
+    char text[INET6_ADDRSTRLEN] = "?";
+    if (address->sa_family == AF_INET) {
+        inet_ntop(AF_INET, &reinterpret_cast<const sockaddr_in*>(address)->sin_addr, text, sizeof text);
+    } else if (address->sa_family == AF_INET6) {
+        const in6_addr& ipv6 = reinterpret_cast<const sockaddr_in6*>(address)->sin6_addr;
+        if (IN6_IS_ADDR_V4MAPPED(&ipv6)) {
+            inet_ntop(AF_INET, &ipv6.s6_addr[12], text, sizeof text);
+        } else {
+            inet_ntop(AF_INET6, &ipv6, text, sizeof text);
+        }
+    }
+    return text;
+}
+
+} // namespace endpoint
