@@ -145,8 +145,7 @@ Daemon::Daemon(Listener given, Parts& shared) : listener(std::move(given)), part
     unsigned flags = MHD_USE_INTERNAL_POLLING_THREAD | MHD_USE_POLL | MHD_ALLOW_SUSPEND_RESUME;
     if (listener.kind == Listener::Kind::Https) {
         flags |= MHD_USE_TLS;
-        options.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0, parts.certificate.data()});
-        options.push_back({MHD_OPTION_HTTPS_MEM_KEY, 0, parts.key.data()});
+        options.push_back({MHD_OPTION_HTTPS_CERT_CALLBACK2, 0, Certificate::retriever()});
         options.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(tlsPriorities)});
     }
     options.push_back({MHD_OPTION_END, 0, nullptr});

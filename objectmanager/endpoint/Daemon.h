@@ -1,9 +1,10 @@
 #pragma once
 
+#include "objectmanager/endpoint/Certificate.h"
 #include "objectmanager/endpoint/Connections.h"
 #include "objectmanager/endpoint/Processing.h"
 
-#include <string>
+#include <memory>
 
 struct MHD_Daemon;
 
@@ -12,8 +13,7 @@ namespace endpoint {
 /// What the daemons of a server share.
 struct Parts {
     const Limits limits;
-    std::string certificate; ///< in PEM, as is the key; for HTTPS
-    std::string key;
+    std::shared_ptr<Certificate> certificate; ///< for HTTPS
     Authentication authentication;
     Connections connections;
     Processing processing;

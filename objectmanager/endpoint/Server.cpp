@@ -10,10 +10,7 @@ namespace endpoint {
 class Server::Impl {
 public:
     Impl(Operations& operations, const ServerSettings& settings)
-        : parts{settings.limits,
-                settings.certificate,
-                settings.key,
-                Authentication(settings.anonymousRead),
+        : parts{settings.limits, settings.certificate, Authentication(settings.anonymousRead),
                 Connections(settings.limits.connections, settings.limits.connectionsPerAddress),
                 Processing(operations, parts.authentication, settings.limits)} {}
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "objectmanager/endpoint/Certificate.h"
 #include "objectmanager/endpoint/Limits.h"
 #include "objectmanager/endpoint/Listening.h"
 #include "objectmanager/endpoint/Operations.h"
@@ -7,14 +8,12 @@
 #include <atomic>
 #include <chrono>
 #include <memory>
-#include <string>
 
 namespace endpoint {
 
 struct ServerSettings {
-    std::string certificate; ///< in PEM, as is the key; for HTTPS
-    std::string key;
-    bool anonymousRead = false; ///< everybody may read over the loopback and the Unix socket
+    std::shared_ptr<Certificate> certificate; ///< for HTTPS
+    bool anonymousRead = false;               ///< everybody may read over the loopback and the Unix socket
     Limits limits;
 };
 
@@ -26,7 +25,7 @@ public:
     Server(const Server&) = delete;
     Server& operator=(const Server&) = delete;
 
-    /// Throws std::runtime_error, for example for a certificate that cannot be used.
+    /// Throws std::runtime_error.
     void serve(const Listener& listener);
 
     /// Returns when `stop` is true, or when no connection was open and no request came for that long (0: never).
