@@ -12,58 +12,56 @@ namespace endpoint {
 Connections::Connections(unsigned all, unsigned ofAnAddress) : most(all), mostOfAnAddress(ofAnAddress) {}
 
 bool Connections::isCrowded(const Connection& connection) const {
-    if (open.size() >= most) return true;
+    if (connections.size() >= most) return true;
     if (connection.kind == Listener::Kind::Unix && connection.peer == uid_t{0}) return false;
-    const auto same =
-        std::count_if(open.begin(), open.end(), [&](const auto& each) { return each->address == connection.address; });
+    const auto same = std::count_if(connections.begin(), connections.end(),
+                                    [&](const auto& each) { return each->address == connection.address; });
     return static_cast<unsigned>(same) >= mostOfAnAddress;
 }
 
-void Connections::enter(const ConnectionPointer& connection) {
+void Connections::open(const ConnectionPointer& connection) {
     const std::lock_guard lock(mutex);
     lastUse = Clock::now();
     connection->refused = isCrowded(*connection);
     if (!connection->refused) {
-        open.insert(connection);
+        connections.insert(connection);
         refusing = false;
         return;
     }
     shutdown(connection->socket, SHUT_RDWR);
     // Once: whoever tries again and again does not fill the log.
     if (!refusing) {
-        log("a connection of " + connection->address + " is refused: " + std::to_string(open.size()) + " are open");
+        log("a connection of " + connection->address + " is refused: " + std::to_string(connections.size()) +
+            " are open");
     }
     refusing = true;
 }
 
-void Connections::leave(const ConnectionPointer& connection) {
+void Connections::close(const ConnectionPointer& connection) {
     const std::lock_guard lock(mutex);
-    open.erase(connection);
+    connections.erase(connection);
     lastUse = Clock::now();
 }
 
-void Connections::arrived(Connection& connection) {
+void Connections::enter(Connection& connection, Connection::Phase phase) {
     const std::lock_guard lock(mutex);
-    connection.receiving = false;
-}
-
-void Connections::answered(Connection& connection) {
-    const std::lock_guard lock(mutex);
-    connection.receiving = true;
+    connection.phase = phase;
     connection.since = Clock::now();
 }
 
-void Connections::endSlowSenders(std::chrono::milliseconds limit) {
+void Connections::endSlow(std::chrono::milliseconds arrival, std::chrono::milliseconds taking) {
     const std::lock_guard lock(mutex);
     const Clock::time_point now = Clock::now();
-    for (const ConnectionPointer& connection : open) {
-        if (connection->receiving && now - connection->since > limit) shutdown(connection->socket, SHUT_RDWR);
+    for (const ConnectionPointer& connection : connections) {
+        if (connection->phase == Connection::Phase::Working) continue;
+        const auto limit = connection->phase == Connection::Phase::Receiving ? arrival : taking;
+        if (now - connection->since > limit) shutdown(connection->socket, SHUT_RDWR);
     }
 }
 
 std::optional<Connections::Clock::time_point> Connections::idleSince() const {
     const std::lock_guard lock(mutex);
-    if (!open.empty()) return std::nullopt;
+    if (!connections.empty()) return std::nullopt;
     return lastUse;
 }
 

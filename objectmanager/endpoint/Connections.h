@@ -24,8 +24,12 @@ struct Connection {
     std::string address;       ///< for the log
     std::optional<uid_t> peer; ///< at the other end of a Unix socket
     bool refused = false;      ///< nothing is read from it
-    bool receiving = true;     ///< a request is arriving, or expected
+
+    /// A request is arriving or expected, is with us, or its answer is on its way.
+    enum class Phase { Receiving, Working, Sending };
+    Phase phase = Phase::Receiving;
     Clock::time_point since = Clock::now();
+
     std::string authorization; ///< that has been checked: its user is `caller`
     std::optional<Caller> caller;
 };
@@ -41,15 +45,14 @@ public:
 
     /// Counts a connection in, or refuses and ends it: there are too many in all, or from its address. Root's over a
     /// Unix socket are not counted by address.
-    void enter(const ConnectionPointer& connection);
-    void leave(const ConnectionPointer& connection);
+    void open(const ConnectionPointer& connection);
+    void close(const ConnectionPointer& connection);
 
-    /// What time limit holds for it: a request is whole, or the next one may come.
-    void arrived(Connection& connection);
-    void answered(Connection& connection);
+    /// The client's turn begins, or ours.
+    void enter(Connection& connection, Connection::Phase phase);
 
-    /// Ends those whose request does not arrive in that time.
-    void endSlowSenders(std::chrono::milliseconds limit);
+    /// Ends those whose request does not arrive in time, or who do not take their answer.
+    void endSlow(std::chrono::milliseconds arrival, std::chrono::milliseconds taking);
 
     /// Since when nobody is there; nothing while somebody is.
     std::optional<Clock::time_point> idleSince() const;
@@ -60,7 +63,7 @@ private:
     const unsigned most;
     const unsigned mostOfAnAddress;
     mutable std::mutex mutex; // of what follows, and of the connections' times
-    std::set<ConnectionPointer> open;
+    std::set<ConnectionPointer> connections;
     Clock::time_point lastUse = Clock::now();
     bool refusing = false; ///< it was said in the log
 };

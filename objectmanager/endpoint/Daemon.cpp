@@ -78,11 +78,11 @@ public:
         Daemon& daemon = *static_cast<Daemon*>(target);
         if (code == MHD_CONNECTION_NOTIFY_STARTED) {
             ConnectionPointer connection = connectionAt(daemon.listener.kind, handle);
-            daemon.parts.connections.enter(connection);
+            daemon.parts.connections.open(connection);
             *context = new ConnectionPointer(std::move(connection));
         } else {
             const std::unique_ptr<ConnectionPointer> connection(static_cast<ConnectionPointer*>(*context));
-            daemon.parts.connections.leave(*connection);
+            daemon.parts.connections.close(*connection);
             *context = nullptr;
         }
     }
@@ -98,19 +98,26 @@ public:
             return goesOn ? MHD_YES : MHD_NO;
         }
         if (!work->isFinished() && work->tooLarge) work->finish(plainAnswer(413, "the body is too large"));
-        if (work->isFinished()) return send(*work);
-        parts.connections.arrived(*work->connection);
+        if (work->isFinished()) {
+            parts.connections.enter(*work->connection, Connection::Phase::Sending);
+            return send(*work);
+        }
+        parts.connections.enter(*work->connection, Connection::Phase::Working);
         parts.processing.begin(work);
         return MHD_YES;
     }
 
-    static void completed(void* target, MHD_Connection*, void** context, MHD_RequestTerminationCode) {
+    static void completed(void* target, MHD_Connection*, void** context, MHD_RequestTerminationCode ending) {
         if (*context == nullptr) return;
         const std::unique_ptr<WorkPointer> work(static_cast<WorkPointer*>(*context));
         *context = nullptr;
-        if (!(*work)->isFinished()) (*work)->finish(plainAnswer(400, "the request did not arrive"));
+        if (!(*work)->isFinished()) {
+            (*work)->finish(plainAnswer(400, "the request did not arrive"));
+        } else if (ending != MHD_REQUEST_TERMINATED_COMPLETED_OK) {
+            (*work)->answer.detail += "the client did not take the answer";
+        }
         log((*work)->logLine());
-        static_cast<Daemon*>(target)->parts.connections.answered(*(*work)->connection);
+        static_cast<Daemon*>(target)->parts.connections.enter(*(*work)->connection, Connection::Phase::Receiving);
     }
 
 private:

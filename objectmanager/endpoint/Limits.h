@@ -13,6 +13,7 @@ struct Limits {
     unsigned connectionsPerAddress = 8;
     std::chrono::milliseconds arrival = std::chrono::seconds(30); ///< of a whole request
     std::chrono::milliseconds answer = std::chrono::seconds(60);
+    std::chrono::milliseconds taking = std::chrono::seconds(60); ///< an answer that is ready
     std::size_t workers = 8;
     std::size_t passwordChecks = 4; ///< at once
     std::size_t queue = 64;

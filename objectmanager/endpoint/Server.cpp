@@ -21,7 +21,7 @@ public:
     void run(const std::atomic<bool>& stop, std::chrono::seconds idle) {
         while (!stop) {
             std::this_thread::sleep_for(std::chrono::milliseconds(100));
-            parts.connections.endSlowSenders(parts.limits.arrival);
+            parts.connections.endSlow(parts.limits.arrival, parts.limits.taking);
             parts.processing.answerForHanging();
             const auto since = parts.connections.idleSince();
             if (idle.count() > 0 && since && Connection::Clock::now() - *since >= idle) return;

@@ -70,6 +70,11 @@ std::string Client::receive() {
     }
 }
 
+void Client::waitForEnd() const {
+    pollfd end = {socket, 0, 0}; // POLLHUP alone
+    poll(&end, 1, -1);
+}
+
 Client& waitForEither(Client& a, Client& b) {
     pollfd both[] = {{a.socket, POLLIN, 0}, {b.socket, POLLIN, 0}};
     poll(both, 2, -1);
@@ -135,7 +140,7 @@ om::Answer RunningServer::provide(const om::Request& wanted) {
         changed.wait(lock, [&] { return released; });
     }
     om::Answer answer;
-    answer.results.emplace_back(wanted.path);
+    for (int i = 0; i < results; ++i) answer.results.emplace_back(wanted.path);
     return answer;
 }
 

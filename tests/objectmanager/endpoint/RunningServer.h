@@ -32,6 +32,9 @@ public:
     /// One answer, its head and its body; what came so far where the connection ends.
     std::string receive();
 
+    /// Until the other end hangs up. What it sent before stays to be received.
+    void waitForEnd() const;
+
     /// The one of two that has got something.
     friend Client& waitForEither(Client& a, Client& b);
 
@@ -79,6 +82,7 @@ protected:
     bool released = false;
     int hanging = 0;
     int asked = 0; ///< times
+    std::atomic<int> results{1};
 };
 
 } // namespace endpoint

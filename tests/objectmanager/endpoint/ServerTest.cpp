@@ -7,6 +7,7 @@
 namespace endpoint {
 namespace {
 
+using testing::AllOf;
 using testing::HasSubstr;
 using testing::StartsWith;
 
@@ -110,6 +111,29 @@ TEST_F(ServerTest, ASlowSenderIsCutOff) {
     EXPECT_THAT(silent.receive(), testing::Not(HasSubstr(" 200 ")));
     EXPECT_THAT(slow.receive(), testing::Not(HasSubstr(" 200 ")));
     EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME"));
+}
+
+TEST_F(ServerTest, AClientThatDoesNotTakeItsAnswerIsCutOff) {
+    Limits limits;
+    limits.taking = std::chrono::milliseconds(300);
+    results = 20000; // more than the socket holds
+    testing::internal::CaptureStderr();
+    start(limits);
+    Client slow(path);
+    slow.send(request());
+    slow.waitForEnd(); // and reads nothing until then
+    EXPECT_THAT(testing::internal::GetCapturedStderr(),
+                AllOf(HasSubstr("http=200 cim=0"), HasSubstr("the client did not take the answer")));
+    results = 1;
+    EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME"));
+}
+
+TEST_F(ServerTest, LargeAnswersComeWhole) {
+    results = 20000;
+    start();
+    const std::string answer = Client(path).ask(request());
+    EXPECT_GT(answer.size(), std::size_t{1} << 20U);
+    EXPECT_THAT(answer.substr(answer.size() - 6), "</CIM>");
 }
 
 TEST(ServerOverTcp, WantsAUser) {
