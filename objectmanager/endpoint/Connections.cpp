@@ -4,19 +4,34 @@
 
 #include <arpa/inet.h>
 #include <netinet/in.h>
+#include <poll.h>
 
 #include <algorithm>
 
 namespace endpoint {
+namespace {
+
+/// Whether the client has gone, though its connection is not closed here yet: the next one may be quicker than that.
+bool hasHungUp(const Connection& connection) {
+    pollfd end = {connection.socket, POLLRDHUP, 0};
+    return connection.phase == Connection::Phase::Receiving && poll(&end, 1, 0) > 0;
+}
+
+} // namespace
 
 Connections::Connections(unsigned all, unsigned ofAnAddress) : most(all), mostOfAnAddress(ofAnAddress) {}
 
 bool Connections::isCrowded(const Connection& connection) const {
-    if (connections.size() >= most) return true;
+    const auto areOpen = [&](unsigned limit, auto isOne) {
+        const auto counted = std::count_if(connections.begin(), connections.end(), isOne);
+        if (static_cast<unsigned>(counted) < limit) return false;
+        const auto gone = std::count_if(connections.begin(), connections.end(),
+                                        [&](const auto& each) { return isOne(each) && hasHungUp(*each); });
+        return static_cast<unsigned>(counted - gone) >= limit;
+    };
+    if (areOpen(most, [](const auto&) { return true; })) return true;
     if (connection.kind == Listener::Kind::Unix && connection.peer == uid_t{0}) return false;
-    const auto same = std::count_if(connections.begin(), connections.end(),
-                                    [&](const auto& each) { return each->address == connection.address; });
-    return static_cast<unsigned>(same) >= mostOfAnAddress;
+    return areOpen(mostOfAnAddress, [&](const auto& each) { return each->address == connection.address; });
 }
 
 void Connections::open(const ConnectionPointer& connection) {
