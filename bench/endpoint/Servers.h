@@ -18,6 +18,8 @@ public:
     /// In KiB.
     std::size_t residentMemory() const;
     std::size_t descriptors() const;
+    /// Of all its threads, in microseconds.
+    double processorTime() const;
 
 protected:
     ServerProcess() = default;
@@ -32,10 +34,11 @@ public:
     explicit Endpoint(const std::string& program);
 };
 
-/// libmicrohttpd as vkcimd uses it, which answers at once: to a request for the path /N with N bytes.
+/// libmicrohttpd as vkcimd uses it, which answers a request for the path /N with N bytes: at once, or by way of a
+/// worker as vkcimd does.
 class Constant : public ServerProcess {
 public:
-    Constant();
+    explicit Constant(bool worker);
 };
 
 } // namespace bench

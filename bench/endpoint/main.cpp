@@ -90,32 +90,65 @@ double median(std::vector<double> values) {
     return values[values.size() / 2];
 }
 
-/// Answers a second in a block.
-double block(Clients& clients, const std::vector<std::string>& requests, double seconds) {
-    const auto start = Clock::now();
-    const auto answers = static_cast<double>(clients.ask(requests, 0, seconds));
-    return answers / std::chrono::duration<double>(Clock::now() - start).count();
-}
+/// One of the servers, asked over connections of its own.
+class Subject {
+public:
+    Subject(const bench::ServerProcess& asked, unsigned connections)
+        : server(asked), clients(asked.port(), connections) {}
 
-void compare(const bench::Endpoint& endpoint, const bench::Constant& constant, int rounds, double seconds) {
-    fmt::print("{:<20} {:>11} {:>12} {:>12} {:>6}\n", "load", "connections", "endpoint/s", "constant/s", "ratio");
+    void block(const std::vector<std::string>& requests, double seconds) {
+        const double used = server.processorTime();
+        const auto start = Clock::now();
+        const std::size_t count = clients.ask(requests, 0, seconds);
+        rates.push_back(static_cast<double>(count) / std::chrono::duration<double>(Clock::now() - start).count());
+        answers += count;
+        processorTime += server.processorTime() - used;
+    }
+
+    void forget() {
+        rates.clear();
+        answers = 0;
+        processorTime = 0;
+    }
+
+    double rate() const { return median(rates); }
+    double microseconds() const { return processorTime / static_cast<double>(answers); }
+    /// The other's share of this one's answers, block by block.
+    double ratio(const Subject& other) const {
+        std::vector<double> shares;
+        for (std::size_t i = 0; i < rates.size(); ++i) shares.push_back(other.rates[i] / rates[i]);
+        return median(std::move(shares));
+    }
+
+private:
+    const bench::ServerProcess& server;
+    Clients clients;
+    std::vector<double> rates;
+    std::size_t answers = 0;
+    double processorTime = 0;
+};
+
+void compare(const bench::Endpoint& endpoint, int rounds, double seconds) {
+    const bench::Constant handed(true);
+    const bench::Constant direct(false);
+    fmt::print("{:<18} {:>11} | {:>10} {:>7} | {:>10} {:>7} {:>5} | {:>10} {:>7} {:>5}\n", "load", "connections",
+               "endpoint/s", "CPU us", "worker/s", "CPU us", "ratio", "direct/s", "CPU us", "ratio");
     for (const Load& load : loads(endpoint.port())) {
         for (const unsigned connections : {1U, 8U, 64U}) {
-            Clients asking(endpoint.port(), connections);
-            Clients beside(constant.port(), connections);
-            std::vector<double> rates;
-            std::vector<double> best;
-            std::vector<double> ratios;
-            for (int round = -1; round < rounds; ++round) { // the first warms both up
-                const double rate = block(asking, load.endpoint, seconds);
-                const double other = block(beside, load.constant, seconds);
-                if (round < 0) continue;
-                rates.push_back(rate);
-                best.push_back(other);
-                ratios.push_back(rate / other);
+            Subject own(endpoint, connections);
+            Subject worker(handed, connections);
+            Subject bare(direct, connections);
+            for (int round = 0; round <= rounds; ++round) {
+                own.block(load.endpoint, seconds);
+                worker.block(load.constant, seconds);
+                bare.block(load.constant, seconds);
+                if (round > 0) continue; // it warmed all up
+                for (Subject* each : {&own, &worker, &bare}) each->forget();
             }
-            fmt::print("{:<20} {:>11} {:>12.0f} {:>12.0f} {:>6.2f}\n", load.name, connections, median(rates),
-                       median(best), median(ratios));
+            fmt::print(
+                "{:<18} {:>11} | {:>10.0f} {:>7.1f} | {:>10.0f} {:>7.1f} {:>5.2f} | {:>10.0f} {:>7.1f} {:>5.2f}\n",
+                load.name, connections, own.rate(), own.microseconds(), worker.rate(), worker.microseconds(),
+                worker.ratio(own), bare.rate(), bare.microseconds(), bare.ratio(own));
             std::fflush(stdout);
         }
     }
@@ -156,7 +189,7 @@ int main(int argc, char** argv) {
     try {
         const bench::Endpoint endpoint(program);
         if (soaking->parsed()) return soak(endpoint, requests);
-        compare(endpoint, bench::Constant(), rounds, seconds);
+        compare(endpoint, rounds, seconds);
         return 0;
     } catch (const std::exception& failure) {
         fmt::print(stderr, "endpoint-load: {}\n", failure.what());
