@@ -38,7 +38,12 @@ void Processing::hand(const WorkPointer& work, Workers& to, void (Processing::*j
 /// In a thread for passwords.
 void Processing::authenticate(const WorkPointer& work) {
     work->note("authentication of its client");
-    PasswordCheck check = checkPassword(work->http);
+    PasswordCheck check;
+    try {
+        check = checkPassword(work->http);
+    } catch (const std::exception& error) {
+        check.refusal = plainAnswer(500, error.what());
+    }
     if (!check.caller) {
         done(work, work->caller, std::move(check.refusal));
         return;

@@ -45,6 +45,9 @@ public:
         const bool known =
             url.rfind("https://", 0) == 0 || url.rfind("http://", 0) == 0 || url.rfind(unixPrefix, 0) == 0;
         if (!known) throw std::runtime_error("--url: '" + url + "' is neither https://, http:// nor unix:PATH");
+        if (!options.netrcFile.empty() && access(options.netrcFile.c_str(), R_OK) != 0) {
+            throw std::runtime_error("--netrc-file: " + options.netrcFile + " cannot be read"); // libcurl ignores it
+        }
         curl_global_init(CURL_GLOBAL_DEFAULT);
         if (url.rfind(unixPrefix, 0) == 0) {
             socket = url.substr(unixPrefix.size());
