@@ -3,7 +3,7 @@
 # shellcheck shell=bash
 
 # shellcheck disable=SC2034 # for those that source this
-build_packages="cmake ninja-build g++ pkg-config libcli11-dev nlohmann-json3-dev libfmt-dev libgtest-dev libgmock-dev libbenchmark-dev libmd-dev libutfcpp-dev libpugixml-dev libmicrohttpd-dev libpam0g-dev libsystemd-dev libcurl4-openssl-dev tzdata python3"
+build_packages="cmake ninja-build g++ pkg-config libcli11-dev nlohmann-json3-dev libfmt-dev libgtest-dev libgmock-dev libbenchmark-dev libmd-dev libutfcpp-dev libpugixml-dev libgnutls28-dev libmicrohttpd-dev libpam0g-dev libsystemd-dev libcurl4-openssl-dev tzdata python3"
 
 # What single tests take; they are skipped without.
 # shellcheck disable=SC2034

@@ -64,20 +64,24 @@ std::string errorName(int code) {
     return std::string("CIM_ERR_") + names[isKnown(code) ? static_cast<std::size_t>(code) : 1];
 }
 
-std::string response(const Request& request, std::string_view content) {
+std::string enclosed(std::string_view before, std::string content, std::string_view behind) {
+    content.append(behind);
+    content.insert(0, before);
+    return content;
+}
+
+std::string response(const Request& request, std::string content) {
     const char* const element = request.intrinsic ? "IMETHODRESPONSE" : "METHODRESPONSE";
-    Writer writer;
-    writer.raw(declaration);
-    writer.open("CIM", {{"CIMVERSION", "2.0"}, {"DTDVERSION", "2.0"}});
-    writer.open("MESSAGE", {{"ID", request.id}, {"PROTOCOLVERSION", "1.0"}});
-    writer.open("SIMPLERSP");
-    writer.open(element, {{"NAME", request.name}});
-    writer.raw(content);
-    writer.close(element);
-    writer.close("SIMPLERSP");
-    writer.close("MESSAGE");
-    writer.close("CIM");
-    return writer.take();
+    Writer before;
+    before.raw(declaration);
+    before.open("CIM", {{"CIMVERSION", "2.0"}, {"DTDVERSION", "2.0"}});
+    before.open("MESSAGE", {{"ID", request.id}, {"PROTOCOLVERSION", "1.0"}});
+    before.open("SIMPLERSP");
+    before.open(element, {{"NAME", request.name}});
+    Writer behind;
+    behind.close(element);
+    for (const char* each : {"SIMPLERSP", "MESSAGE", "CIM"}) behind.close(each);
+    return enclosed(before.text(), std::move(content), behind.text());
 }
 
 std::string errorResponse(const Request& request, int code, std::string_view description) {
@@ -85,7 +89,7 @@ std::string errorResponse(const Request& request, int code, std::string_view des
     Writer writer;
     writer.empty("ERROR", {{"CODE", std::to_string(sent)},
                            {"DESCRIPTION", description.empty() ? errorName(sent) : oneLine(description)}});
-    return response(request, writer.text());
+    return response(request, writer.take());
 }
 
 } // namespace cimxml

@@ -28,7 +28,7 @@ std::string objects(const Call& call, bool toReferences) {
             writeClass(writer, call.schema(), *call.schema().find(name), parts);
             writer.close("VALUE.OBJECTWITHPATH");
         }
-        return returned(writer.text());
+        return returned(writer.take());
     }
     for (const om::Instance& instance : associatedInstances(call, traversal, selection)) {
         writer.open("VALUE.OBJECTWITHPATH");
@@ -36,7 +36,7 @@ std::string objects(const Call& call, bool toReferences) {
         selection.write(writer, instance);
         writer.close("VALUE.OBJECTWITHPATH");
     }
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 /// OBJECTPATH for each instance or class.
@@ -50,14 +50,14 @@ std::string names(const Call& call, bool toReferences) {
             writer.classPath(call.host, call.space.name, name);
             writer.close("OBJECTPATH");
         }
-        return returned(writer.text());
+        return returned(writer.take());
     }
     for (const om::ObjectPath& path : associatedPaths(call, traversal)) {
         writer.open("OBJECTPATH");
         writer.instancePath(path, call.host);
         writer.close("OBJECTPATH");
     }
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 } // namespace

@@ -1,5 +1,7 @@
 #include "objectmanager/endpoint/Call.h"
 
+#include "objectmanager/cimxml/Message.h"
+
 #include <algorithm>
 
 namespace endpoint {
@@ -93,12 +95,8 @@ om::Request requestFor(const Call& call, om::Operation operation, const std::str
     return requestFor(call, operation, std::move(path));
 }
 
-std::string returned(const std::string& elements) {
-    cimxml::Writer writer;
-    writer.open("IRETURNVALUE");
-    writer.raw(elements);
-    writer.close("IRETURNVALUE");
-    return writer.take();
+std::string returned(std::string elements) {
+    return cimxml::enclosed("<IRETURNVALUE>", std::move(elements), "</IRETURNVALUE>");
 }
 
 } // namespace endpoint

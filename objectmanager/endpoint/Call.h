@@ -57,6 +57,6 @@ om::Request requestFor(const Call& call, om::Operation operation, om::ObjectPath
 om::Request requestFor(const Call& call, om::Operation operation, const std::string& className);
 
 /// IRETURNVALUE around elements.
-std::string returned(const std::string& elements);
+std::string returned(std::string elements);
 
 } // namespace endpoint

@@ -27,7 +27,7 @@ std::string getClass(const Call& call) {
     const om::ResolvedClass& known = knownClass(call, name, CMPI_RC_ERR_NOT_FOUND);
     cimxml::Writer writer;
     writeClass(writer, call.schema(), *known.declaration, selection);
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string enumerateClasses(const Call& call) {
@@ -36,13 +36,13 @@ std::string enumerateClasses(const Call& call) {
     for (const om::ClassDeclaration* declared : subclasses(call)) {
         writeClass(writer, call.schema(), *declared, selection);
     }
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string enumerateClassNames(const Call& call) {
     cimxml::Writer writer;
     for (const om::ClassDeclaration* declared : subclasses(call)) writer.className(declared->name);
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string getQualifier(const Call& call) {
@@ -51,13 +51,13 @@ std::string getQualifier(const Call& call) {
     if (type == nullptr) fail(CMPI_RC_ERR_NOT_FOUND, "there is no qualifier " + name);
     cimxml::Writer writer;
     writeQualifierType(writer, *type);
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string enumerateQualifiers(const Call&) {
     cimxml::Writer writer;
     for (const om::QualifierType& type : om::qualifierTypes()) writeQualifierType(writer, type);
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 } // namespace endpoint

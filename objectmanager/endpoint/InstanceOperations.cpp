@@ -92,25 +92,26 @@ std::string getInstance(const Call& call) {
     const om::ObjectPath path = servedPath(call, call.parameters.requiredInstanceName("InstanceName"));
     cimxml::Writer writer;
     selection.write(writer, selection.of(fetch(call, path, selection.properties())));
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string enumerateInstances(const Call& call) {
     Selection selection(call);
     cimxml::Writer writer;
-    for (const om::Instance& instance : instancesOfClass(call, selection)) {
+    for (om::Instance& instance : instancesOfClass(call, selection)) {
         writer.open("VALUE.NAMEDINSTANCE");
         writer.instanceName(instance.path);
         selection.write(writer, instance);
         writer.close("VALUE.NAMEDINSTANCE");
+        instance = om::Instance(); // its memory goes at once
     }
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string enumerateInstanceNames(const Call& call) {
     cimxml::Writer writer;
     for (const om::ObjectPath& path : pathsOfClass(call)) writer.instanceName(path);
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string createInstance(const Call& call) {
@@ -128,7 +129,7 @@ std::string createInstance(const Call& call) {
     if (answer.results.empty()) fail(CMPI_RC_ERR_FAILED, "the provider named no new instance");
     cimxml::Writer writer;
     writer.instanceName(std::get<om::ObjectPath>(answer.results.front()));
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string modifyInstance(const Call& call) {
@@ -163,7 +164,7 @@ std::string getProperty(const Call& call) {
     if (value == nullptr || value->isNull()) return {};
     cimxml::Writer writer;
     writer.value(*value);
-    return returned(writer.text());
+    return returned(writer.take());
 }
 
 std::string setProperty(const Call& call) {

@@ -50,7 +50,7 @@ std::string deliver(const Call& call, Enumeration enumeration, std::uint32_t cou
         call.contexts.putBack(name, std::move(enumeration));
     }
     cimxml::Writer writer;
-    writer.raw(returned(elements));
+    writer.raw(returned(std::move(elements)));
     writer.parameter("EndOfSequence", {CMPI_boolean, end});
     writer.parameter("EnumerationContext", {CMPI_string, name});
     return writer.take();

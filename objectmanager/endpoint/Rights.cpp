@@ -19,6 +19,7 @@ namespace {
 constexpr const char* readers = "vkcim";
 constexpr const char* administrators = "vkcim-admin";
 constexpr std::size_t bufferSize = 16384;
+constexpr unsigned failureDelay = 2'000'000; ///< microseconds, also where no module of PAM's asks for it
 
 std::optional<gid_t> groupNamed(const char* name) {
     std::vector<char> buffer(bufferSize);
@@ -122,6 +123,7 @@ bool isAuthentic(const std::string& user, const std::string& password) {
     const pam_conv conversation{converse, secret.data()};
     pam_handle_t* handle = nullptr;
     if (pam_start("vkcimd", user.c_str(), &conversation, &handle) != PAM_SUCCESS) return false;
+    pam_fail_delay(handle, failureDelay);
     int status = pam_authenticate(handle, PAM_SILENT | PAM_DISALLOW_NULL_AUTHTOK);
     if (status == PAM_SUCCESS) status = pam_acct_mgmt(handle, PAM_SILENT);
     pam_end(handle, status);

@@ -20,6 +20,9 @@ void check(const Settings& settings) {
     if (settings.certificate.empty() != settings.key.empty()) {
         throw std::invalid_argument("--certificate and --key go together");
     }
+    if (settings.makeCertificate && settings.certificate.empty()) {
+        throw std::invalid_argument("--make-certificate takes --certificate and --key");
+    }
     if (settings.provider.empty()) throw std::invalid_argument("--provider is empty");
 }
 
@@ -55,11 +58,21 @@ ParsedSettings parseSettings(const std::vector<std::string>& words) {
     app.add_flag("--foreground", settings.foreground, "Open the sockets ourselves, without a service manager")
         ->configurable(false);
     app.add_flag("--check-config", settings.checkOnly, "Only check the configuration")->configurable(false);
+    std::vector<std::string> names;
+    const CLI::Option* make =
+        app.add_option("--make-certificate", names,
+                       "Write a certificate that nobody else has signed, and its key, for these names and addresses "
+                       "(this host's), and exit")
+            ->type_name("[NAME...]")
+            ->expected(0, -1)
+            ->configurable(false);
     app.footer("Exit status: 0 stopped or idle, 2 unusable configuration, 3 the provider or a socket cannot be had.");
     try {
         app.parse(std::vector<std::string>(words.rbegin(), words.rend()));
         for (const std::string& url : urls) settings.listen.emplace_back(url);
         if (idle >= 0) settings.idleExit = std::chrono::seconds(idle);
+        names.erase(std::remove(names.begin(), names.end(), ""), names.end()); // CLI11 has one where none is given
+        if (make->count() > 0) settings.makeCertificate = names;
         check(settings);
         return {std::move(settings), 0, {}, {}};
     } catch (const CLI::Success& success) { // --help and --version

@@ -17,8 +17,9 @@ struct Settings {
     bool anonymousRead = false;
     bool foreground = false;
     bool checkOnly = false;
-    std::vector<std::string> schema; ///< MOF files; none: the classes built in
-    std::string library;             ///< empty: the one installed beside the program
+    std::optional<std::vector<std::string>> makeCertificate; ///< for these names, or where there are none the host's
+    std::vector<std::string> schema;                         ///< MOF files; none: the classes built in
+    std::string library;                                     ///< empty: the one installed beside the program
     std::string provider = "BaseServerProvider";
     std::optional<std::chrono::seconds> idleExit;
 };

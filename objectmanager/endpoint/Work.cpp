@@ -1,5 +1,7 @@
 #include "objectmanager/endpoint/Work.h"
 
+#include "objectmanager/endpoint/Log.h"
+
 #include <array>
 
 namespace endpoint {
@@ -35,6 +37,34 @@ void Work::note(std::string text) {
 std::string Work::noted() const {
     const std::lock_guard lock(mutex);
     return doing;
+}
+
+bool Work::receive(std::string_view piece, std::size_t longest) {
+    received += piece.size();
+    if (received <= longest) {
+        http.body.append(piece);
+        return true;
+    }
+    tooLarge = true;
+    http.body = std::string();
+    return received <= longest * 8;
+}
+
+std::string Work::logLine() const {
+    const auto elapsed = std::chrono::duration_cast<std::chrono::microseconds>(Clock::now() - started);
+    std::string line = connection->address + ' ' + logged(caller.user) + ' ' + logged(answer.operation) + ' ' +
+                       logged(answer.nameSpace) + ' ' + logged(answer.className) +
+                       " http=" + std::to_string(answer.status) + " cim=" + std::to_string(answer.cimStatus) +
+                       " us=" + std::to_string(elapsed.count());
+    if (!answer.detail.empty()) line += ": " + answer.detail;
+    return line;
+}
+
+HttpAnswer plainAnswer(unsigned status, std::string detail) {
+    HttpAnswer answer;
+    answer.status = status;
+    answer.detail = std::move(detail);
+    return answer;
 }
 
 Ask noting(Ask provider) {

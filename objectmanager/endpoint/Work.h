@@ -1,33 +1,18 @@
 #pragma once
 
+#include "objectmanager/endpoint/Connections.h"
 #include "objectmanager/endpoint/Exchange.h"
-#include "objectmanager/endpoint/Listening.h"
-
-#include <sys/types.h>
 
 #include <chrono>
 #include <memory>
 #include <mutex>
-#include <optional>
 #include <string>
 
 struct MHD_Connection;
 
 namespace endpoint {
 
-/// A connection, from its first byte to its last.
-struct Connection {
-    using Clock = std::chrono::steady_clock;
-
-    Listener::Kind kind = Listener::Kind::Unix;
-    int socket = -1;
-    std::string address;       ///< for the log
-    std::optional<uid_t> peer; ///< at the other end of a Unix socket
-    bool receiving = true;     ///< a request is arriving, or expected
-    Clock::time_point since = Clock::now();
-    std::string authorization; ///< that has been checked: its user is `caller`
-    std::optional<Caller> caller;
-};
+class Workers;
 
 /// One request, from its head to its log line.
 class Work {
@@ -35,13 +20,17 @@ public:
     using Clock = std::chrono::steady_clock;
 
     HttpRequest http;
-    std::shared_ptr<Connection> connection;
+    ConnectionPointer connection;
     MHD_Connection* handle = nullptr;
     Caller caller;
     Clock::time_point started = Clock::now();
     bool tooLarge = false;
-    std::size_t received = 0;
-    bool replaced = false; ///< another thread took the place of the one that hangs in it
+    Workers* workers = nullptr; ///< those that it was handed to
+    bool replaced = false;      ///< another thread took the place of the one that hangs in it
+
+    /// Takes a piece of the body. Nothing is kept of one that is longer than allowed, and false says that it goes on
+    /// for too long to be read to its end.
+    bool receive(std::string_view piece, std::size_t longest);
 
     /// Once, whoever comes first: the worker, or the watch over those that take too long.
     bool finish(HttpAnswer given);
@@ -53,11 +42,20 @@ public:
     void note(std::string text);
     std::string noted() const;
 
+    /// Who asked what, how it went and how long it took.
+    std::string logLine() const;
+
 private:
     mutable std::mutex mutex;
+    std::size_t received = 0;
     bool finished = false;
     std::string doing;
 };
+
+using WorkPointer = std::shared_ptr<Work>;
+
+/// An answer of HTTP alone. The detail is for the log.
+HttpAnswer plainAnswer(unsigned status, std::string detail);
 
 /// Notes what the provider is asked in the work that the present thread does.
 Ask noting(Ask provider);

@@ -41,14 +41,14 @@ void Workers::work(const std::shared_ptr<Shared>& shared) {
     }
     if (shared->surplus > 0) --shared->surplus;
     --shared->threads;
-    shared->changed.notify_all();
+    shared->ended.notify_all();
 }
 
 bool Workers::post(std::function<void()> job) {
     const std::lock_guard lock(shared->mutex);
     if (shared->stopping || shared->queue.size() >= longest) return false;
     shared->queue.push_back(std::move(job));
-    shared->changed.notify_all();
+    shared->changed.notify_one();
     return true;
 }
 
@@ -72,7 +72,7 @@ bool Workers::stop() {
     shared->stopping = true;
     shared->queue.clear();
     shared->changed.notify_all();
-    return shared->changed.wait_for(lock, std::chrono::seconds(1), [&] { return shared->threads == 0; });
+    return shared->ended.wait_for(lock, std::chrono::seconds(1), [&] { return shared->threads == 0; });
 }
 
 } // namespace endpoint

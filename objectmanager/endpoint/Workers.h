@@ -34,6 +34,7 @@ private:
     struct Shared {
         std::mutex mutex;
         std::condition_variable changed;
+        std::condition_variable ended; ///< a thread
         std::deque<std::function<void()>> queue;
         std::size_t threads = 0;
         std::size_t surplus = 0; ///< threads that are to end

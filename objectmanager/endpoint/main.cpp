@@ -64,11 +64,20 @@ std::chrono::seconds idleOf(const endpoint::Settings& settings) {
                                                                                       : usualIdle);
 }
 
+int makeCertificate(const endpoint::Settings& settings) {
+    std::vector<std::string> names = *settings.makeCertificate;
+    if (names.empty()) names = {hostName(), "localhost", "127.0.0.1", "::1"};
+    endpoint::makeCertificate(names, settings.certificate, settings.key);
+    std::cout << settings.certificate << " and " << settings.key << " are for";
+    for (const std::string& name : names) std::cout << ' ' << name;
+    std::cout << std::endl;
+    return 0;
+}
+
 int serve(const endpoint::Settings& settings) {
     endpoint::ServerSettings served;
     if (!settings.certificate.empty()) {
-        served.certificate = endpoint::contentOf(settings.certificate);
-        served.key = endpoint::contentOf(settings.key);
+        served.certificate = std::make_shared<endpoint::Certificate>(settings.certificate, settings.key);
     }
     served.anonymousRead = settings.anonymousRead;
     const endpoint::SchemaFiles classes(settings.schema);
@@ -104,7 +113,7 @@ int main(int argc, char** argv) {
     if (!parsed.settings) return parsed.exitStatus;
     handleSignals();
     try {
-        return serve(*parsed.settings);
+        return parsed.settings->makeCertificate ? makeCertificate(*parsed.settings) : serve(*parsed.settings);
     } catch (const std::invalid_argument& error) {
         endpoint::log(error.what());
         return unusableConfiguration;

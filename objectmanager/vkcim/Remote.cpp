@@ -45,6 +45,9 @@ public:
         const bool known =
             url.rfind("https://", 0) == 0 || url.rfind("http://", 0) == 0 || url.rfind(unixPrefix, 0) == 0;
         if (!known) throw std::runtime_error("--url: '" + url + "' is neither https://, http:// nor unix:PATH");
+        if (!options.netrcFile.empty() && access(options.netrcFile.c_str(), R_OK) != 0) {
+            throw std::runtime_error("--netrc-file: " + options.netrcFile + " cannot be read"); // libcurl ignores it
+        }
         curl_global_init(CURL_GLOBAL_DEFAULT);
         if (url.rfind(unixPrefix, 0) == 0) {
             socket = url.substr(unixPrefix.size());
@@ -74,12 +77,18 @@ public:
             headers = curl_slist_append(headers, header.c_str());
         }
         curl_easy_setopt(handle, CURLOPT_HTTPHEADER, headers);
+        char trouble[CURL_ERROR_SIZE] = "";
+        curl_easy_setopt(handle, CURLOPT_ERRORBUFFER, trouble);
         const CURLcode sent = curl_easy_perform(handle);
+        curl_easy_setopt(handle, CURLOPT_ERRORBUFFER, nullptr);
         long status = 0;
         curl_easy_getinfo(handle, CURLINFO_RESPONSE_CODE, &status);
         curl_slist_free_all(headers);
         putBack(handle);
-        if (sent != CURLE_OK) throw om::LoadError(options.url + ": " + curl_easy_strerror(sent));
+        if (sent != CURLE_OK) {
+            // The text says what is wrong with a certificate; the code only that something is.
+            throw om::LoadError(options.url + ": " + (trouble[0] != '\0' ? trouble : curl_easy_strerror(sent)));
+        }
         if (status != 200) throw om::LoadError(options.url + ": HTTP status " + std::to_string(status) + error);
         return remoteAnswer(body, request, schema);
     }

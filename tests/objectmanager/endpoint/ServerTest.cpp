@@ -1,155 +1,17 @@
 #include "objectmanager/endpoint/Server.h"
-#include "objectmanager/endpoint/Work.h"
 
-#include "support/TemporaryDirectory.h"
-#include "tests/objectmanager/cimxml/Messages.h"
+#include "tests/objectmanager/endpoint/RunningServer.h"
 
 #include <gmock/gmock.h>
-
-#include <poll.h>
-#include <sys/socket.h>
-#include <sys/un.h>
-#include <unistd.h>
-
-#include <condition_variable>
-#include <thread>
 
 namespace endpoint {
 namespace {
 
-using cimxml::className;
-using cimxml::parameter;
+using testing::AllOf;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-/// A client's end of a connection.
-class Client {
-public:
-    explicit Client(const std::string& path) : socket(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
-        sockaddr_un address{};
-        address.sun_family = AF_UNIX;
-        std::copy(path.begin(), path.end(), address.sun_path);
-        EXPECT_EQ(connect(socket, reinterpret_cast<const sockaddr*>(&address), sizeof address), 0);
-    }
-    ~Client() { close(socket); }
-    Client(const Client&) = delete;
-    Client& operator=(const Client&) = delete;
-
-    void send(const std::string& text) const {
-        EXPECT_EQ(::send(socket, text.data(), text.size(), MSG_NOSIGNAL), static_cast<ssize_t>(text.size()));
-    }
-
-    /// One answer, its head and its body; what came so far where the connection ends.
-    std::string receive() {
-        for (;;) {
-            const std::size_t end = buffer.find("\r\n\r\n");
-            if (end != std::string::npos) {
-                const std::size_t at = buffer.find("Content-Length: ");
-                const std::size_t length = at < end ? std::stoul(buffer.substr(at + 16)) : 0;
-                if (buffer.size() >= end + 4 + length) return take(end + 4 + length);
-            }
-            char bytes[65536];
-            const ssize_t count = recv(socket, bytes, sizeof bytes, 0);
-            if (count <= 0) return take(buffer.size());
-            buffer.append(bytes, static_cast<std::size_t>(count));
-        }
-    }
-
-    /// The one of two that has got something.
-    friend Client& waitForEither(Client& a, Client& b) {
-        pollfd both[] = {{a.socket, POLLIN, 0}, {b.socket, POLLIN, 0}};
-        poll(both, 2, -1);
-        return both[0].revents != 0 ? a : b;
-    }
-
-    std::string ask(const std::string& text) {
-        send(text);
-        return receive();
-    }
-
-private:
-    std::string take(std::size_t length) {
-        std::string taken = buffer.substr(0, length);
-        buffer.erase(0, length);
-        return taken;
-    }
-
-    int socket;
-    std::string buffer;
-};
-
-std::string head(const std::string& more, const std::string& operation = "EnumerateInstanceNames") {
-    return "POST /cimom HTTP/1.1\r\nHost: x\r\nContent-Type: application/xml\r\nCIMOperation: MethodCall\r\n"
-           "CIMMethod: " +
-           operation + "\r\nCIMObject: root%2Fcimv2\r\n" + more + "\r\n";
-}
-
-std::string body(const std::string& name) {
-    return cimxml::intrinsic("EnumerateInstanceNames", parameter("ClassName", className(name)));
-}
-
-std::string request(const std::string& name = "VESKA_ComputerSystem") {
-    return head("Content-Length: " + std::to_string(body(name).size()) + "\r\n") + body(name);
-}
-
-/// A server with a provider that hangs in the class VESKA_TimeService until the end of the test.
-class ServerFixture : public testing::Test {
-protected:
-    void start(const Limits& limits = {}) {
-        ServerSettings settings;
-        settings.limits = limits;
-        settings.anonymousRead = true; // whoever runs the tests
-        server.emplace(operations, settings);
-        server->serve(listenAt(ListenUrl("unix:" + path)));
-        running = std::thread([this] { server->run(stopped, std::chrono::seconds(0)); });
-    }
-
-    void TearDown() override {
-        release();
-        stopped = true;
-        if (running.joinable()) running.join();
-        EXPECT_TRUE(server->shutDown());
-    }
-
-    void release() {
-        const std::lock_guard lock(mutex);
-        released = true;
-        changed.notify_all();
-    }
-
-    om::Answer provide(const om::Request& asked) {
-        std::unique_lock lock(mutex);
-        if (asked.path.className == "VESKA_TimeService") {
-            ++hanging;
-            changed.notify_all();
-            changed.wait(lock, [&] { return released; });
-        }
-        om::Answer answer;
-        answer.results.emplace_back(asked.path);
-        return answer;
-    }
-
-    void waitForHanging(int count) {
-        std::unique_lock lock(mutex);
-        changed.wait(lock, [&] { return hanging >= count; });
-    }
-
-    support::TemporaryDirectory directory;
-    std::string path = directory.path("socket");
-    Operations operations{{{"root/cimv2", {}, &om::Schema::builtin(), noting([this](const om::Request& asked) {
-                                return provide(asked);
-                            })}},
-                          "host1"};
-    std::optional<Server> server;
-    std::atomic<bool> stopped{false};
-    std::thread running;
-    std::mutex mutex;
-    std::condition_variable changed;
-    bool released = false;
-    int hanging = 0;
-};
-
-using ServerTest = ServerFixture;
+using ServerTest = RunningServer;
 
 TEST_F(ServerTest, ServesSeveralRequestsOverOneConnection) {
     start();
@@ -251,11 +113,27 @@ TEST_F(ServerTest, ASlowSenderIsCutOff) {
     EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME"));
 }
 
-TEST_F(ServerTest, ClientsThatGoAwayDoNoHarm) {
+TEST_F(ServerTest, AClientThatDoesNotTakeItsAnswerIsCutOff) {
+    Limits limits;
+    limits.taking = std::chrono::milliseconds(300);
+    results = 20000; // more than the socket holds
+    testing::internal::CaptureStderr();
+    start(limits);
+    Client slow(path);
+    slow.send(request());
+    slow.waitForEnd(); // and reads nothing until then
+    results = 1;
+    EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME")); // by the thread that wrote the line before
+    EXPECT_THAT(testing::internal::GetCapturedStderr(),
+                AllOf(HasSubstr("http=200 cim=0"), HasSubstr("the client did not take the answer")));
+}
+
+TEST_F(ServerTest, LargeAnswersComeWhole) {
+    results = 20000;
     start();
-    const std::string whole = request();
-    for (std::size_t i = 0; i < 200; ++i) Client(path).send(whole.substr(0, i * whole.size() / 199));
-    EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME"));
+    const std::string answer = Client(path).ask(request());
+    EXPECT_GT(answer.size(), std::size_t{1} << 20U);
+    EXPECT_THAT(answer.substr(answer.size() - 6), "</CIM>");
 }
 
 TEST(ServerOverTcp, WantsAUser) {

@@ -74,6 +74,18 @@ TEST_F(SettingsFile, TheCommandLineGoesBeforeTheFile) {
     EXPECT_TRUE(parsed.settings->foreground);
 }
 
+TEST_F(SettingsFile, ACertificateIsMadeForNamesOrForTheHost) {
+    const std::string files = "certificate = \"/c\"\nkey = \"/k\"\n";
+    const ParsedSettings named = parse(files, {"--make-certificate", "host1.example", "192.0.2.1"});
+    ASSERT_TRUE(named.settings && named.settings->makeCertificate) << named.error;
+    EXPECT_THAT(*named.settings->makeCertificate, testing::ElementsAre("host1.example", "192.0.2.1"));
+    const ParsedSettings host = parse(files, {"--make-certificate"});
+    ASSERT_TRUE(host.settings && host.settings->makeCertificate) << host.error;
+    EXPECT_THAT(*host.settings->makeCertificate, testing::IsEmpty());
+    EXPECT_FALSE(parse(files).settings->makeCertificate);
+    EXPECT_THAT(parse("", {"--make-certificate"}).error, HasSubstr("--certificate"));
+}
+
 TEST_F(SettingsFile, WhatCannotBeUsedIsSaid) {
     struct {
         const char* content;

@@ -1,7 +1,7 @@
 // A provider that answers with what it was asked, for tests of the command line. The class asked for chooses more:
 // Echo_Everything has every type, Echo_Fail and Echo_Odd answer errors, Echo_Flaky fails every second time,
 // Echo_Crowd says how many calls were inside at once, Echo_Missing knows no instance, Echo_Quiet takes changes without
-// a word. With ECHO_LOUD in the environment it prints on standard output in every way that there is.
+// a word, Echo_Crash ends the process. With ECHO_LOUD in the environment it prints on standard output in every way that there is.
 #include <cmpift.h>
 
 #include <atomic>
@@ -128,6 +128,7 @@ CMPIStatus trouble(const CMPIObjectPath* path, bool& answered) {
     const std::string name = classOf(path);
     const unsigned call = ++calls;
     answered = true;
+    if (name == "Echo_Crash") std::abort();
     if (name == "Echo_Fail") return status(CMPI_RC_ERR_FAILED, "asked to\x1b fail");
     if (name == "Echo_Odd") return status(static_cast<CMPIrc>(77));
     if (name == "Echo_Flaky" && call % 2 == 0) return status(CMPI_RC_ERR_FAILED);

@@ -1,0 +1,70 @@
+#include "objectmanager/endpoint/Authentication.h"
+
+#include "objectmanager/endpoint/Rights.h"
+
+namespace endpoint {
+namespace {
+
+HttpAnswer challenge(const std::string& detail) {
+    HttpAnswer answer = plainAnswer(401, detail);
+    answer.headers.emplace_back("WWW-Authenticate", "Basic realm=\"vkcimd\"");
+    return answer;
+}
+
+std::string authorizationOf(const HttpRequest& request) {
+    return headerOf(request, "Authorization").value_or("");
+}
+
+} // namespace
+
+Authentication::Authentication(bool anonymous) : anonymousRead(anonymous) {}
+
+bool Authentication::mayBeAnonymous(const Connection& connection) const {
+    return anonymousRead && connection.kind == Listener::Kind::Http;
+}
+
+std::optional<HttpAnswer> Authentication::refuseHead(const Work& work) const {
+    const bool named = work.connection->kind == Listener::Kind::Unix || headerOf(work.http, "Authorization");
+    if (!named && !mayBeAnonymous(*work.connection)) return challenge("no user is named");
+    return std::nullopt;
+}
+
+bool Authentication::takesPassword(const Work& work) {
+    const Connection& connection = *work.connection;
+    const std::string authorization = authorizationOf(work.http);
+    return connection.kind != Listener::Kind::Unix && !authorization.empty() &&
+           (!connection.caller || authorization != connection.authorization);
+}
+
+Caller Authentication::callerOf(const Work& work) const {
+    Connection& connection = *work.connection;
+    Caller caller;
+    if (connection.kind == Listener::Kind::Unix) {
+        if (!connection.caller) connection.caller = connection.peer ? rightsOf(*connection.peer) : Caller();
+        caller = *connection.caller;
+        caller.mayRead = caller.mayRead || anonymousRead;
+    } else if (authorizationOf(work.http).empty()) {
+        caller.mayRead = mayBeAnonymous(connection);
+    } else {
+        caller = *connection.caller;
+    }
+    caller.address = connection.address;
+    return caller;
+}
+
+std::string claimedUser(const HttpRequest& request) {
+    const auto credentials = basicCredentials(authorizationOf(request));
+    return credentials ? credentials->first : std::string();
+}
+
+PasswordCheck checkPassword(const HttpRequest& request) {
+    const auto credentials = basicCredentials(authorizationOf(request));
+    if (!credentials) return {std::nullopt, challenge("credentials that cannot be read")};
+    const auto& [user, password] = *credentials;
+    if (!isAuthentic(user, password)) return {std::nullopt, challenge("authentication failed")};
+    Caller caller = rightsOf(user);
+    caller.user = user;
+    return {std::move(caller), {}};
+}
+
+} // namespace endpoint

@@ -1,0 +1,42 @@
+#pragma once
+
+#include "objectmanager/endpoint/Work.h"
+
+#include <optional>
+#include <string>
+
+namespace endpoint {
+
+/// Says who asks: from the socket, or from user and password.
+class Authentication {
+public:
+    /// Whether everybody may read over the loopback and the Unix socket.
+    explicit Authentication(bool anonymousRead);
+
+    /// What can be said without the body: that a user has to be named.
+    std::optional<HttpAnswer> refuseHead(const Work& work) const;
+
+    /// Whether a password has to be checked before it is known who asks.
+    static bool takesPassword(const Work& work);
+
+    /// Who asks, where no password has to be checked.
+    Caller callerOf(const Work& work) const;
+
+private:
+    bool mayBeAnonymous(const Connection& connection) const;
+
+    bool anonymousRead;
+};
+
+/// What became of a password.
+struct PasswordCheck {
+    std::optional<Caller> caller; ///< empty where it was refused
+    HttpAnswer refusal;
+};
+
+/// The user that the request names; empty for none.
+std::string claimedUser(const HttpRequest& request);
+/// Takes as long as PAM does.
+PasswordCheck checkPassword(const HttpRequest& request);
+
+} // namespace endpoint

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <chrono>
+#include <cstddef>
+
+namespace endpoint {
+
+/// What a client may make use of.
+struct Limits {
+    std::size_t body = std::size_t{1} << 20U;
+    std::size_t head = std::size_t{16} << 10U;
+    unsigned connections = 64; ///< of all listeners together
+    unsigned connectionsPerAddress = 8;
+    std::chrono::milliseconds arrival = std::chrono::seconds(30); ///< of a whole request
+    std::chrono::milliseconds answer = std::chrono::seconds(60);
+    std::chrono::milliseconds taking = std::chrono::seconds(60); ///< an answer that is ready
+    std::size_t workers = 8;
+    std::size_t passwordChecks = 4; ///< at once
+    std::size_t queue = 64;
+};
+
+} // namespace endpoint
