@@ -6,7 +6,6 @@ configured. Started by the service manager when somebody asks.")
 
 set(endpoint_scripts ${CMAKE_SOURCE_DIR}/packaging/endpoint)
 set(CPACK_DEBIAN_ENDPOINT_PACKAGE_DEPENDS "vk-baseserver-provider (= ${PROJECT_VERSION}), adduser, libpam-modules, libpam-runtime")
-set(CPACK_DEBIAN_ENDPOINT_PACKAGE_RECOMMENDS openssl) # for vkcimd-certificate
 set(CPACK_DEBIAN_ENDPOINT_PACKAGE_SUGGESTS sblim-wbemcli)
 set(CPACK_DEBIAN_ENDPOINT_PACKAGE_CONTROL_EXTRA ${endpoint_scripts}/debian/postinst ${endpoint_scripts}/debian/prerm
     ${endpoint_scripts}/debian/postrm ${endpoint_scripts}/debian/conffiles)

@@ -77,8 +77,6 @@ install(FILES docs/examples/rack-server.json DESTINATION ${VK_SHARE_DIR}/example
 if(VK_ENDPOINT)
     install(TARGETS vkcimd RUNTIME DESTINATION ${CMAKE_INSTALL_SBINDIR} COMPONENT endpoint)
     vk_configured(docs/man/vkcimd.8.in ${CMAKE_INSTALL_MANDIR}/man8 endpoint FILES)
-    vk_configured(tools/endpoint/vkcimd-certificate.in ${CMAKE_INSTALL_SBINDIR} endpoint PROGRAMS)
-    vk_configured(docs/man/vkcimd-certificate.8.in ${CMAKE_INSTALL_MANDIR}/man8 endpoint FILES)
     vk_configured(packaging/endpoint/vkcimd.service.in lib/systemd/system endpoint FILES)
     install(FILES packaging/endpoint/vkcimd.socket DESTINATION lib/systemd/system COMPONENT endpoint)
     install(FILES packaging/endpoint/vkcimd.conf DESTINATION ${CMAKE_INSTALL_SYSCONFDIR} COMPONENT endpoint)

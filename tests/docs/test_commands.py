@@ -24,7 +24,6 @@ ELSEWHERE = {
     "packaging/build": "tests/system/packages",
     "sudo apt-get": "tests/system/packages",
     "sudo systemctl": "tests/system/fleet",
-    "sudo vkcimd-certificate": "tests/system/installed_endpoint",
     "printf": "tests/system/installed_endpoint",
     "wbemcli": "tests/system/installed_endpoint",
     "vkcim --url unix:": "tests/system/installed_endpoint",

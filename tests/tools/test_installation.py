@@ -15,7 +15,7 @@ install(PREFIX)
 LIBRARIES = ["nvlog", "vkcommon", "vkproduct", "vkinstrumentation", "vkproviderutilities",
              "vknabaseserverprofileprovider"]
 # Of a tree with VK_ENDPOINT=ON.
-ENDPOINT = ["sbin/vkcimd", "sbin/vkcimd-certificate", "share/man/man8/vkcimd.8", "share/man/man8/vkcimd-certificate.8",
+ENDPOINT = ["sbin/vkcimd", "share/man/man8/vkcimd.8",
             "lib/systemd/system/vkcimd.service", "lib/systemd/system/vkcimd.socket",
             "etc/vkcimd.conf", "etc/pam.d/vkcimd"] if (BUILD / "bin/vkcimd").exists() else []
 EXAMPLE = PREFIX / "share/vk-baseserver/examples/rack-server.json"
