@@ -27,6 +27,8 @@ ELSEWHERE = {
     "printf": "tests/system/installed_endpoint",
     "wbemcli": "tests/system/installed_endpoint",
     "vkcim --url unix:": "tests/system/installed_endpoint",
+    "vkcim --url https:": "tests/system/endpoint_https",
+    "vkcimd --make-certificate": "tests/system/installed_endpoint",
     "cmake --install": "tests/tools/test_installation.py",
     "cmake --build": ".ci/run",
     "vk-provider-register": "tests/tools/test_register.py",
