@@ -1,5 +1,9 @@
 #include "objectmanager/vkcim/Facts.h"
 
+#include "objectmanager/model/TypeNames.h"
+
+#include <fmt/format.h>
+
 #include <string_view>
 
 namespace vkcim {
@@ -79,6 +83,22 @@ std::vector<om::Instance> instancesOf(const std::string& className, const Report
     return instances;
 }
 
+/// The name of the first computer. That of a report stands for one that has none, too.
+std::optional<std::string> hostOf(const std::vector<om::Instance>& computers) {
+    const om::Value* name = computers.empty() ? nullptr : om::findValue(computers.front().path.keys, "Name");
+    const auto* known = name != nullptr && isKnownText(*name) ? std::get_if<std::string>(&name->data) : nullptr;
+    return known != nullptr ? std::optional(*known) : std::nullopt;
+}
+
+/// A class that is answered with an error would look like one of which the host has nothing.
+std::vector<std::string> errorNotes(const Report& report) {
+    std::vector<std::string> notes;
+    for (const auto& [name, answer] : report.classes)
+        if (answer.code != CMPI_RC_OK)
+            notes.push_back(fmt::format("no {}: {} ({})", name, om::statusName(answer.code), int{answer.code}));
+    return notes;
+}
+
 } // namespace
 
 Facts gatherFacts(const om::Schema& schema, const std::string& nameSpace,
@@ -94,8 +114,9 @@ Facts gatherFacts(const om::Schema& schema, const std::string& nameSpace,
     facts.computers = instancesOf(computerClass, report, schema);
     facts.chassis = instancesOf(chassisClass, report, schema);
     facts.timeServices = instancesOf(timeServiceClass, report, schema);
-    if (!facts.computers.empty()) facts.host = report.host;
-    facts.notes = report.notes;
+    facts.host = hostOf(facts.computers);
+    facts.notes = errorNotes(report);
+    facts.notes.insert(facts.notes.end(), report.notes.begin(), report.notes.end());
     facts.version = report.version;
     facts.time = report.time;
     return facts;

@@ -48,7 +48,7 @@ def is_unknown(value, words):
 
 def expected_of(report):
     """The flat object that a report in JSON stands for, but what is of the moment."""
-    facts = {key: report[key] for key in ("host", "version")}
+    facts = {"version": report["version"]}
     for name, prefix in PREFIXES.items():
         for at, instance in enumerate(report["classes"][name]["results"]):
             for key, typed in instance["properties"].items():
@@ -62,8 +62,8 @@ def expected_of(report):
                         words if isinstance(value, list) else words[0]
     if "computer_HealthState_word" in facts:
         facts["health"] = facts["computer_HealthState_word"]
-    if not report["classes"]["VESKA_ComputerSystem"]["results"]:
-        del facts["host"]
+    if "computer_Name" in facts:
+        facts["host"] = facts["computer_Name"]
     return facts
 
 
@@ -99,6 +99,10 @@ def without_texts(nodes):
         node["properties"] = {key: "" if isinstance(value, str) else value for key, value in node["properties"].items()
                               if key != "108"}
     nodes[0]["properties"]["108"] = "node7"
+
+
+def without_name(nodes):
+    del nodes[0]["properties"]["108"]
 
 
 def two_chassis(nodes):
@@ -153,6 +157,10 @@ class Facts(Temporary):
         facts = facts_of(VK_INSTRUMENTATION_ROOT="/nowhere")
         self.assertIn("/nowhere: No such file or directory", facts["notes"])
         self.assertFalse([key for key in facts if key.startswith(("computer", "chassis", "host", "health"))])
+
+    def test_of_a_host_without_a_name_have_no_host(self):
+        for environment in (self.changed(without_name), {"VK_INSTRUMENTATION_ROOT": str(self.directory)}):
+            self.assertNotIn("host", self.compare(environment), environment)
 
     def test_hold_the_hosts_own_time_and_offset(self):
         (self.directory / "etc").mkdir()

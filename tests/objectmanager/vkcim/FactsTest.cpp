@@ -40,6 +40,22 @@ TEST(Facts, LeaveOutWhatIsNotKnown) {
     EXPECT_FALSE(facts.contains("health"));
 }
 
+TEST(Facts, HaveNoHostWhoseNameIsNotKnown) {
+    for (const char* name : {"", "Unknown"}) EXPECT_FALSE(jsonOf(factsOf({}, {}, name)).contains("host")) << name;
+    EXPECT_FALSE(jsonOf(factsFrom([](const om::Request&) { return om::Answer(); })).contains("host"));
+}
+
+TEST(Facts, NoteEachClassThatIsAnsweredWithAnError) {
+    const json facts = jsonOf(factsFrom([](const om::Request& request) {
+        om::Answer answer;
+        if (request.path.className != "VESKA_TimeService") answer.code = CMPI_RC_ERR_ACCESS_DENIED;
+        return answer;
+    }));
+    EXPECT_EQ(facts.at("notes"), json({"no VESKA_ComputerSystem: CMPI_RC_ERR_ACCESS_DENIED (2)",
+                                       "no VESKA_PhysicalPackage: CMPI_RC_ERR_ACCESS_DENIED (2)",
+                                       "no UUID: the host has none", "time service: NTP daemon running"}));
+}
+
 TEST(Facts, KeepIdentifiersAndTheirDescriptionsTogether) {
     const json facts = jsonOf(
         factsOf({{"OtherIdentifyingInfo", list(CMPI_stringA, {text("a"), text(""), text("c")})},

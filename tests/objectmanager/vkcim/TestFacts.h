@@ -21,22 +21,13 @@ inline om::Value list(CMPIType type, std::vector<om::Value> elements) {
     return {type, std::move(elements)};
 }
 
-inline om::Instance instance(const char* className, std::vector<om::NamedValue> properties) {
-    return {{"", testNameSpace, className, {{"Name", text("node7")}}}, std::move(properties)};
+inline om::Instance instance(const char* className, std::vector<om::NamedValue> properties,
+                             const char* name = "node7") {
+    return {{"", testNameSpace, className, {{"Name", text(name)}}}, std::move(properties)};
 }
 
-/// The facts of a host whose computer and chassis have these properties.
-inline Facts factsOf(const std::vector<om::NamedValue>& computer,
-                     const std::vector<std::vector<om::NamedValue>>& chassis = {}) {
-    const auto run = [&](const om::Request& request) {
-        om::Answer answer;
-        if (request.path.className == "VESKA_ComputerSystem")
-            answer.results.emplace_back(instance("VESKA_ComputerSystem", computer));
-        if (request.path.className == "VESKA_PhysicalPackage")
-            for (const auto& each : chassis) answer.results.emplace_back(instance("VESKA_PhysicalPackage", each));
-        EXPECT_EQ(request.operation, om::Operation::EnumInstances) << "facts change nothing";
-        return answer;
-    };
+/// The facts of a host that answers so.
+inline Facts factsFrom(const std::function<om::Answer(const om::Request&)>& run) {
     return gatherFacts(
         om::Schema::builtin(), testNameSpace, {}, run,
         [] {
@@ -45,6 +36,20 @@ inline Facts factsOf(const std::vector<om::NamedValue>& computer,
         [] {
             return std::vector<std::string>{"no UUID: the host has none", "time service: NTP daemon running"};
         });
+}
+
+/// The facts of a host whose computer and chassis have these properties.
+inline Facts factsOf(const std::vector<om::NamedValue>& computer,
+                     const std::vector<std::vector<om::NamedValue>>& chassis = {}, const char* name = "node7") {
+    return factsFrom([&](const om::Request& request) {
+        om::Answer answer;
+        if (request.path.className == "VESKA_ComputerSystem")
+            answer.results.emplace_back(instance("VESKA_ComputerSystem", computer, name));
+        if (request.path.className == "VESKA_PhysicalPackage")
+            for (const auto& each : chassis) answer.results.emplace_back(instance("VESKA_PhysicalPackage", each));
+        EXPECT_EQ(request.operation, om::Operation::EnumInstances) << "facts change nothing";
+        return answer;
+    });
 }
 
 } // namespace vkcim
