@@ -52,6 +52,7 @@ std::string stateSet(const std::string& name, const std::string& help, const Fac
     const om::PropertyDeclaration* declared = schema.findProperty(className, property);
     if (declared == nullptr) return {};
     const std::vector<std::string_view> states = schema.wordsFor(className, {property, *value});
+    if (std::all_of(states.begin(), states.end(), [](std::string_view word) { return word.empty(); })) return {};
     std::string samples;
     for (const std::string_view word : om::textsOf(declared->qualifiers, "Values")) {
         if (word == unknownWord) continue; // who is in it has no such metric
@@ -128,7 +129,9 @@ std::optional<std::string> missingSource(const std::string& note) {
     constexpr std::string_view missing = "no ";
     const std::string subject = note.substr(0, note.find(": "));
     if (subject == note || subject == "time service") return std::nullopt;
-    return subject.substr(subject.compare(0, missing.size(), missing) == 0 ? missing.size() : 0);
+    if (subject.compare(0, missing.size(), missing) != 0) return subject;
+    const bool isCommand = subject.find('/') != std::string::npos;
+    return isCommand ? std::nullopt : std::optional(subject.substr(missing.size()));
 }
 
 std::string metricsText(const Facts& facts, const om::Schema& schema, bool withSerials) {

@@ -10,7 +10,7 @@ namespace vkcim {
 std::string metricsText(const Facts& facts, const om::Schema& schema, bool withSerials);
 
 /// What a note says is missing: `UUID` of `no UUID: …`, or the file that has a fault. Nothing for the note on the
-/// time service.
+/// time service, and for a missing command: it serves a class that is no part of the facts, and most hosts have none.
 std::optional<std::string> missingSource(const std::string& note);
 
 } // namespace vkcim

@@ -48,6 +48,14 @@ vk_report_timestamp_seconds 1795240800
 )");
 }
 
+TEST(Metrics, LeaveOutStatesThatTheSchemaHasNoWordFor) {
+    EXPECT_THAT(metrics(factsOf({{"HealthState", number(4711)}})), Not(HasSubstr("vk_computer_health")));
+    EXPECT_THAT(metrics(factsOf({{"OperationalStatus", list(CMPI_uint16A, {number(4711), number(4712)})}})),
+                Not(HasSubstr("vk_computer_operational_status")));
+    EXPECT_THAT(metrics(factsOf({{"OperationalStatus", list(CMPI_uint16A, {number(4711), number(3)})}})),
+                HasSubstr("{vk_computer_operational_status=\"Degraded\"} 1"));
+}
+
 TEST(Metrics, LeaveOutAnOffsetThatIsNotKnown) {
     Facts facts = factsOf({});
     EXPECT_THAT(metrics(facts), HasSubstr("vk_time_offset_minutes -300\n"));
@@ -73,7 +81,9 @@ TEST(Metrics, TakeWhatIsMissingFromTheNotes) {
         {"no UUID: the host has none", "UUID"},
         {"no SMBIOS tables: /sys/firmware/dmi/tables/DMI may be read by root alone", "SMBIOS tables"},
         {"/sys/firmware/dmi/tables/DMI: the table ends early", "/sys/firmware/dmi/tables/DMI"},
+        {"no VESKA_ComputerSystem: CMPI_RC_ERR_ACCESS_DENIED (2)", "VESKA_ComputerSystem"},
         {"time service: NTP daemon running", std::nullopt},
+        {"no /usr/sbin/cimconfig: the delivery settings of the CIM server read as 0", std::nullopt},
         {"a note", std::nullopt},
         {"", std::nullopt}};
     for (const auto& [note, source] : notes) EXPECT_EQ(missingSource(note), source) << note;
