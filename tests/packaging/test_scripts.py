@@ -7,7 +7,8 @@ import unittest
 from pathlib import Path
 
 SCRIPTS = Path(os.environ["VK_BUILD_DIR"]) / "packaging"
-ENDPOINT = Path(__file__).resolve().parents[2] / "packaging/endpoint"
+PACKAGING = Path(__file__).resolve().parents[2] / "packaging"
+ENDPOINT = PACKAGING / "endpoint"
 
 
 class Registration(unittest.TestCase):
@@ -92,6 +93,41 @@ class Endpoint(unittest.TestCase):
         self.assertFalse([call for call in self.calls("debian/postrm", "remove") if call.startswith("groupdel")])
         purging = self.calls("debian/postrm", "purge")
         self.assertEqual([call for call in purging if call.startswith("groupdel")], ["groupdel vkcim", "groupdel vkcim-admin"])
+
+
+class Metrics(unittest.TestCase):
+    def run_script(self, script, *words, status=0, running=True):
+        """What the script has systemctl do where a service manager runs, whether the metrics stay, and what it complains of."""
+        with tempfile.TemporaryDirectory() as directory:
+            place = Path(directory)
+            (place / "vk.prom").touch()
+            (place / "systemctl").write_text(f'#!/bin/sh\necho "$*" >>{place}/calls\nexit {status}\n', encoding="ascii")
+            (place / "systemctl").chmod(0o755)
+            text = (PACKAGING / "metrics" / script).read_text(encoding="utf-8")
+            text = text.replace("/run/systemd/system", directory if running else f"{directory}/none")
+            text = text.replace("/var/lib/prometheus/node-exporter", directory)
+            done = subprocess.run(["sh", "-c", text, script, *words], env={"PATH": f"{directory}:/usr/bin:/bin"},
+                                  capture_output=True, text=True, check=False)
+            self.assertEqual(done.returncode, 0, script)
+            calls = place / "calls"
+            return (calls.read_text(encoding="ascii").splitlines() if calls.exists() else [], (place / "vk.prom").exists(), done.stderr)
+
+    def test_removing_disables_the_timer_and_takes_the_metrics(self):
+        for words in (["prerm", "remove"], ["prerm", "deconfigure", "in-favour"], ["preun", "0"]):
+            with self.subTest(words):
+                self.assertEqual(self.run_script(*words), (["disable --now vk-metrics.timer"], False, ""))
+                self.assertEqual(self.run_script(*words, running=False), ([], False, ""))
+
+    def test_a_timer_that_cannot_be_disabled_fails_no_removal(self):
+        for words in (["prerm", "remove"], ["preun", "0"]):
+            with self.subTest(words):
+                self.assertEqual(self.run_script(*words, status=1), (
+                    ["disable --now vk-metrics.timer"], False, "vk-metrics.timer could not be disabled.\n"))
+
+    def test_an_upgrade_leaves_both(self):
+        for words in (["prerm", "upgrade", "2.0.0"], ["prerm", "failed-upgrade", "1.0.0"], ["preun", "1"]):
+            with self.subTest(words):
+                self.assertEqual(self.run_script(*words), ([], True, ""))
 
 
 if __name__ == "__main__":
