@@ -56,10 +56,6 @@ void dropUnknownIdentifiers(std::vector<om::NamedValue>& properties) {
     }
 }
 
-bool namesClass(const std::string& property) {
-    return om::sameName(property, "CreationClassName") || om::sameName(property, "SystemCreationClassName");
-}
-
 om::Instance whatIsKnown(om::Instance instance, const om::Schema& schema) {
     dropUnknownIdentifiers(instance.properties);
     std::vector<om::NamedValue> known;

@@ -20,8 +20,8 @@ struct Facts {
     std::vector<om::Instance> timeServices;
     HostClock clock;
     std::vector<std::string> notes;
-    std::string version; ///< of this program
-    std::string time;    ///< of the end, in UTC: `2026-11-21T06:00:00Z`
+    std::string version;  ///< of this program
+    std::time_t time = 0; ///< of the end
 };
 
 /// Asks for the instances, and `clock` before the notes. The rest is as for makeReport. The clock is not the time

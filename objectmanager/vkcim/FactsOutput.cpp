@@ -77,7 +77,7 @@ std::string factsText(const Facts& facts, const std::string& nameSpace, const om
     Members members(nameSpace, schema);
     if (facts.host) members.addText("host", *facts.host);
     members.addText("version", facts.version);
-    members.addText("time", facts.time);
+    members.addText("time", utcText(facts.time));
     if (const std::string_view health = healthOf(facts, schema); !health.empty()) members.addText("health", health);
     members.addAll("computer", facts.computers);
     members.addAll("chassis", facts.chassis);

@@ -36,7 +36,7 @@ public:
 
     std::string report(const Report& report) const {
         return object({member("host", jsonString(report.host)), member("version", jsonString(report.version)),
-                       member("time", jsonString(report.time)), member("classes", answers(report.classes)),
+                       member("time", jsonString(utcText(report.time))), member("classes", answers(report.classes)),
                        member("associations", answers(report.associations)),
                        member("notes", list(report.notes, [](const std::string& note) { return jsonString(note); }))});
     }

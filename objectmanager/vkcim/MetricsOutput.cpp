@@ -4,7 +4,6 @@
 #include "objectmanager/vkcim/Utf8.h"
 
 #include <algorithm>
-#include <ctime>
 #include <set>
 
 namespace vkcim {
@@ -118,9 +117,7 @@ std::string missingSources(const Facts& facts) {
 
 std::string timestamp(const Facts& facts) {
     const std::string name = "vk_report_timestamp_seconds";
-    std::tm parts{};
-    if (strptime(facts.time.c_str(), "%Y-%m-%dT%H:%M:%SZ", &parts) == nullptr) return {};
-    return family(name, "When this was made, in seconds since 1970.", sample(name, {}, std::to_string(timegm(&parts))));
+    return family(name, "When this was made, in seconds since 1970.", sample(name, {}, std::to_string(facts.time)));
 }
 
 } // namespace

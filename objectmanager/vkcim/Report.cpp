@@ -6,8 +6,6 @@
 
 #include <algorithm>
 #include <array>
-#include <ctime>
-#include <string_view>
 
 namespace vkcim {
 namespace {
@@ -39,21 +37,9 @@ std::string hostName(const Report::Answers& classes) {
     return "without a name";
 }
 
-std::string timeNow() {
-    const std::time_t now = std::time(nullptr);
-    std::tm parts{};
-    gmtime_r(&now, &parts);
-    std::array<char, 32> text;
-    return {text.data(), std::strftime(text.data(), text.size(), "%Y-%m-%dT%H:%M:%SZ", &parts)};
-}
-
 om::ObjectPath withoutClassNames(om::ObjectPath path) {
-    constexpr std::string_view end = "CreationClassName";
-    const auto namesClass = [&](const om::NamedValue& key) {
-        const std::string_view name = key.first;
-        return name.size() >= end.size() && om::sameName(name.substr(name.size() - end.size()), end);
-    };
-    path.keys.erase(std::remove_if(path.keys.begin(), path.keys.end(), namesClass), path.keys.end());
+    const auto isClass = [](const om::NamedValue& key) { return namesClass(key.first); };
+    path.keys.erase(std::remove_if(path.keys.begin(), path.keys.end(), isClass), path.keys.end());
     return path;
 }
 
@@ -68,6 +54,18 @@ std::string referenceText(const om::Instance& instance, const char* name, const 
 }
 
 } // namespace
+
+std::string utcText(std::time_t time) {
+    std::tm parts{};
+    gmtime_r(&time, &parts);
+    std::array<char, 32> text;
+    return {text.data(), std::strftime(text.data(), text.size(), "%Y-%m-%dT%H:%M:%SZ", &parts)};
+}
+
+bool namesClass(std::string_view name) {
+    constexpr std::string_view end = "CreationClassName";
+    return name.size() >= end.size() && om::sameName(name.substr(name.size() - end.size()), end);
+}
 
 Subjects everythingServed(const om::Schema& schema) {
     return {schema.servedClasses(), schema.servedAssociations()};
@@ -95,7 +93,7 @@ Report makeReport(const Subjects& subjects, const std::string& nameSpace,
     report.associations = ask(subjects.associations);
     report.notes = notes();
     report.version = VKCIM_VERSION;
-    report.time = timeNow();
+    report.time = std::time(nullptr);
     return report;
 }
 

@@ -2,9 +2,11 @@
 
 #include "objectmanager/broker/ObjectManager.h"
 
+#include <ctime>
 #include <functional>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -17,9 +19,15 @@ struct Report {
     Answers classes;
     Answers associations;
     std::vector<std::string> notes;
-    std::string version; ///< of this program
-    std::string time;    ///< of the end, in UTC: `2026-11-21T06:00:00Z`
+    std::string version;  ///< of this program
+    std::time_t time = 0; ///< of the end
 };
+
+/// A time in UTC: `2026-11-21T06:00:00Z`.
+std::string utcText(std::time_t time);
+
+/// Whether a key or property of that name names a class only: CreationClassName, SystemCreationClassName and the like.
+bool namesClass(std::string_view name);
 
 /// The classes and associations of a report, in its order.
 struct Subjects {

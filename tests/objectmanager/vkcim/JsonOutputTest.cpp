@@ -159,7 +159,7 @@ TEST(JsonOutput, AReportHoldsTheAnswersByClassInOrder) {
     Report report;
     report.host = "node\"7";
     report.version = "2.1.0";
-    report.time = "2026-11-21T06:00:00Z";
+    report.time = 1795240800;
     report.classes = {{"B", {}}, {"A", {}}};
     report.associations = {{"L", {}}};
     report.notes = {"no tables"};
