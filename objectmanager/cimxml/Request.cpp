@@ -3,6 +3,8 @@
 #include "objectmanager/cimxml/Document.h"
 #include "objectmanager/cimxml/Errors.h"
 
+#include <algorithm>
+
 namespace cimxml {
 namespace {
 
@@ -86,13 +88,14 @@ Request readRequest(std::string_view body) {
     }
     if (content.name() != "SIMPLEREQ"sv) throw notValid("the message holds no request");
     checkAttributes(content, {});
-    std::vector<pugi::xml_node> children = childElements(content);
-    while (!children.empty() && children.front().name() == "CORRELATOR"sv) children.erase(children.begin());
-    if (children.size() != 1) throw notValid("a request of one call");
-    const std::string_view call = children.front().name();
+    const std::vector<pugi::xml_node> children = childElements(content);
+    const auto isCorrelator = [](const pugi::xml_node& child) { return child.name() == "CORRELATOR"sv; };
+    const auto first = std::find_if_not(children.begin(), children.end(), isCorrelator);
+    if (children.end() - first != 1) throw notValid("a request of one call");
+    const std::string_view call = first->name();
     if (call != "IMETHODCALL" && call != "METHODCALL") throw notValid("the request holds no call");
     request.intrinsic = call == "IMETHODCALL";
-    readCall(children.front(), request);
+    readCall(*first, request);
     return request;
 }
 
