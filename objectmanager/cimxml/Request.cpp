@@ -2,6 +2,7 @@
 
 #include "objectmanager/cimxml/Document.h"
 #include "objectmanager/cimxml/Errors.h"
+#include "objectmanager/model/Names.h"
 
 #include <algorithm>
 
@@ -15,6 +16,14 @@ void checkVersion(const std::string& version, char major, const char* cimError) 
     if (version.size() < 3 || version[0] != major || version[1] != '.') {
         throw Refusal(501, cimError, "version " + version);
     }
+}
+
+/// A message says what it is, and every text is read as UTF-8.
+void checkDeclaration(const pugi::xml_document& document) {
+    const pugi::xml_node first = document.first_child();
+    if (first.type() != pugi::node_declaration) throw notValid("no XML declaration");
+    const std::string encoding = first.attribute("encoding").as_string("utf-8");
+    if (!om::sameName(encoding, "utf-8")) throw notValid("encoding " + encoding);
 }
 
 pugi::xml_node childNamed(const pugi::xml_node& node, std::string_view name) {
@@ -69,6 +78,7 @@ void readCall(const pugi::xml_node& call, Request& request) {
 Request readRequest(std::string_view body) {
     pugi::xml_document document;
     load(document, body);
+    checkDeclaration(document);
     const pugi::xml_node cim = document.document_element();
     if (cim.name() != "CIM"sv) throw notValid("the outermost element is not CIM");
     checkAttributes(cim, {"CIMVERSION", "DTDVERSION"});

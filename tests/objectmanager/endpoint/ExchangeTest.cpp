@@ -136,9 +136,10 @@ TEST(Exchange, KeysInCIMObjectAreNotCompared) {
 }
 
 TEST(Exchange, RefusesWhatIsNoCimRequest) {
-    const std::string versioned = "<CIM CIMVERSION='2.0' DTDVERSION='2.0'><MESSAGE ID='1' PROTOCOLVERSION='1.4'>"
-                                  "<SIMPLEREQ><IMETHODCALL NAME='EnumerateClassNames'>" +
-                                  cimxml::localNameSpace + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
+    const std::string versioned =
+        "<?xml version='1.0'?><CIM CIMVERSION='2.0' DTDVERSION='2.0'><MESSAGE ID='1' PROTOCOLVERSION='1.4'>"
+        "<SIMPLEREQ><IMETHODCALL NAME='EnumerateClassNames'>" +
+        cimxml::localNameSpace + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>";
     struct {
         const char* what;
         HttpRequest http;
