@@ -128,7 +128,8 @@ void load(pugi::xml_document& document, std::string_view text) {
     checkCharacters(text);
     Markup(text).check();
     const pugi::xml_parse_result result = document.load_buffer(
-        text.data(), text.size(), pugi::parse_default | pugi::parse_ws_pcdata_single, pugi::encoding_utf8);
+        text.data(), text.size(), pugi::parse_default | pugi::parse_declaration | pugi::parse_ws_pcdata_single,
+        pugi::encoding_utf8);
     if (!result) throw notWellFormed(result.description());
     int roots = 0;
     for (const pugi::xml_node& node : document) {

@@ -2,6 +2,9 @@
 
 #include "objectmanager/cimxml/Document.h"
 #include "objectmanager/cimxml/Errors.h"
+#include "objectmanager/model/Names.h"
+
+#include <algorithm>
 
 namespace cimxml {
 namespace {
@@ -13,6 +16,14 @@ void checkVersion(const std::string& version, char major, const char* cimError) 
     if (version.size() < 3 || version[0] != major || version[1] != '.') {
         throw Refusal(501, cimError, "version " + version);
     }
+}
+
+/// A message says what it is, and every text is read as UTF-8.
+void checkDeclaration(const pugi::xml_document& document) {
+    const pugi::xml_node first = document.first_child();
+    if (first.type() != pugi::node_declaration) throw notValid("no XML declaration");
+    const std::string encoding = first.attribute("encoding").as_string("utf-8");
+    if (!om::sameName(encoding, "utf-8")) throw notValid("encoding " + encoding);
 }
 
 pugi::xml_node childNamed(const pugi::xml_node& node, std::string_view name) {
@@ -67,6 +78,7 @@ void readCall(const pugi::xml_node& call, Request& request) {
 Request readRequest(std::string_view body) {
     pugi::xml_document document;
     load(document, body);
+    checkDeclaration(document);
     const pugi::xml_node cim = document.document_element();
     if (cim.name() != "CIM"sv) throw notValid("the outermost element is not CIM");
     checkAttributes(cim, {"CIMVERSION", "DTDVERSION"});
@@ -86,13 +98,14 @@ Request readRequest(std::string_view body) {
     }
     if (content.name() != "SIMPLEREQ"sv) throw notValid("the message holds no request");
     checkAttributes(content, {});
-    std::vector<pugi::xml_node> children = childElements(content);
-    while (!children.empty() && children.front().name() == "CORRELATOR"sv) children.erase(children.begin());
-    if (children.size() != 1) throw notValid("a request of one call");
-    const std::string_view call = children.front().name();
+    const std::vector<pugi::xml_node> children = childElements(content);
+    const auto isCorrelator = [](const pugi::xml_node& child) { return child.name() == "CORRELATOR"sv; };
+    const auto first = std::find_if_not(children.begin(), children.end(), isCorrelator);
+    if (children.end() - first != 1) throw notValid("a request of one call");
+    const std::string_view call = first->name();
     if (call != "IMETHODCALL" && call != "METHODCALL") throw notValid("the request holds no call");
     request.intrinsic = call == "IMETHODCALL";
-    readCall(children.front(), request);
+    readCall(*first, request);
     return request;
 }
 

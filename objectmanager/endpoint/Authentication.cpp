@@ -57,11 +57,11 @@ std::string claimedUser(const HttpRequest& request) {
     return credentials ? credentials->first : std::string();
 }
 
-PasswordCheck checkPassword(const HttpRequest& request) {
+PasswordCheck checkPassword(const HttpRequest& request, const std::string& address) {
     const auto credentials = basicCredentials(authorizationOf(request));
     if (!credentials) return {std::nullopt, challenge("credentials that cannot be read")};
     const auto& [user, password] = *credentials;
-    if (!isAuthentic(user, password)) return {std::nullopt, challenge("authentication failed")};
+    if (!isAuthentic(user, password, address)) return {std::nullopt, challenge("authentication failed")};
     Caller caller = rightsOf(user);
     caller.user = user;
     return {std::move(caller), {}};

@@ -37,6 +37,6 @@ struct PasswordCheck {
 /// The user that the request names; empty for none.
 std::string claimedUser(const HttpRequest& request);
 /// Takes as long as PAM does.
-PasswordCheck checkPassword(const HttpRequest& request);
+PasswordCheck checkPassword(const HttpRequest& request, const std::string& address);
 
 } // namespace endpoint

@@ -45,8 +45,8 @@ private:
 };
 
 /// Makes a key and a certificate that it has signed itself, for these names and numeric addresses of a host, and writes
-/// them into files that are not there yet; their directories are made. Throws std::invalid_argument where one is there,
-/// and std::system_error.
+/// them into files that are not there yet; their directories are made. Throws std::invalid_argument where one is there
+/// or a name is none, and std::system_error.
 void makeCertificate(const std::vector<std::string>& names, const std::string& certificateFile,
                      const std::string& keyFile);
 

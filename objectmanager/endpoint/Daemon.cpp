@@ -2,6 +2,7 @@
 
 #include "objectmanager/endpoint/Log.h"
 #include "objectmanager/endpoint/Rights.h"
+#include "objectmanager/model/Names.h"
 
 #include <microhttpd.h>
 
@@ -40,6 +41,10 @@ ConnectionPointer connectionAt(Listener::Kind kind, MHD_Connection* handle) {
     return connection;
 }
 
+bool isPosted(const HttpRequest& request) {
+    return request.method == "POST" || request.method == "M-POST";
+}
+
 /// What is wrong with the length that a head announces.
 std::optional<HttpAnswer> refuseLength(const HttpRequest& request, std::size_t longest) {
     const std::optional<std::string> announced = headerOf(request, "Content-Length");
@@ -48,9 +53,10 @@ std::optional<HttpAnswer> refuseLength(const HttpRequest& request, std::size_t l
     const auto [end, error] = std::from_chars(length.data(), length.data() + length.size(), bytes);
     if (error == std::errc::result_out_of_range || bytes > longest) return plainAnswer(413, "the body is too large");
     if (error != std::errc() || end != length.data() + length.size()) return plainAnswer(400, "Content-Length");
-    const bool chunked = headerOf(request, "Transfer-Encoding").has_value();
-    const bool posted = request.method == "POST" || request.method == "M-POST";
-    if (posted && !chunked && !announced) return plainAnswer(411, "no Content-Length");
+    const std::optional<std::string> encoding = headerOf(request, "Transfer-Encoding");
+    const bool chunked = encoding.has_value();
+    if (chunked && !om::sameName(*encoding, "chunked")) return plainAnswer(501, "Transfer-Encoding " + *encoding);
+    if (isPosted(request) && !chunked && !announced) return plainAnswer(411, "no Content-Length");
     if (chunked && announced) return plainAnswer(400, "two lengths");
     return std::nullopt;
 }
@@ -130,6 +136,8 @@ private:
         work->http = std::move(request);
         MHD_get_connection_values(handle, MHD_HEADER_KIND, &collectHeader, &work->http.headers);
         auto refusal = refuseLength(work->http, parts.limits.body);
+        // With another method nobody gets on, whoever it is.
+        if (!refusal && !isPosted(work->http)) refusal = endpoint::refuseHead(work->http);
         if (!refusal) refusal = parts.authentication.refuseHead(*work);
         if (!refusal) refusal = endpoint::refuseHead(work->http);
         if (refusal) work->finish(std::move(*refusal));
@@ -151,6 +159,7 @@ Daemon::Daemon(Listener given, Parts& shared) : listener(std::move(given)), part
     // Not MHD_USE_EPOLL: of a client that sends less than it announced and goes away, only poll says that it has gone.
     unsigned flags = MHD_USE_INTERNAL_POLLING_THREAD | MHD_USE_POLL | MHD_ALLOW_SUSPEND_RESUME;
     if (listener.kind == Listener::Kind::Https) {
+        if (!parts.certificate) throw std::invalid_argument(listener.url + " takes a certificate and a key");
         flags |= MHD_USE_TLS;
         options.push_back({MHD_OPTION_HTTPS_CERT_CALLBACK2, 0, Certificate::retriever()});
         options.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(tlsPriorities)});

@@ -22,7 +22,7 @@ struct Parts {
 /// libmicrohttpd on one listener: a thread that serves its connections, and hands whole requests on.
 class Daemon {
 public:
-    /// Throws std::runtime_error.
+    /// Throws std::runtime_error, and std::invalid_argument for HTTPS without a certificate.
     Daemon(Listener listener, Parts& parts);
     /// No connection may be suspended any more.
     ~Daemon();

@@ -144,7 +144,7 @@ void declareExtension(Headers& headers, bool mandatory) {
     for (auto& [name, value] : headers) {
         if (name.rfind("CIM", 0) == 0) name.insert(0, prefix);
     }
-    headers.emplace_back("Ext", "");
+    headers.emplace_back("Ext", " "); // a blank, since libmicrohttpd sends no header without a value
     headers.emplace_back("Man", std::string(mapping) + " ; ns=73");
 }
 

@@ -53,17 +53,31 @@ Addresses resolve(const std::string& host, const std::string& port) {
     throw std::system_error(error, std::generic_category(), "cannot listen on " + url);
 }
 
+/// Removes a socket that nobody serves any more; where somebody does, to bind another one there fails.
+void removeForsaken(const sockaddr_un& address) {
+    struct stat old {};
+    if (lstat(address.sun_path, &old) != 0 || !S_ISSOCK(old.st_mode)) return;
+    const int client = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0);
+    if (client < 0) return;
+    const bool forsaken =
+        connect(client, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0 && errno == ECONNREFUSED;
+    close(client);
+    if (forsaken) unlink(address.sun_path);
+}
+
 int listenUnix(const ListenUrl& url) {
     sockaddr_un address{};
     address.sun_family = AF_UNIX;
     std::copy(url.host.begin(), url.host.end(), address.sun_path);
-    struct stat old {};
-    if (lstat(url.host.c_str(), &old) == 0 && S_ISSOCK(old.st_mode)) unlink(url.host.c_str());
+    removeForsaken(address);
     const int made = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
-    if (made < 0 || bind(made, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0 ||
-        chmod(url.host.c_str(), 0666) != 0 || listen(made, backlog) != 0) {
-        failed(made, url.text);
-    }
+    // Not by chmod later on, which would follow a link that was put in its place.
+    const mode_t former = umask(0111);
+    const bool bound = made >= 0 && bind(made, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
+    const int error = errno;
+    umask(former);
+    errno = error;
+    if (!bound || listen(made, backlog) != 0) failed(made, url.text);
     return made;
 }
 

@@ -25,8 +25,8 @@ struct ListenUrl {
     std::string port;
 };
 
-/// Opens a listening socket. A Unix socket is open to everybody: its clients are known by their credentials. Throws
-/// std::system_error.
+/// Opens a listening socket. A Unix socket is open to everybody: its clients are known by their credentials. It
+/// takes the place of one that nobody serves any more. Throws std::system_error.
 Listener listenAt(const ListenUrl& url);
 
 /// The sockets that the service manager has opened; none where it started us without. A TCP socket is plain HTTP on

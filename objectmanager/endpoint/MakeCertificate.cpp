@@ -4,6 +4,7 @@
 #include <fcntl.h>
 #include <gnutls/crypto.h>
 #include <gnutls/x509.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <cerrno>
@@ -37,6 +38,22 @@ private:
 
 using Key = Held<gnutls_x509_privkey_t, gnutls_x509_privkey_init, gnutls_x509_privkey_deinit>;
 
+/// Of letters, digits and hyphens between dots, the first part perhaps `*`; also with `_`, which hosts have.
+bool isDnsName(std::string_view name) {
+    constexpr std::string_view letters = "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ0123456789-_";
+    constexpr std::size_t longest = 253;
+    constexpr std::size_t longestPart = 63;
+    if (name.size() > longest) return false;
+    if (name.substr(0, 2) == "*.") name.remove_prefix(2);
+    for (;;) {
+        const std::string_view part = name.substr(0, name.find('.'));
+        if (part.empty() || part.size() > longestPart || part.front() == '-' || part.back() == '-') return false;
+        if (part.find_first_not_of(letters) != std::string_view::npos) return false;
+        if (part.size() == name.size()) return true;
+        name.remove_prefix(part.size() + 1);
+    }
+}
+
 /// What the certificate is to be valid for: a numeric address or a name.
 void addName(gnutls_x509_crt_t certificate, const std::string& name) {
     unsigned char address[sizeof(in6_addr)];
@@ -47,6 +64,7 @@ void addName(gnutls_x509_crt_t certificate, const std::string& name) {
         checked(gnutls_x509_crt_set_subject_alt_name(certificate, GNUTLS_SAN_IPADDRESS, address, length,
                                                      GNUTLS_FSAN_APPEND));
     } else {
+        if (!isDnsName(name)) throw std::invalid_argument("'" + name + "' is neither a host's name nor an address");
         checked(gnutls_x509_crt_set_subject_alt_name(certificate, GNUTLS_SAN_DNSNAME, name.data(),
                                                      static_cast<unsigned>(name.size()), GNUTLS_FSAN_APPEND));
     }
@@ -55,6 +73,7 @@ void addName(gnutls_x509_crt_t certificate, const std::string& name) {
 class SelfSigned : public Held<gnutls_x509_crt_t, gnutls_x509_crt_init, gnutls_x509_crt_deinit> {
 public:
     SelfSigned(const std::vector<std::string>& names, gnutls_x509_privkey_t key) {
+        for (const std::string& name : names) addName(*this, name);
         const std::string& first = names.front();
         unsigned char number[16];
         checked(gnutls_rnd(GNUTLS_RND_NONCE, number, sizeof number));
@@ -66,7 +85,6 @@ public:
         checked(gnutls_x509_crt_set_expiration_time(*this, now + lifetime));
         checked(gnutls_x509_crt_set_dn_by_oid(*this, GNUTLS_OID_X520_COMMON_NAME, 0, first.data(),
                                               static_cast<unsigned>(first.size())));
-        for (const std::string& name : names) addName(*this, name);
         checked(gnutls_x509_crt_set_basic_constraints(*this, 0, -1));
         checked(gnutls_x509_crt_set_key_usage(*this, GNUTLS_KEY_DIGITAL_SIGNATURE));
         checked(gnutls_x509_crt_set_key_purpose_oid(*this, GNUTLS_KP_TLS_WWW_SERVER, 0));
@@ -99,7 +117,7 @@ std::string exported(Object object, int (*toPem)(Object, gnutls_x509_crt_fmt_t, 
 void writeNew(const std::string& file, mode_t mode, const std::string& content) {
     const int descriptor = open(file.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode);
     if (descriptor < 0 && errno == EEXIST) throw std::invalid_argument(file + " is there already");
-    bool written = descriptor >= 0 &&
+    bool written = descriptor >= 0 && fchmod(descriptor, mode) == 0 && // whatever the umask is
                    write(descriptor, content.data(), content.size()) == static_cast<ssize_t>(content.size()) &&
                    fsync(descriptor) == 0;
     const int error = errno;

@@ -40,7 +40,7 @@ void Processing::authenticate(const WorkPointer& work) {
     work->note("authentication of its client");
     PasswordCheck check;
     try {
-        check = checkPassword(work->http);
+        check = checkPassword(work->http, work->connection->address);
     } catch (const std::exception& error) {
         check.refusal = plainAnswer(500, error.what());
     }

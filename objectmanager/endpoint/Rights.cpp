@@ -8,9 +8,10 @@
 #include <sys/socket.h>
 
 #include <algorithm>
-#include <array>
+#include <cerrno>
 #include <cstdlib>
 #include <cstring>
+#include <system_error>
 #include <vector>
 
 namespace endpoint {
@@ -18,16 +19,36 @@ namespace {
 
 constexpr const char* readers = "vkcim";
 constexpr const char* administrators = "vkcim-admin";
-constexpr std::size_t bufferSize = 16384;
 constexpr unsigned failureDelay = 2'000'000; ///< microseconds, also where no module of PAM's asks for it
 
-std::optional<gid_t> groupNamed(const char* name) {
-    std::vector<char> buffer(bufferSize);
-    group entry{};
-    group* found = nullptr;
-    if (getgrnam_r(name, &entry, buffer.data(), buffer.size(), &found) != 0 || found == nullptr) return std::nullopt;
-    return entry.gr_gid;
-}
+/// What getpwnam_r and the like find, in as much room as it takes: a group may have thousands of members. Throws
+/// std::system_error where it cannot be known whether there is one.
+template <class Entry>
+class Found {
+public:
+    template <class Name>
+    Found(int (*find)(Name, Entry*, char*, std::size_t, Entry**), Name name) {
+        constexpr std::size_t most = std::size_t{64} << 20U;
+        int error = ERANGE;
+        for (std::size_t room = 16384; error == ERANGE && room <= most; room *= 2) {
+            buffer.resize(room);
+            error = find(name, &entry, buffer.data(), buffer.size(), &found);
+        }
+        const bool missing = error == ENOENT || error == ESRCH; // as some name services say it
+        if (error != 0 && !missing) throw std::system_error(error, std::generic_category(), "users and groups");
+    }
+    Found(const Found&) = delete;
+    Found& operator=(const Found&) = delete;
+
+    explicit operator bool() const { return found != nullptr; }
+    const Entry* operator->() const { return found; }
+    const Entry& operator*() const { return *found; }
+
+private:
+    std::vector<char> buffer;
+    Entry entry{};
+    Entry* found = nullptr;
+};
 
 std::vector<gid_t> groupsOf(const std::string& user, gid_t first) {
     constexpr int mostGroups = 65536;
@@ -46,8 +67,8 @@ Caller rightsOf(const passwd& entry) {
     caller.user = entry.pw_name;
     const std::vector<gid_t> groups = groupsOf(caller.user, entry.pw_gid);
     const auto isIn = [&](const char* name) {
-        const std::optional<gid_t> wanted = groupNamed(name);
-        return wanted && std::find(groups.begin(), groups.end(), *wanted) != groups.end();
+        const Found<group> wanted(getgrnam_r, name);
+        return wanted && std::find(groups.begin(), groups.end(), wanted->gr_gid) != groups.end();
     };
     caller.mayChange = entry.pw_uid == 0 || isIn(administrators);
     caller.mayRead = caller.mayChange || isIn(readers);
@@ -92,23 +113,16 @@ std::optional<std::string> decodeBase64(std::string_view text) {
 } // namespace
 
 Caller rightsOf(const std::string& user) {
-    std::vector<char> buffer(bufferSize);
-    passwd entry{};
-    passwd* found = nullptr;
-    if (getpwnam_r(user.c_str(), &entry, buffer.data(), buffer.size(), &found) != 0 || found == nullptr) return {};
-    return rightsOf(entry);
+    const Found<passwd> entry(getpwnam_r, user.c_str());
+    return entry ? rightsOf(*entry) : Caller();
 }
 
 Caller rightsOf(uid_t user) {
-    std::vector<char> buffer(bufferSize);
-    passwd entry{};
-    passwd* found = nullptr;
-    if (getpwuid_r(user, &entry, buffer.data(), buffer.size(), &found) != 0 || found == nullptr) {
-        Caller caller; // root needs no entry
-        caller.mayRead = caller.mayChange = user == 0;
-        return caller;
-    }
-    return rightsOf(entry);
+    const Found<passwd> entry(getpwuid_r, user);
+    if (entry) return rightsOf(*entry);
+    Caller caller; // root needs no entry
+    caller.mayRead = caller.mayChange = user == 0;
+    return caller;
 }
 
 std::optional<uid_t> peerOf(int socket) {
@@ -118,13 +132,15 @@ std::optional<uid_t> peerOf(int socket) {
     return credentials.uid;
 }
 
-bool isAuthentic(const std::string& user, const std::string& password) {
+bool isAuthentic(const std::string& user, const std::string& password, const std::string& address) {
     std::string secret = password;
     const pam_conv conversation{converse, secret.data()};
     pam_handle_t* handle = nullptr;
     if (pam_start("vkcimd", user.c_str(), &conversation, &handle) != PAM_SUCCESS) return false;
     pam_fail_delay(handle, failureDelay);
-    int status = pam_authenticate(handle, PAM_SILENT | PAM_DISALLOW_NULL_AUTHTOK);
+    // What counts failures by the client, or lets in only some, looks at it.
+    int status = pam_set_item(handle, PAM_RHOST, address.c_str());
+    if (status == PAM_SUCCESS) status = pam_authenticate(handle, PAM_SILENT | PAM_DISALLOW_NULL_AUTHTOK);
     if (status == PAM_SUCCESS) status = pam_acct_mgmt(handle, PAM_SILENT);
     pam_end(handle, status);
     explicit_bzero(secret.data(), secret.size());

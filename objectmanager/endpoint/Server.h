@@ -25,7 +25,7 @@ public:
     Server(const Server&) = delete;
     Server& operator=(const Server&) = delete;
 
-    /// Throws std::runtime_error.
+    /// Throws std::runtime_error, and std::invalid_argument for HTTPS without a certificate.
     void serve(const Listener& listener);
 
     /// Returns when `stop` is true, or when no connection was open and no request came for that long (0: never).

@@ -56,7 +56,7 @@ std::string Work::logLine() const {
                        logged(answer.nameSpace) + ' ' + logged(answer.className) +
                        " http=" + std::to_string(answer.status) + " cim=" + std::to_string(answer.cimStatus) +
                        " us=" + std::to_string(elapsed.count());
-    if (!answer.detail.empty()) line += ": " + answer.detail;
+    if (!answer.detail.empty()) line += ": " + detailed(answer.detail);
     return line;
 }
 
@@ -71,7 +71,7 @@ Ask noting(Ask provider) {
     return [asked = std::move(provider)](const om::Request& request) {
         if (current != nullptr) {
             current->note(std::string(operations[static_cast<std::size_t>(request.operation)]) + " of " +
-                          request.path.className);
+                          logged(request.path.className));
         }
         return asked(request);
     };

@@ -46,19 +46,26 @@ TEST(Request, ReadsAMethodOfAnInstanceAndOfAClass) {
 }
 
 TEST(Request, TakesVersionsByTheirFirstNumberAndSkipsCorrelators) {
-    const Request request =
-        readRequest("<CIM DTDVERSION='2.4' CIMVERSION='2.8'><MESSAGE PROTOCOLVERSION='1.4' ID='&lt;a&gt;'><SIMPLEREQ>"
-                    "<CORRELATOR NAME='a' TYPE='string'/><IMETHODCALL NAME='EnumerateQualifiers'>" +
-                    localNameSpace + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>");
+    const Request request = readRequest("<?xml version='1.0'?><CIM DTDVERSION='2.4' CIMVERSION='2.8'><MESSAGE "
+                                        "PROTOCOLVERSION='1.4' ID='&lt;a&gt;'><SIMPLEREQ>"
+                                        "<CORRELATOR NAME='a' TYPE='string'/><IMETHODCALL NAME='EnumerateQualifiers'>" +
+                                        localNameSpace + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>");
     EXPECT_EQ(request.id, "<a>");
     EXPECT_EQ(request.protocolVersion, "1.4");
+}
+
+TEST(Request, TakesUtf8InAnyCaseBehindAByteOrderMark) {
+    const std::string whole = intrinsic("EnumerateQualifiers", "");
+    const std::string content = whole.substr(whole.find("<CIM"));
+    EXPECT_EQ(readRequest("\xEF\xBB\xBF<?xml version='1.0' encoding='UTF-8'?>" + content).name, "EnumerateQualifiers");
 }
 
 TEST(Request, RefusesWhatIsNoRequestOfOneOperation) {
     const std::string call = "<IMETHODCALL NAME=\"GetClass\">" + localNameSpace + "</IMETHODCALL>";
     const std::string simple = "<SIMPLEREQ>" + call + "</SIMPLEREQ>";
+    const std::string whole = message(simple);
     const auto versions = [&](const char* cimVersion, const char* dtdVersion, const char* protocolVersion) {
-        return std::string("<CIM CIMVERSION='") + cimVersion + "' DTDVERSION='" + dtdVersion +
+        return std::string("<?xml version='1.0'?><CIM CIMVERSION='") + cimVersion + "' DTDVERSION='" + dtdVersion +
                "'><MESSAGE ID='1' PROTOCOLVERSION='" + protocolVersion + "'>" + simple + "</MESSAGE></CIM>";
     };
     struct {
@@ -66,9 +73,11 @@ TEST(Request, RefusesWhatIsNoRequestOfOneOperation) {
         unsigned status;
         const char* cimError;
     } const bad[] = {
-        {"<XML/>", 400, "request-not-valid"},
-        {"<CIM/>", 400, "request-not-valid"},
-        {"<CIM CIMVERSION='2.0'/>", 400, "request-not-valid"},
+        {whole.substr(whole.find("<CIM")), 400, "request-not-valid"},
+        {"<?xml version='1.0' encoding='iso-8859-1'?>" + whole.substr(whole.find("<CIM")), 400, "request-not-valid"},
+        {"<?xml version='1.0'?><XML/>", 400, "request-not-valid"},
+        {"<?xml version='1.0'?><CIM/>", 400, "request-not-valid"},
+        {"<?xml version='1.0'?><CIM CIMVERSION='2.0'/>", 400, "request-not-valid"},
         {cim(""), 400, "request-not-valid"},
         {cim("<DECLARATION/>"), 400, "request-not-valid"},
         {cim("<MESSAGE PROTOCOLVERSION='1.0'>" + simple + "</MESSAGE>"), 400, "request-not-valid"},

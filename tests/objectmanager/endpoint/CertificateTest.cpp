@@ -5,6 +5,8 @@
 
 #include <gmock/gmock.h>
 
+#include <sys/stat.h>
+
 #include <filesystem>
 #include <fstream>
 
@@ -43,6 +45,22 @@ TEST_F(CertificateFiles, AreMadeForTheHostAloneAndFitEachOther) {
     using std::filesystem::perms;
     EXPECT_EQ(std::filesystem::status(key).permissions(), perms::owner_read | perms::owner_write);
     EXPECT_EQ(problem(), "");
+}
+
+TEST_F(CertificateFiles, HaveTheirModesWhateverTheUmaskIs) {
+    const mode_t former = umask(0277);
+    make(directory.path("other.pem"), directory.path("other-key.pem"));
+    umask(former);
+    EXPECT_EQ(std::filesystem::status(directory.path("other.pem")).permissions(), std::filesystem::perms{0644});
+    EXPECT_EQ(std::filesystem::status(directory.path("other-key.pem")).permissions(), std::filesystem::perms{0600});
+}
+
+TEST_F(CertificateFiles, AreForNamesThatHostsCanHave) {
+    for (const char* name : {"*.a b", "", "a..b", "-a", "a.", "host:5989", "*.*.example", "a\nb"}) {
+        EXPECT_THROW(makeCertificate({name}, directory.path("n"), directory.path("n-key")), std::invalid_argument);
+        EXPECT_FALSE(std::filesystem::exists(directory.path("n-key"))) << name;
+    }
+    makeCertificate({"*.rack_1.example", "Node-7"}, directory.path("n"), directory.path("n-key"));
 }
 
 TEST_F(CertificateFiles, AreNotOverwritten) {

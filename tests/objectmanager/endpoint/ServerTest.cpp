@@ -48,7 +48,10 @@ TEST_F(ServerTest, RefusesBodiesThatAreTooLargeOrHaveNoLength) {
                      {"Content-Length: -5\r\n", "HTTP/1.1 400"},
                      {"Content-Length: 5x\r\n", "HTTP/1.1 400"},
                      {"Content-Length: 5\r\nContent-Length: 6\r\n", "HTTP/1.1 400"},
-                     {"Content-Length: 5\r\nTransfer-Encoding: chunked\r\n", "HTTP/1.1 400"}};
+                     {"Content-Length: 5\r\nTransfer-Encoding: chunked\r\n", "HTTP/1.1 400"},
+                     {"Transfer-Encoding: gzip\r\n", "HTTP/1.1 501"},
+                     {"Transfer-Encoding: identity\r\n", "HTTP/1.1 501"},
+                     {"Transfer-Encoding: gzip, chunked\r\n", "HTTP/1.1 501"}};
     for (const auto& each : bad) {
         Client client(path);
         EXPECT_THAT(client.ask(head(each.header)), StartsWith(each.answer)) << each.header;
@@ -59,6 +62,28 @@ TEST_F(ServerTest, RefusesBodiesThatAreTooLargeOrHaveNoLength) {
     for (int i = 0; i < 5; ++i) chunked.send("40000\r\n" + piece + "\r\n");
     chunked.send("0\r\n\r\n");
     EXPECT_THAT(chunked.receive(), StartsWith("HTTP/1.1 413"));
+}
+
+TEST_F(ServerTest, RefusesAChunkThatIsTooLargeForAnyNumber) {
+    Limits limits;
+    limits.arrival = std::chrono::milliseconds(300); // more is never coming
+    start(limits);
+    Client client(path);
+    client.send(head("Transfer-Encoding: chunked\r\n") + "ffffffffffffffff\r\nx");
+    EXPECT_THAT(client.receive(), testing::Not(HasSubstr(" 200 ")));
+    EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME"));
+}
+
+TEST_F(ServerTest, AnswersAMandatoryRequestWithAllOfItsHeaders) {
+    start();
+    const std::string message = body("VESKA_ComputerSystem");
+    const std::string answer =
+        Client(path).ask("M-POST /cimom HTTP/1.1\r\nHost: x\r\nContent-Type: application/xml\r\n"
+                         "Man: http://www.dmtf.org/cim/mapping/http/v1.0 ; ns=40\r\n40-CIMOperation: MethodCall\r\n"
+                         "40-CIMMethod: EnumerateInstanceNames\r\n40-CIMObject: root%2Fcimv2\r\nContent-Length: " +
+                         std::to_string(message.size()) + "\r\n\r\n" + message);
+    EXPECT_THAT(answer, AllOf(StartsWith("HTTP/1.1 200"), HasSubstr("\r\n73-CIMOperation: MethodResponse\r\n"),
+                              testing::ContainsRegex("\r\nExt: +\r\n")));
 }
 
 TEST_F(ServerTest, RefusesHeadsThatAreTooLarge) {
@@ -134,6 +159,22 @@ TEST_F(ServerTest, LargeAnswersComeWhole) {
     const std::string answer = Client(path).ask(request());
     EXPECT_GT(answer.size(), std::size_t{1} << 20U);
     EXPECT_THAT(answer.substr(answer.size() - 6), "</CIM>");
+}
+
+TEST(ServerOverTcp, TakesACertificateForHttps) {
+    Operations operations({}, "host1");
+    Server server(operations, {});
+    const Listener listener = listenAt(ListenUrl("https://127.0.0.1:0"));
+    EXPECT_THROW(server.serve(listener), std::invalid_argument);
+}
+
+TEST(ServerOverTcp, SaysThatAMethodIsWrongWhoeverAsks) {
+    Operations operations({}, "host1");
+    Server server(operations, {});
+    const Listener listener = listenAt(ListenUrl("http://127.0.0.1:0"));
+    server.serve(listener);
+    Client client(std::stoi(listener.url.substr(listener.url.rfind(':') + 1)), 1);
+    EXPECT_THAT(client.ask("GET /cimom HTTP/1.1\r\nHost: x\r\n\r\n"), StartsWith("HTTP/1.1 405"));
 }
 
 TEST(ServerOverTcp, WantsAUser) {
