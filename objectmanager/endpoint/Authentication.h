@@ -2,6 +2,7 @@
 
 #include "objectmanager/endpoint/Work.h"
 
+#include <chrono>
 #include <optional>
 #include <string>
 
@@ -10,22 +11,29 @@ namespace endpoint {
 /// Says who asks: from the socket, or from user and password.
 class Authentication {
 public:
-    /// Whether everybody may read over the loopback and the Unix socket.
-    explicit Authentication(bool anonymousRead);
+    /// Whether everybody may read over the loopback and the Unix socket, and for how long a connection's password and
+    /// rights are trusted.
+    Authentication(bool anonymousRead, std::chrono::milliseconds trust);
 
     /// What can be said without the body: that a user has to be named.
     std::optional<HttpAnswer> refuseHead(const Work& work) const;
 
     /// Whether a password has to be checked before it is known who asks.
-    static bool takesPassword(const Work& work);
+    bool takesPassword(const Work& work) const;
 
     /// Who asks, where no password has to be checked.
     Caller callerOf(const Work& work) const;
 
+    /// The caller with the rights of this moment: one who lost them changes nothing more.
+    Caller renewed(const Work& work, const Caller& caller) const;
+
 private:
     bool mayBeAnonymous(const Connection& connection) const;
 
+    bool isKnown(const Connection& connection) const;
+
     bool anonymousRead;
+    std::chrono::milliseconds trust;
 };
 
 /// What became of a password.

@@ -32,6 +32,12 @@ struct Connection {
 
     std::string authorization; ///< that has been checked: its user is `caller`
     std::optional<Caller> caller;
+    Clock::time_point known; ///< since when
+
+    void know(Caller who) {
+        caller = std::move(who);
+        known = Clock::now();
+    }
 };
 
 using ConnectionPointer = std::shared_ptr<Connection>;
