@@ -73,8 +73,10 @@ Caller Authentication::renewed(const Work& work, const Caller& caller) const {
     return anew;
 }
 
-std::string claimedUser(const HttpRequest& request) {
-    const auto credentials = basicCredentials(authorizationOf(request));
+std::string claimedUser(const Work& work) {
+    const Connection& connection = *work.connection;
+    if (connection.kind == Listener::Kind::Unix) return connection.caller ? connection.caller->user : std::string();
+    const auto credentials = basicCredentials(authorizationOf(work.http));
     return credentials ? credentials->first : std::string();
 }
 

@@ -42,8 +42,8 @@ struct PasswordCheck {
     HttpAnswer refusal;
 };
 
-/// The user that the request names; empty for none.
-std::string claimedUser(const HttpRequest& request);
+/// The user that the request names, or whom its connection is known to belong to; empty for none.
+std::string claimedUser(const Work& work);
 /// Takes as long as PAM does.
 PasswordCheck checkPassword(const HttpRequest& request);
 

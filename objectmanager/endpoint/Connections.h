@@ -22,6 +22,7 @@ struct Connection {
     Listener::Kind kind = Listener::Kind::Unix;
     int socket = -1;
     std::string address;       ///< for the log
+    std::string network;       ///< that its limit counts: who has one address of IPv6 has all of its network
     std::optional<uid_t> peer; ///< at the other end of a Unix socket
     bool refused = false;      ///< nothing is read from it
 
@@ -49,8 +50,8 @@ public:
 
     Connections(unsigned most, unsigned mostOfAnAddress);
 
-    /// Counts a connection in, or refuses and ends it: there are too many in all, or from its address. Root's over a
-    /// Unix socket are not counted by address.
+    /// Counts a connection in, or refuses and ends it: there are too many in all, or from its network. Root's over a
+    /// Unix socket are always let in: others must not be able to lock out who could end them.
     void open(const ConnectionPointer& connection);
     void close(const ConnectionPointer& connection);
 
@@ -76,5 +77,8 @@ private:
 
 /// An address of a network without its port; one of IPv4 looks the same on a socket for both kinds.
 std::string addressText(const sockaddr* address);
+
+/// The address itself for IPv4, the first 64 bits for IPv6.
+std::string networkText(const sockaddr* address);
 
 } // namespace endpoint

@@ -22,9 +22,9 @@ void Processing::begin(const WorkPointer& work) {
     const std::lock_guard lock(mutex);
     work->started = Work::Clock::now();
     working.insert(work);
+    work->caller.user = claimedUser(*work);
     MHD_suspend_connection(work->handle);
     if (authentication.takesPassword(*work)) {
-        work->caller.user = claimedUser(work->http);
         hand(work, checkers, &Processing::authenticate);
     } else {
         hand(work, workers, &Processing::operate);

@@ -1,8 +1,11 @@
 #include "objectmanager/endpoint/Server.h"
 
+#include "objectmanager/endpoint/Rights.h"
 #include "tests/objectmanager/endpoint/RunningServer.h"
 
 #include <gmock/gmock.h>
+
+#include <unistd.h>
 
 namespace endpoint {
 namespace {
@@ -120,6 +123,16 @@ TEST_F(ServerTest, AnOperationThatRunsMayEndWhileTheServerStops) {
     stopping.join();
     EXPECT_TRUE(clean);
     EXPECT_THAT(client.receive(), HasSubstr("INSTANCENAME"));
+}
+
+TEST_F(ServerTest, WhoAskedIsSaidOfAHeadThatIsRefused) {
+    start();
+    testing::internal::CaptureStderr();
+    Client client(path);
+    EXPECT_THAT(client.ask(request()), HasSubstr("INSTANCENAME"));
+    EXPECT_THAT(client.ask("GET /cimom HTTP/1.1\r\nHost: x\r\n\r\n"), StartsWith("HTTP/1.1 405"));
+    EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME")); // by the thread that wrote the line before
+    EXPECT_THAT(testing::internal::GetCapturedStderr(), HasSubstr(rightsOf(getuid()).user + " - - - http=405"));
 }
 
 TEST_F(ServerTest, AFullQueueIsSaid) {
