@@ -41,7 +41,7 @@ std::optional<std::uint32_t> referred(std::string_view digits) {
 /// Walks over the markup alone, so that a parser never sees what must not be expanded or followed.
 class Markup {
 public:
-    explicit Markup(std::string_view whole) : text(whole) {}
+    Markup(std::string_view whole, int limit) : text(whole), most(limit) {}
 
     void check() {
         for (at = text.find_first_of("<&"); at < text.size(); at = text.find_first_of("<&", at)) {
@@ -89,9 +89,10 @@ private:
         const bool empty = skipTag();
         if (closing) {
             --depth;
-        } else if (!empty && ++depth > deepestElement) {
-            throw notValid("elements are nested too deeply");
+            return;
         }
+        if (++elements > most) throw notValid("too many elements");
+        if (!empty && ++depth > deepestElement) throw notValid("elements are nested too deeply");
     }
 
     /// Steps behind the tag, references in its attributes included; whether it closes itself.
@@ -118,15 +119,17 @@ private:
     std::string_view text;
     std::size_t at = 0;
     int depth = 0;
+    int most;
+    int elements = 0;
 };
 
 } // namespace
 
-void load(pugi::xml_document& document, std::string_view text) {
+void load(pugi::xml_document& document, std::string_view text, int most) {
     if (text.substr(0, byteOrderMark.size()) == byteOrderMark) text.remove_prefix(byteOrderMark.size());
     if (!utf8::is_valid(text.begin(), text.end())) throw notWellFormed("the text is not UTF-8");
     checkCharacters(text);
-    Markup(text).check();
+    Markup(text, most).check();
     const pugi::xml_parse_result result = document.load_buffer(
         text.data(), text.size(), pugi::parse_default | pugi::parse_declaration | pugi::parse_ws_pcdata_single,
         pugi::encoding_utf8);

@@ -273,7 +273,7 @@ InstanceElement readInstance(const pugi::xml_node& node) {
 
 InstanceElement readEmbedded(std::string_view text) {
     pugi::xml_document document;
-    load(document, text);
+    load(document, text, mostElements);
     return readInstance(document.document_element());
 }
 

@@ -77,7 +77,7 @@ void readCall(const pugi::xml_node& call, Request& request) {
 
 Request readRequest(std::string_view body) {
     pugi::xml_document document;
-    load(document, body);
+    load(document, body, mostElements);
     checkDeclaration(document);
     const pugi::xml_node cim = document.document_element();
     if (cim.name() != "CIM"sv) throw notValid("the outermost element is not CIM");

@@ -17,30 +17,35 @@ std::string authorizationOf(const HttpRequest& request) {
 
 } // namespace
 
-Authentication::Authentication(bool anonymous) : anonymousRead(anonymous) {}
+Authentication::Authentication(bool anonymous, std::chrono::milliseconds trusted)
+    : anonymousRead(anonymous), trust(trusted) {}
 
 bool Authentication::mayBeAnonymous(const Connection& connection) const {
     return anonymousRead && connection.kind == Listener::Kind::Http;
 }
 
 std::optional<HttpAnswer> Authentication::refuseHead(const Work& work) const {
-    const bool named = work.connection->kind == Listener::Kind::Unix || headerOf(work.http, "Authorization");
+    const bool named = work.connection->kind == Listener::Kind::Unix || !authorizationOf(work.http).empty();
     if (!named && !mayBeAnonymous(*work.connection)) return challenge("no user is named");
     return std::nullopt;
 }
 
-bool Authentication::takesPassword(const Work& work) {
+bool Authentication::isKnown(const Connection& connection) const {
+    return connection.caller && Connection::Clock::now() - connection.known <= trust;
+}
+
+bool Authentication::takesPassword(const Work& work) const {
     const Connection& connection = *work.connection;
     const std::string authorization = authorizationOf(work.http);
     return connection.kind != Listener::Kind::Unix && !authorization.empty() &&
-           (!connection.caller || authorization != connection.authorization);
+           (!isKnown(connection) || authorization != connection.authorization);
 }
 
 Caller Authentication::callerOf(const Work& work) const {
     Connection& connection = *work.connection;
     Caller caller;
     if (connection.kind == Listener::Kind::Unix) {
-        if (!connection.caller) connection.caller = connection.peer ? rightsOf(*connection.peer) : Caller();
+        if (!isKnown(connection)) connection.know(connection.peer ? rightsOf(*connection.peer) : Caller());
         caller = *connection.caller;
         caller.mayRead = caller.mayRead || anonymousRead;
     } else if (authorizationOf(work.http).empty()) {
@@ -52,8 +57,26 @@ Caller Authentication::callerOf(const Work& work) const {
     return caller;
 }
 
-std::string claimedUser(const HttpRequest& request) {
-    const auto credentials = basicCredentials(authorizationOf(request));
+Caller Authentication::renewed(const Work& work, const Caller& caller) const {
+    const Connection& connection = *work.connection;
+    Caller anew;
+    if (connection.kind == Listener::Kind::Unix) {
+        if (connection.peer) anew = rightsOf(*connection.peer);
+        anew.mayRead = anew.mayRead || anonymousRead;
+    } else if (caller.user.empty()) {
+        return caller; // nobody in particular: no rights of a user
+    } else {
+        anew = rightsOf(caller.user);
+    }
+    anew.user = caller.user;
+    anew.address = caller.address;
+    return anew;
+}
+
+std::string claimedUser(const Work& work) {
+    const Connection& connection = *work.connection;
+    if (connection.kind == Listener::Kind::Unix) return connection.caller ? connection.caller->user : std::string();
+    const auto credentials = basicCredentials(authorizationOf(work.http));
     return credentials ? credentials->first : std::string();
 }
 

@@ -7,6 +7,7 @@
 #include <poll.h>
 
 #include <algorithm>
+#include <cstdint>
 
 namespace endpoint {
 namespace {
@@ -29,9 +30,9 @@ bool Connections::isCrowded(const Connection& connection) const {
                                         [&](const auto& each) { return isOne(each) && hasHungUp(*each); });
         return static_cast<unsigned>(counted - gone) >= limit;
     };
-    if (areOpen(most, [](const auto&) { return true; })) return true;
     if (connection.kind == Listener::Kind::Unix && connection.peer == uid_t{0}) return false;
-    return areOpen(mostOfAnAddress, [&](const auto& each) { return each->address == connection.address; });
+    if (areOpen(most, [](const auto&) { return true; })) return true;
+    return areOpen(mostOfAnAddress, [&](const auto& each) { return each->network == connection.network; });
 }
 
 void Connections::open(const ConnectionPointer& connection) {
@@ -93,6 +94,13 @@ std::string addressText(const sockaddr* address) {
         }
     }
     return text;
+}
+
+std::string networkText(const sockaddr* address) {
+    if (address->sa_family != AF_INET6) return addressText(address);
+    sockaddr_in6 network = *reinterpret_cast<const sockaddr_in6*>(address);
+    if (!IN6_IS_ADDR_V4MAPPED(&network.sin6_addr)) std::fill_n(&network.sin6_addr.s6_addr[8], 8, std::uint8_t{0});
+    return addressText(reinterpret_cast<const sockaddr*>(&network));
 }
 
 } // namespace endpoint

@@ -22,6 +22,7 @@ struct Connection {
     Listener::Kind kind = Listener::Kind::Unix;
     int socket = -1;
     std::string address;       ///< for the log
+    std::string network;       ///< that its limit counts: who has one address of IPv6 has all of its network
     std::optional<uid_t> peer; ///< at the other end of a Unix socket
     bool refused = false;      ///< nothing is read from it
 
@@ -32,6 +33,12 @@ struct Connection {
 
     std::string authorization; ///< that has been checked: its user is `caller`
     std::optional<Caller> caller;
+    Clock::time_point known; ///< since when
+
+    void know(Caller who) {
+        caller = std::move(who);
+        known = Clock::now();
+    }
 };
 
 using ConnectionPointer = std::shared_ptr<Connection>;
@@ -43,8 +50,8 @@ public:
 
     Connections(unsigned most, unsigned mostOfAnAddress);
 
-    /// Counts a connection in, or refuses and ends it: there are too many in all, or from its address. Root's over a
-    /// Unix socket are not counted by address.
+    /// Counts a connection in, or refuses and ends it: there are too many in all, or from its network. Root's over a
+    /// Unix socket are always let in: others must not be able to lock out who could end them.
     void open(const ConnectionPointer& connection);
     void close(const ConnectionPointer& connection);
 
@@ -70,5 +77,8 @@ private:
 
 /// An address of a network without its port; one of IPv4 looks the same on a socket for both kinds.
 std::string addressText(const sockaddr* address);
+
+/// The address itself for IPv4, the first 64 bits for IPv6.
+std::string networkText(const sockaddr* address);
 
 } // namespace endpoint

@@ -4,6 +4,7 @@
 
 #include <sys/random.h>
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <system_error>
@@ -58,7 +59,10 @@ std::string Contexts::keep(Enumeration enumeration, Clock::time_point now) {
     std::string name = randomName();
     const std::lock_guard lock(mutex);
     dropOld(now);
-    if (kept.size() >= mostContexts || held + sizeOf(enumeration) > mostBytes) {
+    const auto ofUser = std::count_if(
+        kept.begin(), kept.end(), [&](const auto& each) { return each.second.enumeration.user == enumeration.user; });
+    if (kept.size() >= mostContexts || static_cast<std::size_t>(ofUser) >= mostOfAUser ||
+        held + sizeOf(enumeration) > mostBytes) {
         throw cimxml::CimError(serverLimitsExceeded, "too many enumerations are open");
     }
     store(name, std::move(enumeration), now);

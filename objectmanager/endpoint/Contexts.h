@@ -20,11 +20,13 @@ struct Enumeration {
     std::chrono::seconds timeout{0};
 };
 
-/// The open enumerations. Their number and size are bounded; one that is not pulled in time goes. Safe for threads.
+/// The open enumerations. Their number, in all and of one user, and size are bounded; one that is not pulled in time
+/// goes. Safe for threads.
 class Contexts {
 public:
     using Clock = std::chrono::steady_clock;
     static constexpr std::size_t mostContexts = 64;
+    static constexpr std::size_t mostOfAUser = 16;
     static constexpr std::size_t mostBytes = 64U << 20U;
 
     /// Keeps an enumeration and returns its name, which nobody can guess. Throws CimError SERVER_LIMITS_EXCEEDED.

@@ -34,9 +34,11 @@ ConnectionPointer connectionAt(Listener::Kind kind, MHD_Connection* handle) {
     if (kind == Listener::Kind::Unix) {
         connection->peer = peerOf(connection->socket);
         connection->address = "unix:" + (connection->peer ? std::to_string(*connection->peer) : "?");
+        connection->network = connection->address;
     } else {
-        connection->address =
-            addressText(MHD_get_connection_info(handle, MHD_CONNECTION_INFO_CLIENT_ADDRESS)->client_addr);
+        const sockaddr* address = MHD_get_connection_info(handle, MHD_CONNECTION_INFO_CLIENT_ADDRESS)->client_addr;
+        connection->address = addressText(address);
+        connection->network = networkText(address);
     }
     return connection;
 }
@@ -140,7 +142,10 @@ private:
         if (!refusal && !isPosted(work->http)) refusal = endpoint::refuseHead(work->http);
         if (!refusal) refusal = parts.authentication.refuseHead(*work);
         if (!refusal) refusal = endpoint::refuseHead(work->http);
-        if (refusal) work->finish(std::move(*refusal));
+        if (refusal) {
+            work->caller.user = claimedUser(*work);
+            work->finish(std::move(*refusal));
+        }
         *context = new WorkPointer(work);
         return work->isFinished() ? send(*work) : MHD_YES;
     }

@@ -192,17 +192,18 @@ std::optional<HttpAnswer> refuseHead(const HttpRequest& request) {
     }
 }
 
-HttpAnswer exchange(Operations& operations, const HttpRequest& request, const Caller& caller) {
+HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller caller, const Permit& permit) {
     try {
         const cimxml::Request read = cimxml::readRequest(request.body);
         compareHeaders(request, prefixOf(request), read);
-        Outcome outcome = operations.answer(read, caller);
         HttpAnswer answer;
-        answer.body = std::move(outcome.message);
-        answer.cimStatus = outcome.code;
         answer.operation = read.name;
         answer.nameSpace = read.nameSpace;
         answer.className = subjectOf(read);
+        if (permit) permit(answer, changesSomething(read), caller);
+        Outcome outcome = operations.answer(read, caller);
+        answer.body = std::move(outcome.message);
+        answer.cimStatus = outcome.code;
         answer.headers = {{"Content-Type", "application/xml; charset=\"utf-8\""},
                           {"CIMOperation", "MethodResponse"},
                           {"Cache-Control", "no-cache"}};

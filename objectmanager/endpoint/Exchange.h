@@ -2,6 +2,7 @@
 
 #include "objectmanager/endpoint/Operations.h"
 
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -37,9 +38,13 @@ struct HttpAnswer {
 /// body may be read.
 std::optional<HttpAnswer> refuseHead(const HttpRequest& request);
 
+/// Hears what a message asks, as an answer says it for the log, before it is carried out, and whether that changes
+/// something; may look at the caller's rights anew, or throw.
+using Permit = std::function<void(const HttpAnswer& asked, bool changes, Caller& caller)>;
+
 /// The answer to a request whose head is not refused. `CIMObject` is compared leniently, since many clients do not
 /// encode it: its namespace and class, encoded or not, whatever its keys.
-HttpAnswer exchange(Operations& operations, const HttpRequest& request, const Caller& caller);
+HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller caller, const Permit& permit = {});
 
 /// A header's value, of several of that name joined by commas; nothing where there is none. Names compare without
 /// regard to case.

@@ -13,7 +13,10 @@ struct Limits {
     unsigned connectionsPerAddress = 8;
     std::chrono::milliseconds arrival = std::chrono::seconds(30); ///< of a whole request
     std::chrono::milliseconds answer = std::chrono::seconds(60);
-    std::chrono::milliseconds taking = std::chrono::seconds(60); ///< an answer that is ready
+    std::chrono::milliseconds taking = std::chrono::seconds(60);         ///< an answer that is ready
+    std::chrono::milliseconds trust = std::chrono::seconds(60);          ///< in a password and rights, once checked
+    std::chrono::milliseconds ending = std::chrono::seconds(30);         ///< of an operation while the server stops
+    std::chrono::milliseconds endingOfHanging = std::chrono::seconds(1); ///< and of one that took too long already
     std::size_t workers = 8;
     std::size_t passwordChecks = 4; ///< at once
     std::size_t queue = 64;

@@ -1,8 +1,10 @@
 #include "objectmanager/endpoint/Log.h"
 
+#include <poll.h>
 #include <unistd.h>
 
 #include <cerrno>
+#include <mutex>
 
 namespace endpoint {
 namespace {
@@ -31,7 +33,12 @@ std::string printable(std::string_view text, std::size_t longest, std::string_vi
 void log(std::string_view line) {
     constexpr std::size_t longest = 1024; // the journal makes several lines of very long ones
     const std::string whole = "vkcimd: " + printable(line, longest) + '\n';
-    // In one piece, so that the lines of several threads do not mix.
+    // In one piece, so that the lines of several threads do not mix. One thread at a time, so that the room that poll
+    // saw is still there: whoever blocked here would hold up the whole service.
+    static std::mutex writing;
+    const std::lock_guard lock(writing);
+    pollfd end = {STDERR_FILENO, POLLOUT, 0};
+    if (poll(&end, 1, 0) == 0) return;
     while (write(STDERR_FILENO, whole.data(), whole.size()) < 0 && errno == EINTR) {
     }
 }

@@ -96,13 +96,19 @@ void expectRight(const Caller& caller, bool changes) {
 
 } // namespace
 
+bool changesSomething(const cimxml::Request& request) {
+    if (!request.intrinsic) return true;
+    const Row* row = findRow(request.name);
+    return row != nullptr && row->changes;
+}
+
 Operations::Operations(std::vector<NameSpace> spaces, std::string host)
     : nameSpaces(std::move(spaces)), hostName(std::move(host)) {}
 
 // The checks come in the order of the standard's precedence of errors.
 std::string Operations::content(const cimxml::Request& request, const Caller& caller) {
     const Row* row = request.intrinsic ? findRow(request.name) : nullptr;
-    expectRight(caller, !request.intrinsic || (row != nullptr && row->changes));
+    expectRight(caller, changesSomething(request));
     if (request.intrinsic && (row == nullptr || row->run == nullptr)) {
         fail(CMPI_RC_ERR_NOT_SUPPORTED, request.name + " is not supported");
     }

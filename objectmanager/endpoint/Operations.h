@@ -15,6 +15,9 @@ struct Outcome {
     int code = 0;        ///< its CIM status
 };
 
+/// Whether only who may change something may ask for it.
+bool changesSomething(const cimxml::Request& request);
+
 /// The CIM operations over namespaces: a request in, an answer out. May be called from several threads at once.
 class Operations {
 public:

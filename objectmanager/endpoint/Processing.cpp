@@ -4,6 +4,8 @@
 
 #include <microhttpd.h>
 
+#include <stdexcept>
+
 namespace endpoint {
 namespace {
 
@@ -20,9 +22,9 @@ void Processing::begin(const WorkPointer& work) {
     const std::lock_guard lock(mutex);
     work->started = Work::Clock::now();
     working.insert(work);
+    work->caller.user = claimedUser(*work);
     MHD_suspend_connection(work->handle);
-    if (Authentication::takesPassword(*work)) {
-        work->caller.user = claimedUser(work->http);
+    if (authentication.takesPassword(*work)) {
         hand(work, checkers, &Processing::authenticate);
     } else {
         hand(work, workers, &Processing::operate);
@@ -35,9 +37,17 @@ void Processing::hand(const WorkPointer& work, Workers& to, void (Processing::*j
     if (!to.post([this, work, job] { (this->*job)(work); })) finish(work, plainAnswer(503, "too many requests"));
 }
 
+/// Whether a job still has to be done when its turn comes: one that waited for too long has been answered.
+bool Processing::take(Work& work, const char* doing) {
+    const std::lock_guard lock(mutex);
+    if (work.isFinished()) return false;
+    work.note(doing);
+    return true;
+}
+
 /// In a thread for passwords.
 void Processing::authenticate(const WorkPointer& work) {
-    work->note("authentication of its client");
+    if (!take(*work, "authentication of its client")) return;
     PasswordCheck check;
     try {
         check = checkPassword(work->http, work->connection->address);
@@ -45,7 +55,7 @@ void Processing::authenticate(const WorkPointer& work) {
         check.refusal = plainAnswer(500, error.what());
     }
     if (!check.caller) {
-        done(work, work->caller, std::move(check.refusal));
+        done(work, std::move(check.refusal));
         return;
     }
     const std::lock_guard lock(mutex);
@@ -53,7 +63,7 @@ void Processing::authenticate(const WorkPointer& work) {
         cameBack(*work);
         return;
     }
-    work->connection->caller = std::move(check.caller);
+    work->connection->know(std::move(*check.caller));
     work->connection->authorization = headerOf(work->http, "Authorization").value_or("");
     work->note({});
     hand(work, workers, &Processing::operate);
@@ -61,32 +71,46 @@ void Processing::authenticate(const WorkPointer& work) {
 
 /// In a worker.
 void Processing::operate(const WorkPointer& work) {
+    if (!take(*work, "the rights of its client")) return;
     const CurrentWork current(*work);
-    work->note("the rights of its client");
     HttpAnswer made;
-    Caller caller;
     try {
-        caller = authentication.callerOf(*work);
-        made = exchange(operations, work->http, caller);
+        const Caller caller = authentication.callerOf(*work);
+        know(*work, caller);
+        made = exchange(operations, work->http, caller,
+                        [&](const HttpAnswer& asked, bool changes, Caller& by) { permit(*work, asked, changes, by); });
     } catch (const std::exception& error) {
         made = plainAnswer(500, error.what());
     }
-    done(work, caller, std::move(made));
+    done(work, std::move(made));
 }
 
-void Processing::done(const WorkPointer& work, const Caller& caller, HttpAnswer made) {
+/// Also for the log line of a request that hangs.
+void Processing::know(Work& work, const Caller& caller) {
+    const std::lock_guard lock(mutex);
+    if (!work.isFinished()) work.caller = caller;
+}
+
+/// The last step before an operation: what was given up while the rights were looked up is not carried out.
+void Processing::permit(Work& work, const HttpAnswer& asked, bool changes, Caller& caller) const {
+    if (changes) caller = authentication.renewed(work, caller);
+    const std::lock_guard lock(mutex);
+    if (work.isFinished()) throw std::runtime_error("answered already");
+    work.asked = asked;
+}
+
+void Processing::done(const WorkPointer& work, HttpAnswer made) {
     const std::lock_guard lock(mutex);
     if (work->isFinished()) {
         cameBack(*work);
         return;
     }
-    work->caller = caller;
     finish(work, std::move(made));
 }
 
 /// Under the lock. An answer that was given in its place has gone to the client.
 void Processing::cameBack(const Work& work) {
-    if (work.replaced) work.workers->cameBack();
+    if (work.hangs) work.workers->cameBack(work.replaced);
     log("a request came back after all: " + work.noted());
 }
 
@@ -103,17 +127,21 @@ void Processing::answerForHanging() {
     for (const WorkPointer& work : std::set<WorkPointer>(working)) {
         if (now - work->started <= limits.answer) continue;
         const std::string doing = work->noted();
-        work->replaced = !doing.empty() && work->workers->replace();
+        work->hangs = !doing.empty();
+        work->replaced = work->hangs && work->workers->replace();
         log("no answer in time: " + (doing.empty() ? "all threads were busy" : doing) +
-            (work->replaced || doing.empty() ? "" : "; no other thread takes its place"));
-        finish(work, plainAnswer(503, "no answer in time"));
+            (work->replaced || !work->hangs ? "" : "; no other thread takes its place"));
+        HttpAnswer late = work->asked; // for the log: what it was about
+        late.status = 503;
+        late.detail = "no answer in time";
+        finish(work, std::move(late));
     }
 }
 
 bool Processing::stop() {
     // Those that check passwords hand work on to the others.
-    const bool checked = checkers.stop();
-    const bool ended = workers.stop() && checked;
+    const bool checked = checkers.stop(std::chrono::milliseconds(0), limits.endingOfHanging);
+    const bool ended = workers.stop(limits.ending, limits.endingOfHanging) && checked;
     const std::lock_guard lock(mutex);
     for (const WorkPointer& work : std::set<WorkPointer>(working)) finish(work, plainAnswer(503, "stopping"));
     return ended;

@@ -22,14 +22,17 @@ public:
     /// Answers for workers that take too long.
     void answerForHanging();
 
-    /// Answers what is left. Whether no worker hangs.
+    /// Lets what is running end, and answers what is left. Whether no worker hangs.
     bool stop();
 
 private:
     void hand(const WorkPointer& work, Workers& to, void (Processing::*job)(const WorkPointer&));
     void authenticate(const WorkPointer& work);
     void operate(const WorkPointer& work);
-    void done(const WorkPointer& work, const Caller& caller, HttpAnswer made);
+    bool take(Work& work, const char* doing);
+    void know(Work& work, const Caller& caller);
+    void permit(Work& work, const HttpAnswer& asked, bool changes, Caller& caller) const;
+    void done(const WorkPointer& work, HttpAnswer made);
     static void cameBack(const Work& work);
     void finish(const WorkPointer& work, HttpAnswer made);
 
@@ -38,7 +41,7 @@ private:
     const Limits limits;
     Workers workers;
     Workers checkers;
-    std::mutex mutex; // of what follows, and of what is handed on or answered
+    mutable std::mutex mutex; // of what follows, and of what is handed on or answered
     std::set<WorkPointer> working;
 };
 

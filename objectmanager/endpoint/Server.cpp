@@ -10,7 +10,7 @@ namespace endpoint {
 class Server::Impl {
 public:
     Impl(Operations& operations, const ServerSettings& settings)
-        : parts{settings.limits, settings.certificate, Authentication(settings.anonymousRead),
+        : parts{settings.limits, settings.certificate, Authentication(settings.anonymousRead, settings.limits.trust),
                 Connections(settings.limits.connections, settings.limits.connectionsPerAddress),
                 Processing(operations, parts.authentication, settings.limits)} {}
 

@@ -22,10 +22,12 @@ public:
     HttpRequest http;
     ConnectionPointer connection;
     MHD_Connection* handle = nullptr;
-    Caller caller;
+    Caller caller;    ///< as soon as it is known
+    HttpAnswer asked; ///< what an answer says for the log, as soon as the message was read
     Clock::time_point started = Clock::now();
     bool tooLarge = false;
     Workers* workers = nullptr; ///< those that it was handed to
+    bool hangs = false;         ///< its thread was named in the log
     bool replaced = false;      ///< another thread took the place of the one that hangs in it
 
     /// Takes a piece of the body. Nothing is kept of one that is longer than allowed, and false says that it goes on

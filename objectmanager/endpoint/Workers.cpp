@@ -1,6 +1,6 @@
 #include "objectmanager/endpoint/Workers.h"
 
-#include <chrono>
+#include <system_error>
 #include <thread>
 
 namespace endpoint {
@@ -11,7 +11,8 @@ Workers::Workers(std::size_t threads, std::size_t longestQueue, std::size_t most
 }
 
 Workers::~Workers() {
-    stop();
+    using namespace std::chrono_literals;
+    stop(0s, 1s);
 }
 
 void Workers::start() {
@@ -55,24 +56,32 @@ bool Workers::post(std::function<void()> job) {
 bool Workers::replace() {
     {
         const std::lock_guard lock(shared->mutex);
+        ++shared->hanging;
         if (shared->threads >= most) return false;
     }
-    start();
+    try {
+        start();
+    } catch (const std::system_error&) { // no thread is to be had: the others serve on
+        return false;
+    }
     return true;
 }
 
-void Workers::cameBack() {
+void Workers::cameBack(bool replaced) {
     const std::lock_guard lock(shared->mutex);
+    --shared->hanging;
+    if (!replaced) return;
     ++shared->surplus;
     shared->changed.notify_all();
 }
 
-bool Workers::stop() {
+bool Workers::stop(std::chrono::milliseconds patience, std::chrono::milliseconds patienceWithHanging) {
     std::unique_lock lock(shared->mutex);
     shared->stopping = true;
     shared->queue.clear();
     shared->changed.notify_all();
-    return shared->ended.wait_for(lock, std::chrono::seconds(1), [&] { return shared->threads == 0; });
+    shared->ended.wait_for(lock, patience, [&] { return shared->threads <= shared->hanging; });
+    return shared->ended.wait_for(lock, patienceWithHanging, [&] { return shared->threads == 0; });
 }
 
 } // namespace endpoint

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <condition_variable>
 #include <cstddef>
 #include <deque>
@@ -21,13 +22,15 @@ public:
 
     /// Whether the job was taken; the queue is full otherwise.
     bool post(std::function<void()> job);
-    /// Starts a thread beside one that hangs; false where there are too many already.
+    /// Says that a job hangs, and starts a thread beside its own; false where there are too many already, or where none
+    /// can be started.
     bool replace();
-    /// Says that a job came back after its thread had been replaced: one thread is too many then.
-    void cameBack();
+    /// Says that such a job came back. Where its thread had been replaced, one thread is too many then.
+    void cameBack(bool replaced);
 
-    /// Whether all threads have ended.
-    bool stop();
+    /// Drops what waits, and gives running jobs that time to end: those that hang, the second one. Whether all threads
+    /// have ended.
+    bool stop(std::chrono::milliseconds patience, std::chrono::milliseconds patienceWithHanging);
 
 private:
     /// Outlives the object while a thread hangs.
@@ -37,6 +40,7 @@ private:
         std::condition_variable ended; ///< a thread
         std::deque<std::function<void()>> queue;
         std::size_t threads = 0;
+        std::size_t hanging = 0; ///< of them
         std::size_t surplus = 0; ///< threads that are to end
         bool stopping = false;
     };

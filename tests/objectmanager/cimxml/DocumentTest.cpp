@@ -34,6 +34,17 @@ TEST(Document, ReadsWhatXmlAllows) {
     }
 }
 
+TEST(Document, IsRefusedWithMoreElementsThanAreTaken) {
+    pugi::xml_document document;
+    EXPECT_NO_THROW(load(document, "<A><V/><V></V></A>", 3));
+    try {
+        load(document, "<A><V/><V></V><V/></A>", 3);
+        ADD_FAILURE();
+    } catch (const Refusal& refusal) {
+        EXPECT_EQ(refusal.cimError, "request-not-valid");
+    }
+}
+
 TEST(Document, RefusesTheRest) {
     struct {
         std::string text;

@@ -1,5 +1,6 @@
 #include "objectmanager/cimxml/Request.h"
 
+#include "objectmanager/cimxml/Document.h"
 #include "objectmanager/cimxml/Errors.h"
 #include "tests/objectmanager/cimxml/Messages.h"
 
@@ -24,6 +25,16 @@ TEST(Request, ReadsAnIntrinsicOperation) {
     EXPECT_EQ(request.parameters[1].value.text, "TRUE");
     EXPECT_EQ(request.parameters[2].value.kind, Kind::Array);
     EXPECT_EQ(request.parameters[3].value.kind, Kind::None);
+}
+
+TEST(Request, HasABoundedNumberOfElements) {
+    const auto requestWith = [](int values) {
+        std::string array;
+        for (int i = 0; i < values; ++i) array += "<VALUE/>";
+        return intrinsic("EnumerateInstances", parameter("PropertyList", "<VALUE.ARRAY>" + array + "</VALUE.ARRAY>"));
+    };
+    EXPECT_NO_THROW(readRequest(requestWith(mostElements - 100)));
+    EXPECT_THROW(readRequest(requestWith(mostElements)), Refusal);
 }
 
 TEST(Request, ReadsAMethodOfAnInstanceAndOfAClass) {

@@ -112,6 +112,44 @@ TEST_F(ConnectionLimits, AThousandClientsThatGoAwayAtAnyPointDoNoHarm) {
     for (int n = 2; n < 40; ++n) served(ports[0], n);
 }
 
+ConnectionPointer connectionOf(Listener::Kind kind, const std::string& address) {
+    auto connection = std::make_shared<Connection>();
+    connection->kind = kind;
+    connection->address = connection->network = address;
+    return connection;
+}
+
+TEST(Connections, OfRootOverTheUnixSocketAreLetInWhenAllOthersAreTaken) {
+    Connections connections(2, 1);
+    for (const char* address : {"192.0.2.7", "192.0.2.8"}) {
+        const ConnectionPointer other = connectionOf(Listener::Kind::Http, address);
+        connections.open(other);
+        EXPECT_FALSE(other->refused);
+    }
+    for (int i = 0; i < 2; ++i) {
+        const ConnectionPointer root = connectionOf(Listener::Kind::Unix, "unix:0");
+        root->peer = uid_t{0};
+        connections.open(root);
+        EXPECT_FALSE(root->refused);
+    }
+    const ConnectionPointer user = connectionOf(Listener::Kind::Unix, "unix:1000");
+    user->peer = uid_t{1000};
+    connections.open(user);
+    EXPECT_TRUE(user->refused);
+}
+
+TEST(NetworkText, IsOneForAllAddressesOfAnIpv6Network) {
+    const auto of = [](const char* text) {
+        sockaddr_in6 address{};
+        address.sin6_family = AF_INET6;
+        inet_pton(AF_INET6, text, &address.sin6_addr);
+        return networkText(reinterpret_cast<const sockaddr*>(&address));
+    };
+    EXPECT_EQ(of("2001:db8:0:1::7"), of("2001:db8:0:1:ffff::8"));
+    EXPECT_NE(of("2001:db8:0:1::7"), of("2001:db8:0:2::7"));
+    EXPECT_EQ(of("::ffff:192.0.2.7"), "192.0.2.7");
+}
+
 TEST(AddressText, IsTheSameForIpv4OnASocketForBothKinds) {
     sockaddr_in6 address{};
     address.sin6_family = AF_INET6;

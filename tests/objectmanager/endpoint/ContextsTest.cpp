@@ -40,10 +40,27 @@ TEST(Contexts, OneThatIsNotPulledInTimeGoes) {
     EXPECT_TRUE(contexts.take(first, start + 118s));
 }
 
+Enumeration enumerationOf(const std::string& user) {
+    Enumeration made = enumeration();
+    made.user = user;
+    return made;
+}
+
+TEST(Contexts, NobodyTakesThoseOfOthers) {
+    Contexts contexts;
+    std::string name;
+    for (std::size_t i = 0; i < 16; ++i) name = contexts.keep(enumerationOf("greedy"));
+    EXPECT_THROW(contexts.keep(enumerationOf("greedy")), cimxml::CimError);
+    EXPECT_NO_THROW(contexts.keep(enumerationOf("other")));
+    contexts.take(name);
+    EXPECT_NO_THROW(contexts.keep(enumerationOf("greedy")));
+}
+
 TEST(Contexts, NumberAndSizeAreBounded) {
     Contexts contexts;
     const Contexts::Clock::time_point start{};
-    for (std::size_t i = 0; i < Contexts::mostContexts; ++i) contexts.keep(enumeration(), start);
+    for (std::size_t i = 0; i < Contexts::mostContexts; ++i)
+        contexts.keep(enumerationOf(std::to_string(i / 16)), start);
     EXPECT_THROW(contexts.keep(enumeration(), start), cimxml::CimError);
     EXPECT_NO_THROW(contexts.keep(enumeration(), start + 60s)); // the others are gone by then
     EXPECT_THROW(contexts.keep(enumeration(Contexts::mostBytes + 1), start + 60s), cimxml::CimError);

@@ -1,8 +1,11 @@
 #include "objectmanager/endpoint/Server.h"
 
+#include "objectmanager/endpoint/Rights.h"
 #include "tests/objectmanager/endpoint/RunningServer.h"
 
 #include <gmock/gmock.h>
+
+#include <unistd.h>
 
 namespace endpoint {
 namespace {
@@ -104,6 +107,57 @@ TEST_F(ServerTest, AProviderThatHangsHoldsItsOwnRequestOnly) {
     EXPECT_THAT(stuck.ask(request("VESKA_TimeService")), StartsWith("HTTP/1.1 503"));
     EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME"));
     EXPECT_THAT(testing::internal::GetCapturedStderr(), HasSubstr("EnumInstanceNames of VESKA_TimeService"));
+}
+
+TEST_F(ServerTest, WhatWasGivenUpInTheQueueIsNotCarriedOut) {
+    Limits limits;
+    limits.workers = 1;
+    limits.answer = std::chrono::milliseconds(100);
+    start(limits);
+    testing::internal::CaptureStderr();
+    for (int i = 0; i < 4; ++i) {
+        EXPECT_THAT(Client(path).ask(request("VESKA_TimeService")), StartsWith("HTTP/1.1 503"));
+    }
+    waitForHanging(4); // all threads that there may be
+    EXPECT_THAT(Client(path).ask(request()), StartsWith("HTTP/1.1 503"));
+    release();
+    while (Client(path).ask(request()).find("INSTANCENAME") == std::string::npos) std::this_thread::yield();
+    stopped = true;
+    running.join();
+    EXPECT_TRUE(server->shutDown());
+    EXPECT_EQ(asked, 5);
+    // Who asked for what is said of those that hang, too.
+    EXPECT_THAT(testing::internal::GetCapturedStderr(),
+                AllOf(HasSubstr(" EnumerateInstanceNames root/cimv2 VESKA_TimeService http=503"),
+                      testing::Not(HasSubstr(" - EnumerateInstanceNames"))));
+}
+
+TEST_F(ServerTest, AnOperationThatRunsMayEndWhileTheServerStops) {
+    Limits limits;
+    limits.endingOfHanging = std::chrono::milliseconds(200);
+    start(limits);
+    Client client(path);
+    client.send(request("VESKA_TimeService"));
+    waitForHanging(1);
+    stopped = true;
+    running.join();
+    bool clean = false;
+    std::thread stopping([&] { clean = server->shutDown(); });
+    std::this_thread::sleep_for(3 * limits.endingOfHanging);
+    release();
+    stopping.join();
+    EXPECT_TRUE(clean);
+    EXPECT_THAT(client.receive(), HasSubstr("INSTANCENAME"));
+}
+
+TEST_F(ServerTest, WhoAskedIsSaidOfAHeadThatIsRefused) {
+    start();
+    testing::internal::CaptureStderr();
+    Client client(path);
+    EXPECT_THAT(client.ask(request()), HasSubstr("INSTANCENAME"));
+    EXPECT_THAT(client.ask("GET /cimom HTTP/1.1\r\nHost: x\r\n\r\n"), StartsWith("HTTP/1.1 405"));
+    EXPECT_THAT(Client(path).ask(request()), HasSubstr("INSTANCENAME")); // by the thread that wrote the line before
+    EXPECT_THAT(testing::internal::GetCapturedStderr(), HasSubstr(rightsOf(getuid()).user + " - - - http=405"));
 }
 
 TEST_F(ServerTest, AFullQueueIsSaid) {
