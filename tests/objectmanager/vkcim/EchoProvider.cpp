@@ -1,7 +1,8 @@
 // A provider that answers with what it was asked, for tests of the command line. The class asked for chooses more:
 // Echo_Everything has every type, Echo_Fail and Echo_Odd answer errors, Echo_Flaky fails every second time,
 // Echo_Crowd says how many calls were inside at once, Echo_Missing knows no instance, Echo_Quiet takes changes without
-// a word, Echo_Crash ends the process. With ECHO_LOUD in the environment it prints on standard output in every way that there is.
+// a word, Echo_Crash ends the process. With ECHO_LOUD in the environment it prints on standard output in every way that
+// there is.
 #include <cmpift.h>
 
 #include <atomic>
