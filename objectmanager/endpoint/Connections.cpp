@@ -57,12 +57,22 @@ void Connections::close(const ConnectionPointer& connection) {
     const std::lock_guard lock(mutex);
     connections.erase(connection);
     lastUse = Clock::now();
+    changed.notify_all();
 }
 
 void Connections::enter(Connection& connection, Connection::Phase phase) {
     const std::lock_guard lock(mutex);
     connection.phase = phase;
     connection.since = Clock::now();
+    changed.notify_all();
+}
+
+void Connections::waitForAnswers(std::chrono::milliseconds patience) const {
+    std::unique_lock lock(mutex);
+    changed.wait_for(lock, patience, [this] {
+        return std::all_of(connections.begin(), connections.end(),
+                           [](const ConnectionPointer& each) { return each->phase == Connection::Phase::Receiving; });
+    });
 }
 
 void Connections::endSlow(std::chrono::milliseconds arrival, std::chrono::milliseconds taking) {

@@ -7,6 +7,7 @@
 #include <sys/types.h>
 
 #include <chrono>
+#include <condition_variable>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -61,6 +62,9 @@ public:
     /// Ends those whose request does not arrive in time, or who do not take their answer.
     void endSlow(std::chrono::milliseconds arrival, std::chrono::milliseconds taking);
 
+    /// Waits until no answer is on its way any more, or for as long as that.
+    void waitForAnswers(std::chrono::milliseconds patience) const;
+
     /// Since when nobody is there; nothing while somebody is.
     std::optional<Clock::time_point> idleSince() const;
 
@@ -70,6 +74,7 @@ private:
     const unsigned most;
     const unsigned mostOfAnAddress;
     mutable std::mutex mutex; // of what follows, and of the connections' times
+    mutable std::condition_variable changed;
     std::set<ConnectionPointer> connections;
     Clock::time_point lastUse = Clock::now();
     bool refusing = false; ///< it was said in the log

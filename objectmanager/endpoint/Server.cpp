@@ -31,6 +31,7 @@ public:
     bool shutDown() {
         if (daemons.empty()) return clean;
         clean = parts.processing.stop();
+        parts.connections.waitForAnswers(parts.limits.endingOfHanging);
         daemons.clear();
         return clean;
     }
