@@ -33,6 +33,9 @@ TEST(Rights, OfRootAreAllAndOfNobodyInParticularNone) {
 }
 
 TEST(Rights, AreNotThoseOfNobodyWhereTheyCannotBeLookedUp) {
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the undefined-behaviour sanitizer looks at an object's type through a pipe";
+#endif
     EXPECT_EXIT(askWithoutDescriptors(), testing::ExitedWithCode(0), "");
 }
 
