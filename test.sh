@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Builds the project and runs its tests: ./test.sh [CTEST ARGS]. With --coverage, the tests that mirror the provider's own
-# folders instead, in a tree of their own that counts how much of the provider they reach; gcovr.cfg says what must be.
+# directories instead, in a tree of their own that counts how much of the provider they reach; gcovr.cfg says what must be.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")"
 . scripts/common.sh

@@ -36,9 +36,8 @@ public:
     /// 2 enabled, 4 shutting down, 0 unknown; on purpose, another power state returns true and leaves `state`.
     bool getEnabledState(unsigned short& state) const;
     bool getDedicated(std::vector<unsigned short>& purposes) const;
-    /// Appends what identifies the computer, pair by pair, as it was when first asked for on this node. Returns
-    /// whether there is a chassis, and not whether there are pairs. On purpose: without a chassis it returns false
-    /// although both vectors were filled.
+    /// Appends what identifies the computer now, pair by pair. Returns whether there is a chassis, and not whether
+    /// there are pairs. On purpose: without a chassis it returns false although both vectors were filled.
     bool getIdentifyingInfo(std::vector<std::string>& descriptions, std::vector<std::string>& values) const;
     bool getOtherIdentifyingInfo(std::vector<std::string>& values) const;
     bool getIdentifyingDescriptions(std::vector<std::string>& descriptions) const;

@@ -62,11 +62,13 @@ std::vector<Row> rows() {
     return all;
 }
 
+std::string nameOf(const Row& row) {
+    const std::string name = nameOf(row.operation) + ("/" + row.className);
+    return row.assocClass.empty() ? name : name + "/" + row.assocClass;
+}
+
 std::string nameOf(const Row& row, bool live, int computers) {
-    std::string name = nameOf(row.operation);
-    name += "/" + row.className;
-    if (!row.assocClass.empty()) name += "/" + row.assocClass;
-    return name + (live ? "/live" : "/computers:" + std::to_string(computers));
+    return nameOf(row) + (live ? "/live" : "/computers:" + std::to_string(computers));
 }
 
 om::Request requestOf(const Row& row, om::ObjectManager& provider) {

@@ -21,7 +21,10 @@ inline const std::vector<int> one = {1};
 /// element of the class.
 std::vector<Row> rows();
 
-/// `EnumInstances/VESKA_ComputerSystem/computers:10`, or `/live`.
+/// `EnumInstances/VESKA_ComputerSystem`, behind it the association's class where there is one.
+std::string nameOf(const Row& row);
+
+/// The same with `/computers:10` or `/live` behind it.
 std::string nameOf(const Row& row, bool live, int computers);
 
 /// The request of a row, put to the host as it stands. Throws when the class has no element to ask for.

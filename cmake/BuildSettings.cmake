@@ -4,6 +4,7 @@ set(CMPI_INCLUDE_DIR "${CMAKE_SOURCE_DIR}/platform/include/cmpi" CACHE PATH "Dir
 set(VK_SANITIZE "" CACHE STRING "Sanitizers to build with, as -fsanitize takes them")
 option(VK_FUZZ "Build the fuzz targets (clang only)" OFF)
 option(VK_COVERAGE "Build for coverage" OFF)
+option(VK_JOINED "Compile several sources of a library at once (by default as VK_JOINED in the environment)" $ENV{VK_JOINED})
 
 if(NOT CMAKE_BUILD_TYPE AND NOT CMAKE_CONFIGURATION_TYPES)
     set(CMAKE_BUILD_TYPE RelWithDebInfo CACHE STRING "" FORCE)

@@ -1,6 +1,9 @@
 #include "tools/CommandLine.h"
 
+#include "objectmanager/vkcim/Terminal.h"
+
 #include <filesystem>
+#include <sstream>
 
 namespace tools {
 
@@ -15,7 +18,10 @@ std::optional<int> parse(CLI::App& app, const std::vector<std::string>& words, O
         app.parse(std::vector<std::string>(words.rbegin(), words.rend())); // CLI11 takes them from the back
         return std::nullopt;
     } catch (const CLI::Success& success) { // --help and --version
-        return app.exit(success, output.out, output.error);
+        std::ostringstream text;
+        const int status = app.exit(success, text, text);
+        output.out << vkcim::wrapped(text.str(), vkcim::lookOfStandardOutput().width);
+        return status;
     } catch (const CLI::Error& error) {
         return refuse(app, error.what(), output);
     }

@@ -3,8 +3,9 @@
  * and no others. What a request costs with it in an object manager is the floor for any provider there.
  *
  * The answers stand in a file beside the library, "LIBRARY.answers", one thing a line, its words parted by tabs:
- *   request   OPERATION CLASS      what follows answers this operation on this class (for associations: this
- * association) path      CLASS                an object path, or with properties an instance key       NAME TYPE VALUE
+ *   request   OPERATION CLASS      what follows answers this operation on this class or association
+ *   path      CLASS                an object path, or with properties an instance
+ *   key       NAME TYPE VALUE
  *   property  NAME TYPE VALUE      TYPE is string, datetime, boolean, uint8 to uint64 or sint8 to sint64
  *   array     NAME TYPE VALUE...
  */

@@ -8,6 +8,7 @@
 #include <array>
 #include <charconv>
 #include <cstdint>
+#include <cstring>
 #include <optional>
 
 namespace cimxml {
@@ -21,9 +22,34 @@ bool isXmlCharacter(std::uint32_t c) {
     return c < 0xD800 || (c >= 0xE000 && c < 0xFFFE) || (c >= 0x10000 && c <= 0x10FFFF);
 }
 
+std::uint32_t nextCharacter(const char*& at, const char* end) {
+    try {
+        return utf8::next(at, end);
+    } catch (const utf8::exception&) {
+        throw notWellFormed("the text is not UTF-8");
+    }
+}
+
+/// Whether eight bytes are all between 0x20 and 0x7F.
+bool arePlain(const char* at) {
+    constexpr std::uint64_t highBits = 0x8080808080808080U;
+    constexpr std::uint64_t blanks = 0x2020202020202020U;
+    std::uint64_t bytes = 0;
+    std::memcpy(&bytes, at, sizeof bytes);
+    return ((bytes | (bytes - blanks)) & highBits) == 0;
+}
+
 void checkCharacters(std::string_view text) {
-    for (const char* at = text.data(); at != text.data() + text.size();) {
-        if (!isXmlCharacter(utf8::unchecked::next(at))) throw notWellFormed("a character that XML does not have");
+    const char* const end = text.data() + text.size();
+    for (const char* at = text.data(); at != end;) {
+        const auto byte = static_cast<unsigned char>(*at);
+        if (end - at >= 8 && arePlain(at)) { // most of them
+            at += 8;
+        } else if (byte >= 0x20 && byte < 0x80) {
+            ++at;
+        } else if (!isXmlCharacter(nextCharacter(at, end))) {
+            throw notWellFormed("a character that XML does not have");
+        }
     }
 }
 
@@ -44,19 +70,21 @@ public:
     Markup(std::string_view whole, int limit) : text(whole), most(limit) {}
 
     void check() {
-        for (at = text.find_first_of("<&"); at < text.size(); at = text.find_first_of("<&", at)) {
-            if (text[at] == '&') {
+        while (at < text.size()) {
+            if (text[at] != '<' && text[at] != '&') {
+                ++at;
+            } else if (text[at] == '&') {
                 reference();
+            } else if (!starts("<!") && !starts("<?")) { // most of them
+                tag();
             } else if (starts("<!--")) {
                 skipTo("-->", 4);
             } else if (starts("<![CDATA[")) {
                 skipTo("]]>", 9);
             } else if (starts("<?")) {
                 skipTo("?>", 2);
-            } else if (starts("<!")) {
-                throw notValid("a document type");
             } else {
-                tag();
+                throw notValid("a document type");
             }
         }
     }
@@ -100,6 +128,7 @@ private:
         char quote = 0;
         for (++at; at < text.size(); ++at) {
             const char c = text[at];
+            if (c > '>') continue; // a letter, and what else no markup is made of
             if (c == '&') {
                 reference();
                 --at;
@@ -127,7 +156,6 @@ private:
 
 void load(pugi::xml_document& document, std::string_view text, int most) {
     if (text.substr(0, byteOrderMark.size()) == byteOrderMark) text.remove_prefix(byteOrderMark.size());
-    if (!utf8::is_valid(text.begin(), text.end())) throw notWellFormed("the text is not UTF-8");
     checkCharacters(text);
     Markup(text, most).check();
     const pugi::xml_parse_result result = document.load_buffer(

@@ -27,8 +27,18 @@ std::shared_ptr<const T> shared(T value) {
     return std::make_shared<const T>(std::move(value));
 }
 
+/// The first element among a node and its siblings; none where there is none left. Throws where text stands before it.
+pugi::xml_node elementFrom(pugi::xml_node node) {
+    for (; node && node.type() != pugi::node_element; node = node.next_sibling()) {
+        if (isText(node) && std::string_view(node.value()).find_first_not_of(blanks) != std::string_view::npos) {
+            throw notValid(std::string("text in element ") + node.parent().name());
+        }
+    }
+    return node;
+}
+
 void expectEmpty(const pugi::xml_node& node) {
-    if (!childElements(node).empty()) throw notValid(std::string("element ") + node.name() + " is empty");
+    if (elementFrom(node.first_child())) throw notValid(std::string("element ") + node.name() + " is empty");
 }
 
 /// Two children of these kinds, in this order.
@@ -121,21 +131,18 @@ PropertyElement readProperty(const pugi::xml_node& node) {
 
 std::vector<pugi::xml_node> childElements(const pugi::xml_node& node) {
     std::vector<pugi::xml_node> found;
-    for (const pugi::xml_node& child : node) {
-        if (child.type() == pugi::node_element) {
-            found.push_back(child);
-        } else if (isText(child) &&
-                   std::string_view(child.value()).find_first_not_of(blanks) != std::string_view::npos) {
-            throw notValid(std::string("text in element ") + node.name());
-        }
+    for (pugi::xml_node child = elementFrom(node.first_child()); child; child = elementFrom(child.next_sibling())) {
+        found.push_back(child);
     }
     return found;
 }
 
 pugi::xml_node onlyChild(const pugi::xml_node& node) {
-    const std::vector<pugi::xml_node> children = childElements(node);
-    if (children.size() != 1) throw notValid(std::string("element ") + node.name() + " holds one element");
-    return children.front();
+    const pugi::xml_node child = elementFrom(node.first_child());
+    if (!child || elementFrom(child.next_sibling())) {
+        throw notValid(std::string("element ") + node.name() + " holds one element");
+    }
+    return child;
 }
 
 void checkAttributes(const pugi::xml_node& node, std::initializer_list<std::string_view> allowed) {

@@ -27,8 +27,19 @@ constexpr Table makeTable(bool attribute) {
     return table;
 }
 
+/// Whether a byte stays as it is.
+using Plain = std::array<bool, 256>;
+
+constexpr Plain makePlain(const Table& table) {
+    Plain plain{};
+    for (std::size_t c = 0; c < table.size(); ++c) plain[c] = table[c].empty();
+    return plain;
+}
+
 constexpr Table textTable = makeTable(false);
 constexpr Table attributeTable = makeTable(true);
+constexpr Plain textPlain = makePlain(textTable);
+constexpr Plain attributePlain = makePlain(attributeTable);
 
 bool isNoCharacter(std::string_view utf8) {
     return utf8 == "\xEF\xBF\xBE" || utf8 == "\xEF\xBF\xBF";
@@ -48,35 +59,31 @@ const char* appendWide(std::string& out, const char* at, const char* end) {
     return next;
 }
 
-void append(std::string& out, std::string_view text, const Table& table) {
+void append(std::string& out, std::string_view text, const Table& table, const Plain& plain) {
     const char* const end = text.data() + text.size();
-    const char* plain = text.data(); // from here on nothing was written yet
-    for (const char* at = plain; at != end;) {
+    for (const char* at = text.data();;) {
+        const char* const first = at;
+        while (at != end && plain[static_cast<unsigned char>(*at)]) ++at;
+        out.append(first, at);
+        if (at == end) return;
         const auto byte = static_cast<unsigned char>(*at);
-        if (byte < table.size() && table[byte].empty()) {
-            ++at;
-            continue;
-        }
-        out.append(plain, at);
         if (byte < table.size()) {
             out += table[byte];
             ++at;
         } else {
             at = appendWide(out, at, end);
         }
-        plain = at;
     }
-    out.append(plain, end);
 }
 
 } // namespace
 
 void appendText(std::string& out, std::string_view text) {
-    append(out, text, textTable);
+    append(out, text, textTable, textPlain);
 }
 
 void appendAttribute(std::string& out, std::string_view text) {
-    append(out, text, attributeTable);
+    append(out, text, attributeTable, attributePlain);
 }
 
 } // namespace cimxml

@@ -8,7 +8,8 @@
 namespace cimxml {
 namespace {
 
-constexpr std::string_view declaration = "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n";
+constexpr std::string_view beginning = "<?xml version=\"1.0\" encoding=\"utf-8\"?>\n"
+                                       "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">";
 
 /// Indexed by status.
 constexpr std::array<const char*, 29> names = {"",
@@ -64,27 +65,18 @@ std::string errorName(int code) {
     return std::string("CIM_ERR_") + names[isKnown(code) ? static_cast<std::size_t>(code) : 1];
 }
 
-std::string enclosed(std::string_view before, std::string content, std::string_view behind) {
-    content.append(behind);
-    content.insert(0, before);
+Pieces response(const Request& request, Pieces content) {
+    Writer before;
+    before.raw(beginning);
+    before.open("MESSAGE", {{"ID", request.id}, {"PROTOCOLVERSION", "1.0"}});
+    before.open("SIMPLERSP");
+    before.open(request.intrinsic ? "IMETHODRESPONSE" : "METHODRESPONSE", {{"NAME", request.name}});
+    content.enclose(before.text(), request.intrinsic ? "</IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>"
+                                                     : "</METHODRESPONSE></SIMPLERSP></MESSAGE></CIM>");
     return content;
 }
 
-std::string response(const Request& request, std::string content) {
-    const char* const element = request.intrinsic ? "IMETHODRESPONSE" : "METHODRESPONSE";
-    Writer before;
-    before.raw(declaration);
-    before.open("CIM", {{"CIMVERSION", "2.0"}, {"DTDVERSION", "2.0"}});
-    before.open("MESSAGE", {{"ID", request.id}, {"PROTOCOLVERSION", "1.0"}});
-    before.open("SIMPLERSP");
-    before.open(element, {{"NAME", request.name}});
-    Writer behind;
-    behind.close(element);
-    for (const char* each : {"SIMPLERSP", "MESSAGE", "CIM"}) behind.close(each);
-    return enclosed(before.text(), std::move(content), behind.text());
-}
-
-std::string errorResponse(const Request& request, int code, std::string_view description) {
+Pieces errorResponse(const Request& request, int code, std::string_view description) {
     const int sent = isKnown(code) ? code : CMPI_RC_ERR_FAILED;
     Writer writer;
     writer.empty("ERROR", {{"CODE", std::to_string(sent)},

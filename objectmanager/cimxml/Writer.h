@@ -21,6 +21,10 @@ public:
     using Attribute = std::pair<std::string_view, std::string_view>;
     using Attributes = std::initializer_list<Attribute>;
 
+    Writer() = default;
+    /// Writes behind what is there, and into the room that it has.
+    explicit Writer(std::string begun) : out(std::move(begun)) {}
+
     const std::string& text() const { return out; }
     std::string take() { return std::move(out); }
 

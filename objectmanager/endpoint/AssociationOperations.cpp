@@ -13,38 +13,40 @@ bool isClassRequest(const Call& call, const cimxml::PathElement& source) {
     return source.keys.empty() && known != nullptr && !known->keys.empty();
 }
 
+cimxml::Pieces classObjects(const Call& call, std::vector<std::string> names) {
+    ClassSelection parts = ClassSelection::of(call, false);
+    parts.localOnly = false;
+    const auto write = [parts, &host = call.host, &space = call.space](cimxml::Writer& writer,
+                                                                       const std::string& name) {
+        writer.open("VALUE.OBJECTWITHPATH");
+        writer.classPath(host, space.name, name);
+        writeClass(writer, *space.schema, *space.schema->find(name), parts);
+        writer.close("VALUE.OBJECTWITHPATH");
+    };
+    return returned(cimxml::Pieces(cimxml::oneByOne(std::move(names), write)));
+}
+
 /// VALUE.OBJECTWITHPATH for each instance or class.
-std::string objects(const Call& call, bool toReferences) {
+cimxml::Pieces objects(const Call& call, bool toReferences) {
     const Selection selection(call);
     const cimxml::PathElement& source = call.parameters.requiredObjectName("ObjectName");
     const Traversal traversal = traversalFrom(call, source, toReferences);
-    cimxml::Writer writer;
-    if (isClassRequest(call, source)) {
-        ClassSelection parts = ClassSelection::of(call, false);
-        parts.localOnly = false;
-        for (const std::string& name : associatedClasses(call, traversal)) {
-            writer.open("VALUE.OBJECTWITHPATH");
-            writer.classPath(call.host, call.space.name, name);
-            writeClass(writer, call.schema(), *call.schema().find(name), parts);
-            writer.close("VALUE.OBJECTWITHPATH");
-        }
-        return returned(writer.take());
-    }
-    for (const om::Instance& instance : associatedInstances(call, traversal, selection)) {
+    if (isClassRequest(call, source)) return classObjects(call, associatedClasses(call, traversal));
+    const auto write = [selection, &host = call.host](cimxml::Writer& writer, const om::Instance& instance) {
         writer.open("VALUE.OBJECTWITHPATH");
-        writer.instancePath(instance.path, call.host);
+        writer.instancePath(instance.path, host);
         selection.write(writer, instance);
         writer.close("VALUE.OBJECTWITHPATH");
-    }
-    return returned(writer.take());
+    };
+    return returned(cimxml::Pieces(cimxml::oneByOne(associatedInstances(call, traversal, selection), write)));
 }
 
 /// OBJECTPATH for each instance or class.
-std::string names(const Call& call, bool toReferences) {
+cimxml::Pieces names(const Call& call, bool toReferences) {
     const cimxml::PathElement& source = call.parameters.requiredObjectName("ObjectName");
     const Traversal traversal = traversalFrom(call, source, toReferences);
-    cimxml::Writer writer;
     if (isClassRequest(call, source)) {
+        cimxml::Writer writer; // there are only so many classes
         for (const std::string& name : associatedClasses(call, traversal)) {
             writer.open("OBJECTPATH");
             writer.classPath(call.host, call.space.name, name);
@@ -52,26 +54,26 @@ std::string names(const Call& call, bool toReferences) {
         }
         return returned(writer.take());
     }
-    for (const om::ObjectPath& path : associatedPaths(call, traversal)) {
+    const auto write = [&host = call.host](cimxml::Writer& writer, const om::ObjectPath& path) {
         writer.open("OBJECTPATH");
-        writer.instancePath(path, call.host);
+        writer.instancePath(path, host);
         writer.close("OBJECTPATH");
-    }
-    return returned(writer.take());
+    };
+    return returned(cimxml::Pieces(cimxml::oneByOne(associatedPaths(call, traversal), write)));
 }
 
 } // namespace
 
-std::string associators(const Call& call) {
+cimxml::Pieces associators(const Call& call) {
     return objects(call, false);
 }
-std::string associatorNames(const Call& call) {
+cimxml::Pieces associatorNames(const Call& call) {
     return names(call, false);
 }
-std::string references(const Call& call) {
+cimxml::Pieces references(const Call& call) {
     return objects(call, true);
 }
-std::string referenceNames(const Call& call) {
+cimxml::Pieces referenceNames(const Call& call) {
     return names(call, true);
 }
 

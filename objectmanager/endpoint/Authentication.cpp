@@ -34,6 +34,13 @@ bool Authentication::isKnown(const Connection& connection) const {
     return connection.caller && Connection::Clock::now() - connection.known <= trust;
 }
 
+/// The user at the other end of a Unix socket, with the rights of this moment.
+Caller Authentication::localUser(const Connection& connection) const {
+    Caller caller = connection.peer ? rightsOf(*connection.peer) : Caller();
+    caller.mayRead = caller.mayRead || anonymousRead;
+    return caller;
+}
+
 bool Authentication::takesPassword(const Work& work) const {
     const Connection& connection = *work.connection;
     const std::string authorization = authorizationOf(work.http);
@@ -45,9 +52,8 @@ Caller Authentication::callerOf(const Work& work) const {
     Connection& connection = *work.connection;
     Caller caller;
     if (connection.kind == Listener::Kind::Unix) {
-        if (!isKnown(connection)) connection.know(connection.peer ? rightsOf(*connection.peer) : Caller());
+        if (!isKnown(connection)) connection.know(localUser(connection));
         caller = *connection.caller;
-        caller.mayRead = caller.mayRead || anonymousRead;
     } else if (authorizationOf(work.http).empty()) {
         caller.mayRead = mayBeAnonymous(connection);
     } else {
@@ -61,8 +67,7 @@ Caller Authentication::renewed(const Work& work, const Caller& caller) const {
     const Connection& connection = *work.connection;
     Caller anew;
     if (connection.kind == Listener::Kind::Unix) {
-        if (connection.peer) anew = rightsOf(*connection.peer);
-        anew.mayRead = anew.mayRead || anonymousRead;
+        anew = localUser(connection);
     } else if (caller.user.empty()) {
         return caller; // nobody in particular: no rights of a user
     } else {

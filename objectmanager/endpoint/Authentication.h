@@ -32,6 +32,8 @@ private:
 
     bool isKnown(const Connection& connection) const;
 
+    Caller localUser(const Connection& connection) const;
+
     bool anonymousRead;
     std::chrono::milliseconds trust;
 };

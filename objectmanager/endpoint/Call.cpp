@@ -1,7 +1,5 @@
 #include "objectmanager/endpoint/Call.h"
 
-#include "objectmanager/cimxml/Message.h"
-
 #include <algorithm>
 
 namespace endpoint {
@@ -50,8 +48,7 @@ bool isServed(const Call& call, std::string_view className) {
     return om::containsName(call.schema().served(), className);
 }
 
-om::Answer ask(const Call& call, om::Request request) {
-    request.principal = call.caller.user;
+om::Answer ask(const Call& call, const om::Request& request) {
     om::Answer answer;
     try {
         answer = call.space.ask(request);
@@ -86,6 +83,7 @@ om::Request requestFor(const Call& call, om::Operation operation, om::ObjectPath
     request.operation = operation;
     request.path = std::move(path);
     request.path.nameSpace = call.space.name;
+    request.principal = call.caller.user;
     return request;
 }
 
@@ -95,8 +93,9 @@ om::Request requestFor(const Call& call, om::Operation operation, const std::str
     return requestFor(call, operation, std::move(path));
 }
 
-std::string returned(std::string elements) {
-    return cimxml::enclosed("<IRETURNVALUE>", std::move(elements), "</IRETURNVALUE>");
+cimxml::Pieces returned(cimxml::Pieces elements) {
+    elements.enclose("<IRETURNVALUE>", "</IRETURNVALUE>");
+    return elements;
 }
 
 } // namespace endpoint

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "objectmanager/cimxml/Errors.h"
+#include "objectmanager/cimxml/Pieces.h"
 #include "objectmanager/cimxml/Typing.h"
 #include "objectmanager/cimxml/Writer.h"
 #include "objectmanager/endpoint/NameSpace.h"
@@ -17,7 +18,8 @@ namespace endpoint {
 
 class Contexts;
 
-/// One operation under way: what was asked, by whom, in which namespace.
+/// One operation under way: what was asked, by whom, in which namespace. Elements of an answer may be written when the
+/// call has ended: of all this, only namespace, schema and host are there then.
 struct Call {
     const cimxml::Request& request;
     const Parameters& parameters;
@@ -47,7 +49,7 @@ void expectAllKeys(const Call& call, const om::ObjectPath& path);
 bool isServed(const Call& call, std::string_view className);
 
 /// Asks the namespace's provider; a status other than OK is thrown as CimError.
-om::Answer ask(const Call& call, om::Request request);
+om::Answer ask(const Call& call, const om::Request& request);
 /// Asks for each of these requests and hands over its answer, with its place among them. One that answers NOT_SUPPORTED
 /// is passed over where another one answers.
 void askEach(const Call& call, const std::vector<om::Request>& requests,
@@ -57,6 +59,6 @@ om::Request requestFor(const Call& call, om::Operation operation, om::ObjectPath
 om::Request requestFor(const Call& call, om::Operation operation, const std::string& className);
 
 /// IRETURNVALUE around elements.
-std::string returned(std::string elements);
+cimxml::Pieces returned(cimxml::Pieces elements);
 
 } // namespace endpoint

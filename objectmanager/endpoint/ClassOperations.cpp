@@ -21,7 +21,7 @@ std::vector<const om::ClassDeclaration*> subclasses(const Call& call) {
 
 } // namespace
 
-std::string getClass(const Call& call) {
+cimxml::Pieces getClass(const Call& call) {
     const ClassSelection selection = ClassSelection::of(call, true);
     const std::string name = call.parameters.requiredClassName("ClassName");
     const om::ResolvedClass& known = knownClass(call, name, CMPI_RC_ERR_NOT_FOUND);
@@ -30,22 +30,22 @@ std::string getClass(const Call& call) {
     return returned(writer.take());
 }
 
-std::string enumerateClasses(const Call& call) {
+cimxml::Pieces enumerateClasses(const Call& call) {
     const ClassSelection selection = ClassSelection::of(call, true);
-    cimxml::Writer writer;
-    for (const om::ClassDeclaration* declared : subclasses(call)) {
-        writeClass(writer, call.schema(), *declared, selection);
-    }
-    return returned(writer.take());
+    const auto write = [selection, &schema = call.schema()](cimxml::Writer& writer,
+                                                            const om::ClassDeclaration* declared) {
+        writeClass(writer, schema, *declared, selection);
+    };
+    return returned(cimxml::Pieces(cimxml::oneByOne(subclasses(call), write)));
 }
 
-std::string enumerateClassNames(const Call& call) {
+cimxml::Pieces enumerateClassNames(const Call& call) {
     cimxml::Writer writer;
     for (const om::ClassDeclaration* declared : subclasses(call)) writer.className(declared->name);
     return returned(writer.take());
 }
 
-std::string getQualifier(const Call& call) {
+cimxml::Pieces getQualifier(const Call& call) {
     const std::string name = call.parameters.requiredText("QualifierName");
     const om::QualifierType* type = om::findQualifierType(name);
     if (type == nullptr) fail(CMPI_RC_ERR_NOT_FOUND, "there is no qualifier " + name);
@@ -54,7 +54,7 @@ std::string getQualifier(const Call& call) {
     return returned(writer.take());
 }
 
-std::string enumerateQualifiers(const Call&) {
+cimxml::Pieces enumerateQualifiers(const Call&) {
     cimxml::Writer writer;
     for (const om::QualifierType& type : om::qualifierTypes()) writeQualifierType(writer, type);
     return returned(writer.take());

@@ -1,7 +1,10 @@
 #pragma once
 
+#include "objectmanager/cimxml/Writer.h"
+
 #include <chrono>
 #include <cstddef>
+#include <functional>
 #include <map>
 #include <mutex>
 #include <optional>
@@ -10,18 +13,21 @@
 
 namespace endpoint {
 
-/// An enumeration that a client pulls: the elements that it has not got yet, as they will be sent.
+/// An enumeration that a client pulls: what it has not got yet, and how that is written.
 struct Enumeration {
+    using Write = std::function<void(cimxml::Writer&, const om::Result&)>;
+
     std::string nameSpace;
     std::string user;
     bool paths = false; ///< or instances
-    std::vector<std::string> elements;
+    std::vector<om::Result> elements;
     std::size_t next = 0;
+    Write write;
     std::chrono::seconds timeout{0};
 };
 
-/// The open enumerations. Their number, in all and of one user, and size are bounded; one that is not pulled in time
-/// goes. Safe for threads.
+/// The open enumerations. Their number, in all and of one user, and the memory that they take are bounded; one that is
+/// not pulled in time goes. Safe for threads.
 class Contexts {
 public:
     using Clock = std::chrono::steady_clock;
@@ -45,7 +51,7 @@ private:
     };
 
     void dropOld(Clock::time_point now);
-    void store(const std::string& name, Enumeration enumeration, Clock::time_point now);
+    void store(const std::string& name, Enumeration enumeration, std::size_t bytes, Clock::time_point now);
 
     std::mutex mutex;
     std::map<std::string, Kept> kept;

@@ -14,6 +14,7 @@ namespace endpoint {
 namespace {
 
 constexpr const char* tlsPriorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2";
+constexpr std::size_t usualHeaders = 16;
 constexpr unsigned spareConnections = 8; ///< that are open while they are refused
 
 MHD_Result collectHeader(void* target, MHD_ValueKind, const char* key, const char* value) {
@@ -43,6 +44,11 @@ ConnectionPointer connectionAt(Listener::Kind kind, MHD_Connection* handle) {
     return connection;
 }
 
+/// Blanks behind a header's value are none of it, but libmicrohttpd leaves them there.
+void dropBlanksBehind(Headers& headers) {
+    for (auto& [name, value] : headers) value.erase(value.find_last_not_of(" \t") + 1);
+}
+
 bool isPosted(const HttpRequest& request) {
     return request.method == "POST" || request.method == "M-POST";
 }
@@ -60,14 +66,34 @@ std::optional<HttpAnswer> refuseLength(const HttpRequest& request, std::size_t l
     if (chunked && !om::sameName(*encoding, "chunked")) return plainAnswer(501, "Transfer-Encoding " + *encoding);
     if (isPosted(request) && !chunked && !announced) return plainAnswer(411, "no Content-Length");
     if (chunked && announced) return plainAnswer(400, "two lengths");
+    if (chunked && request.version == "HTTP/1.0") return plainAnswer(400, "chunks of HTTP/1.0");
     return std::nullopt;
 }
 
-MHD_Result send(Work& work) {
-    HttpAnswer& made = work.answer;
-    // It lies in the work, which MHD keeps until the request is completed.
-    MHD_Response* response =
-        MHD_create_response_from_buffer(made.body.size(), made.body.data(), MHD_RESPMEM_PERSISTENT);
+/// A piece of an answer, for a connection that has room for it.
+ssize_t takePiece(void* target, std::uint64_t, char* to, std::size_t room) {
+    Work& work = *static_cast<Work*>(target);
+    try {
+        const std::size_t taken = work.take(to, room);
+        return taken > 0 ? static_cast<ssize_t>(taken) : MHD_CONTENT_READER_END_OF_STREAM;
+    } catch (const std::exception& error) {
+        work.breakOff(std::string("the answer cannot be written: ") + error.what());
+        return MHD_CONTENT_READER_END_WITH_ERROR;
+    }
+}
+
+/// What the answer holds lies in the work, which MHD keeps until the request is completed.
+MHD_Response* responseOf(Work& work, std::size_t piece) {
+    std::string& body = work.answer.body;
+    if (!work.answer.rest.isEmpty()) {
+        return MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, piece, &takePiece, &work, nullptr);
+    }
+    return MHD_create_response_from_buffer(body.size(), body.data(), MHD_RESPMEM_PERSISTENT);
+}
+
+MHD_Result send(Work& work, const Limits& limits) {
+    const HttpAnswer& made = work.answer;
+    MHD_Response* response = responseOf(work, limits.piece);
     for (const auto& [name, value] : made.headers) MHD_add_response_header(response, name.c_str(), value.c_str());
     // After a refusal nobody knows where the next request begins.
     if (made.status != 200 && made.status != 401) MHD_add_response_header(response, "Connection", "close");
@@ -108,7 +134,7 @@ public:
         if (!work->isFinished() && work->tooLarge) work->finish(plainAnswer(413, "the body is too large"));
         if (work->isFinished()) {
             parts.connections.enter(*work->connection, Connection::Phase::Sending);
-            return send(*work);
+            return send(*work, parts.limits);
         }
         parts.connections.enter(*work->connection, Connection::Phase::Working);
         parts.processing.begin(work);
@@ -122,7 +148,7 @@ public:
         if (!(*work)->isFinished()) {
             (*work)->finish(plainAnswer(400, "the request did not arrive"));
         } else if (ending != MHD_REQUEST_TERMINATED_COMPLETED_OK) {
-            (*work)->answer.detail += "the client did not take the answer";
+            (*work)->breakOff("the client did not take the answer");
         }
         log((*work)->logLine());
         static_cast<Daemon*>(target)->parts.connections.enter(*(*work)->connection, Connection::Phase::Receiving);
@@ -136,8 +162,12 @@ private:
         work->connection = connectionOf(handle);
         if (work->connection->refused) return MHD_NO; // what came before it was ended can still be read
         work->http = std::move(request);
+        work->http.headers.reserve(usualHeaders);
         MHD_get_connection_values(handle, MHD_HEADER_KIND, &collectHeader, &work->http.headers);
+        // Before the blanks go: libmicrohttpd knows no transfer encoding with them, and would wait for other bytes than
+        // we.
         auto refusal = refuseLength(work->http, parts.limits.body);
+        dropBlanksBehind(work->http.headers);
         // With another method nobody gets on, whoever it is.
         if (!refusal && !isPosted(work->http)) refusal = endpoint::refuseHead(work->http);
         if (!refusal) refusal = parts.authentication.refuseHead(*work);
@@ -147,7 +177,7 @@ private:
             work->finish(std::move(*refusal));
         }
         *context = new WorkPointer(work);
-        return work->isFinished() ? send(*work) : MHD_YES;
+        return work->isFinished() ? send(*work, parts.limits) : MHD_YES;
     }
 };
 

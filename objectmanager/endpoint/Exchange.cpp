@@ -80,12 +80,33 @@ bool isCimContent(std::string_view type) {
     return isOneOf(trimmed(parameter.substr(equals + 1)), {"utf-8", "\"utf-8\""});
 }
 
+/// Without the scheme and host that stand before the path in a request for a proxy: every server takes those, too.
+std::string_view pathWithin(std::string_view target) {
+    for (const std::string_view scheme : {"http://", "https://"}) {
+        if (!om::sameName(target.substr(0, scheme.size()), scheme)) continue;
+        const std::size_t slash = target.find('/', scheme.size());
+        return slash == std::string_view::npos ? "/" : target.substr(slash);
+    }
+    return target;
+}
+
 void checkMethod(const HttpRequest& request) {
     static constexpr std::array<std::string_view, 8> known = {"GET",     "HEAD",  "PUT",   "DELETE",
                                                               "OPTIONS", "PATCH", "TRACE", "CONNECT"};
     if (request.method == "POST" || request.method == "M-POST") return;
     const bool isKnown = std::find(known.begin(), known.end(), request.method) != known.end();
     throw Refusal(isKnown ? 405 : 501, "", "method " + request.method);
+}
+
+/// A name ends at its colon and a value with its line, for us and for whoever else reads the head.
+void checkHeaders(const Headers& headers) {
+    const auto isControl = [](char c) { return (static_cast<unsigned char>(c) < 0x20 && c != '\t') || c == 0x7F; };
+    const auto isHost = [](const auto& header) { return om::sameName(header.first, "Host"); };
+    for (const auto& [name, value] : headers) {
+        const bool isToken = !name.empty() && name.find_first_of(" \t") == std::string::npos;
+        if (!isToken || std::any_of(value.begin(), value.end(), isControl)) throw Refusal(400, "", "header " + name);
+    }
+    if (std::count_if(headers.begin(), headers.end(), isHost) > 1) throw Refusal(400, "", "more than one Host");
 }
 
 std::string requiredHeader(const HttpRequest& request, const std::string& name, const char* cimError) {
@@ -96,7 +117,8 @@ std::string requiredHeader(const HttpRequest& request, const std::string& name, 
 
 void checkHead(const HttpRequest& request) {
     checkMethod(request);
-    if (!isOneOf(request.path, {"/cimom", "/cimom/", "/"})) throw Refusal(404, "", "path " + request.path);
+    if (!isOneOf(pathWithin(request.path), {"/cimom", "/cimom/", "/"})) throw Refusal(404, "", "path " + request.path);
+    checkHeaders(request.headers);
     const std::string prefix = prefixOf(request);
     const std::string operation = requiredHeader(request, prefix + "CIMOperation", "");
     if (!om::sameName(operation, "MethodCall")) throw Refusal(400, "unsupported-operation", operation);
@@ -192,7 +214,8 @@ std::optional<HttpAnswer> refuseHead(const HttpRequest& request) {
     }
 }
 
-HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller caller, const Permit& permit) {
+HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller caller, const Permit& permit,
+                    std::size_t enough) {
     try {
         const cimxml::Request read = cimxml::readRequest(request.body);
         compareHeaders(request, prefixOf(request), read);
@@ -201,8 +224,9 @@ HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller c
         answer.nameSpace = read.nameSpace;
         answer.className = subjectOf(read);
         if (permit) permit(answer, changesSomething(read), caller);
-        Outcome outcome = operations.answer(read, caller);
+        Outcome outcome = operations.answer(read, caller, enough);
         answer.body = std::move(outcome.message);
+        answer.rest = std::move(outcome.rest);
         answer.cimStatus = outcome.code;
         answer.headers = {{"Content-Type", "application/xml; charset=\"utf-8\""},
                           {"CIMOperation", "MethodResponse"},

@@ -24,7 +24,8 @@ struct HttpRequest {
 struct HttpAnswer {
     unsigned status = 200;
     Headers headers;
-    std::string body; ///< empty unless the status is 200
+    std::string body;    ///< empty unless the status is 200
+    cimxml::Pieces rest; ///< what follows the body
 
     // For the log.
     std::string operation; ///< empty where the request was not read so far
@@ -43,8 +44,10 @@ std::optional<HttpAnswer> refuseHead(const HttpRequest& request);
 using Permit = std::function<void(const HttpAnswer& asked, bool changes, Caller& caller)>;
 
 /// The answer to a request whose head is not refused. `CIMObject` is compared leniently, since many clients do not
-/// encode it: its namespace and class, encoded or not, whatever its keys.
-HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller caller, const Permit& permit = {});
+/// encode it: its namespace and class, encoded or not, whatever its keys. A body of up to `enough` bytes, or a little
+/// more, is whole.
+HttpAnswer exchange(Operations& operations, const HttpRequest& request, Caller caller, const Permit& permit = {},
+                    std::size_t enough = std::numeric_limits<std::size_t>::max());
 
 /// A header's value, of several of that name joined by commas; nothing where there is none. Names compare without
 /// regard to case.

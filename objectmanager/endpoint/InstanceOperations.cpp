@@ -87,7 +87,7 @@ std::vector<om::ObjectPath> pathsOfClass(const Call& call) {
     return resultsBelow<om::ObjectPath>(call, className, om::Operation::EnumInstanceNames, std::nullopt);
 }
 
-std::string getInstance(const Call& call) {
+cimxml::Pieces getInstance(const Call& call) {
     const Selection selection(call);
     const om::ObjectPath path = servedPath(call, call.parameters.requiredInstanceName("InstanceName"));
     cimxml::Writer writer;
@@ -95,26 +95,24 @@ std::string getInstance(const Call& call) {
     return returned(writer.take());
 }
 
-std::string enumerateInstances(const Call& call) {
+cimxml::Pieces enumerateInstances(const Call& call) {
     Selection selection(call);
-    cimxml::Writer writer;
-    for (om::Instance& instance : instancesOfClass(call, selection)) {
+    std::vector<om::Instance> instances = instancesOfClass(call, selection);
+    const auto write = [selection](cimxml::Writer& writer, const om::Instance& instance) {
         writer.open("VALUE.NAMEDINSTANCE");
         writer.instanceName(instance.path);
         selection.write(writer, instance);
         writer.close("VALUE.NAMEDINSTANCE");
-        instance = om::Instance(); // its memory goes at once
-    }
-    return returned(writer.take());
+    };
+    return returned(cimxml::Pieces(cimxml::oneByOne(std::move(instances), write)));
 }
 
-std::string enumerateInstanceNames(const Call& call) {
-    cimxml::Writer writer;
-    for (const om::ObjectPath& path : pathsOfClass(call)) writer.instanceName(path);
-    return returned(writer.take());
+cimxml::Pieces enumerateInstanceNames(const Call& call) {
+    const auto write = [](cimxml::Writer& writer, const om::ObjectPath& path) { writer.instanceName(path); };
+    return returned(cimxml::Pieces(cimxml::oneByOne(pathsOfClass(call), write)));
 }
 
-std::string createInstance(const Call& call) {
+cimxml::Pieces createInstance(const Call& call) {
     const cimxml::InstanceElement& element = *call.parameters.required("NewInstance", Kind::Instance).instance;
     const om::ResolvedClass& known = knownClass(call, element.className);
     if (!isServed(call, element.className)) fail(CMPI_RC_ERR_NOT_SUPPORTED, "");
@@ -132,7 +130,7 @@ std::string createInstance(const Call& call) {
     return returned(writer.take());
 }
 
-std::string modifyInstance(const Call& call) {
+cimxml::Pieces modifyInstance(const Call& call) {
     call.parameters.flag("IncludeQualifiers", true);
     const cimxml::ValueElement& given = call.parameters.required("ModifiedInstance", Kind::NamedInstance);
     const auto list = call.parameters.names("PropertyList");
@@ -149,14 +147,14 @@ std::string modifyInstance(const Call& call) {
     return {};
 }
 
-std::string deleteInstance(const Call& call) {
+cimxml::Pieces deleteInstance(const Call& call) {
     const om::ObjectPath path = servedPath(call, call.parameters.requiredInstanceName("InstanceName"));
     expectAllKeys(call, path);
     ask(call, requestFor(call, om::Operation::DeleteInstance, path));
     return {};
 }
 
-std::string getProperty(const Call& call) {
+cimxml::Pieces getProperty(const Call& call) {
     const om::ObjectPath path = servedPath(call, call.parameters.requiredInstanceName("InstanceName"));
     const std::string name = declaredProperty(call, path, call.parameters.requiredText("PropertyName")).name;
     const om::Instance instance = fetch(call, path, std::vector<std::string>{name});
@@ -167,7 +165,7 @@ std::string getProperty(const Call& call) {
     return returned(writer.take());
 }
 
-std::string setProperty(const Call& call) {
+cimxml::Pieces setProperty(const Call& call) {
     const om::ObjectPath path = servedPath(call, call.parameters.requiredInstanceName("InstanceName"));
     expectAllKeys(call, path);
     const std::string name = call.parameters.requiredText("PropertyName");

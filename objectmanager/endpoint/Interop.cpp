@@ -5,7 +5,7 @@
 namespace endpoint {
 namespace {
 
-constexpr const char* name = "interop";
+constexpr const char* interopName = "interop";
 constexpr const char* managerClass = "VESKA_ObjectManager";
 constexpr const char* managerName = "vkcimd";
 constexpr const char* nameSpaceClass = "VESKA_Namespace";
@@ -77,7 +77,7 @@ om::Value text(std::string value) {
 /// An instance whose keys are its first properties.
 om::Instance instance(const char* className, std::vector<om::NamedValue> keys, std::vector<om::NamedValue> more) {
     om::Instance made;
-    made.path.nameSpace = name;
+    made.path.nameSpace = interopName;
     made.path.className = className;
     made.path.keys = keys;
     made.properties = std::move(keys);
@@ -140,10 +140,10 @@ om::Answer answer(const std::vector<om::Instance>& instances, const om::Request&
 } // namespace
 
 NameSpace interopNameSpace(std::vector<std::string> others, const std::string& host) {
-    others.emplace_back(name);
+    others.emplace_back(interopName);
     std::vector<om::Instance> instances = {manager(host)};
     for (const std::string& each : others) instances.push_back(nameSpace(host, each));
-    return {name, {"root/interop"}, &schema(), [made = std::move(instances)](const om::Request& request) {
+    return {interopName, {"root/interop"}, &schema(), [made = std::move(instances)](const om::Request& request) {
                 return answer(made, request);
             }};
 }

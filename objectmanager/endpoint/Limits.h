@@ -9,7 +9,9 @@ namespace endpoint {
 struct Limits {
     std::size_t body = std::size_t{1} << 20U;
     std::size_t head = std::size_t{16} << 10U;
-    unsigned connections = 64; ///< of all listeners together
+    std::size_t wholeAnswer = std::size_t{64} << 10U; ///< a longer one is written while it is sent
+    std::size_t piece = std::size_t{16} << 10U;       ///< of it, at once
+    unsigned connections = 64;                        ///< of all listeners together
     unsigned connectionsPerAddress = 8;
     std::chrono::milliseconds arrival = std::chrono::seconds(30); ///< of a whole request
     std::chrono::milliseconds answer = std::chrono::seconds(60);

@@ -9,22 +9,31 @@
 namespace endpoint {
 namespace {
 
-/// A character of a line, those of `special` escaped as well as those that cannot be printed.
-std::string printable(char c, std::string_view special) {
-    constexpr const char* digits = "0123456789abcdef";
-    const auto byte = static_cast<unsigned char>(c);
-    if (byte >= 0x20 && byte < 0x7f && special.find(c) == std::string_view::npos) return {c};
-    return {'\\', 'x', digits[byte >> 4U], digits[byte & 0xFU]};
+enum class Word { Bare, Quoted }; ///< in which its own quotes and escapes are escaped
+
+bool isPrintable(char c, Word word) {
+    return c >= 0x20 && c < 0x7f && (word == Word::Bare || (c != '"' && c != '\\'));
 }
 
-/// As much of a text as its escapes leave room for.
-std::string printable(std::string_view text, std::size_t longest, std::string_view special = {}) {
-    std::string line;
-    for (const char c : text) {
-        const std::string shown = printable(c, special);
-        if (line.size() + shown.size() > longest) break;
-        line += shown;
+/// Appends as much of a text as its escapes leave room for; what cannot be printed is escaped.
+void appendPrintable(std::string& line, std::string_view text, std::size_t longest, Word word) {
+    constexpr const char* digits = "0123456789abcdef";
+    constexpr std::size_t escape = 4;
+    for (std::size_t at = 0, room = longest; at < text.size();) {
+        const std::size_t first = at;
+        while (at < text.size() && at - first < room && isPrintable(text[at], word)) ++at;
+        line.append(text, first, at - first);
+        room -= at - first;
+        if (at == text.size() || room < escape || isPrintable(text[at], word)) return;
+        const auto byte = static_cast<unsigned char>(text[at++]);
+        line += {'\\', 'x', digits[byte >> 4U], digits[byte & 0xFU]};
+        room -= escape;
     }
+}
+
+std::string printable(std::string_view text, std::size_t longest, Word word) {
+    std::string line;
+    appendPrintable(line, text, longest, word);
     return line;
 }
 
@@ -32,7 +41,10 @@ std::string printable(std::string_view text, std::size_t longest, std::string_vi
 
 void log(std::string_view line) {
     constexpr std::size_t longest = 1024; // the journal makes several lines of very long ones
-    const std::string whole = "vkcimd: " + printable(line, longest) + '\n';
+    std::string whole = "vkcimd: ";
+    whole.reserve(line.size() + 16);
+    appendPrintable(whole, line, longest, Word::Bare);
+    whole += '\n';
     // In one piece, so that the lines of several threads do not mix. One thread at a time, so that the room that poll
     // saw is still there: whoever blocked here would hold up the whole service.
     static std::mutex writing;
@@ -46,13 +58,13 @@ void log(std::string_view line) {
 std::string logged(std::string_view text) {
     constexpr std::size_t longest = 128;
     if (text.empty()) return "-";
-    const std::string shown = printable(text, longest, "\"\\");
+    const std::string shown = printable(text, longest, Word::Quoted);
     return text.find_first_of(" \"") == std::string_view::npos ? shown : '"' + shown + '"';
 }
 
 std::string detailed(std::string_view text) {
     constexpr std::size_t longest = 256;
-    return printable(text, longest);
+    return printable(text, longest, Word::Bare);
 }
 
 } // namespace endpoint

@@ -39,7 +39,7 @@ std::vector<om::NamedValue> typedArguments(const Call& call, const om::MethodDec
 
 } // namespace
 
-std::string invokeMethod(const Call& call) {
+cimxml::Pieces invokeMethod(const Call& call) {
     const cimxml::PathElement& target = call.request.target;
     const om::ObjectPath path = typedPath(call, target, CMPI_RC_ERR_NOT_FOUND);
     const om::MethodDeclaration* method = call.schema().findMethod(path.className, call.request.name);

@@ -11,9 +11,11 @@ namespace {
 
 using Names = std::vector<std::string_view>;
 
+constexpr std::size_t usualMessage = 4096; ///< bytes, more than most have
+
 struct Row {
     std::string_view name;
-    std::string (*run)(const Call&); ///< null: an operation that nothing here serves
+    cimxml::Pieces (*run)(const Call&); ///< null: an operation that nothing here serves
     bool changes;
     Names parameters;
 };
@@ -94,6 +96,14 @@ void expectRight(const Caller& caller, bool changes) {
     if (changes && !caller.mayChange) fail(CMPI_RC_ERR_ACCESS_DENIED, "only administrators may change something");
 }
 
+Outcome begun(cimxml::Pieces message, int code, std::size_t enough) {
+    std::string room;
+    room.reserve(usualMessage);
+    cimxml::Writer writer(std::move(room));
+    message.writeTo(writer, enough);
+    return {writer.take(), std::move(message), code};
+}
+
 } // namespace
 
 bool changesSomething(const cimxml::Request& request) {
@@ -106,7 +116,7 @@ Operations::Operations(std::vector<NameSpace> spaces, std::string host)
     : nameSpaces(std::move(spaces)), hostName(std::move(host)) {}
 
 // The checks come in the order of the standard's precedence of errors.
-std::string Operations::content(const cimxml::Request& request, const Caller& caller) {
+cimxml::Pieces Operations::content(const cimxml::Request& request, const Caller& caller) {
     const Row* row = request.intrinsic ? findRow(request.name) : nullptr;
     expectRight(caller, changesSomething(request));
     if (request.intrinsic && (row == nullptr || row->run == nullptr)) {
@@ -118,19 +128,20 @@ std::string Operations::content(const cimxml::Request& request, const Caller& ca
         fail(CMPI_RC_ERR_INVALID_NAMESPACE, "there is no namespace " + request.nameSpace);
     }
     static const std::vector<cimxml::ParameterElement> none;
+    static const Names noNames;
     const Parameters parameters(request.intrinsic ? request.parameters : none,
-                                row != nullptr ? row->parameters : Names{});
+                                row != nullptr ? row->parameters : noNames);
     const Call call{request, parameters, *space, caller, hostName, contexts};
     return row != nullptr ? row->run(call) : invokeMethod(call);
 }
 
-Outcome Operations::answer(const cimxml::Request& request, const Caller& caller) {
+Outcome Operations::answer(const cimxml::Request& request, const Caller& caller, std::size_t enough) {
     try {
-        return {cimxml::response(request, content(request, caller)), CMPI_RC_OK};
+        return begun(cimxml::response(request, content(request, caller)), CMPI_RC_OK, enough);
     } catch (const cimxml::CimError& error) {
-        return {cimxml::errorResponse(request, error.code, error.what()), error.code};
+        return begun(cimxml::errorResponse(request, error.code, error.what()), error.code, enough);
     } catch (const std::exception& error) {
-        return {cimxml::errorResponse(request, CMPI_RC_ERR_FAILED, error.what()), CMPI_RC_ERR_FAILED};
+        return begun(cimxml::errorResponse(request, CMPI_RC_ERR_FAILED, error.what()), CMPI_RC_ERR_FAILED, enough);
     }
 }
 

@@ -1,9 +1,11 @@
 #pragma once
 
+#include "objectmanager/cimxml/Pieces.h"
 #include "objectmanager/cimxml/Request.h"
 #include "objectmanager/endpoint/Contexts.h"
 #include "objectmanager/endpoint/NameSpace.h"
 
+#include <limits>
 #include <string>
 #include <vector>
 
@@ -11,7 +13,8 @@ namespace endpoint {
 
 /// What a request was answered.
 struct Outcome {
-    std::string message; ///< the whole document
+    std::string message; ///< the document, or its beginning
+    cimxml::Pieces rest; ///< what follows, written when it is sent; may refer to the operations
     int code = 0;        ///< its CIM status
 };
 
@@ -24,10 +27,13 @@ public:
     /// `host` stands in the paths of answers.
     Operations(std::vector<NameSpace> spaces, std::string host);
 
-    Outcome answer(const cimxml::Request& request, const Caller& caller);
+    /// The providers have answered when this returns, and a document of up to `enough` bytes, or a little more, is
+    /// whole.
+    Outcome answer(const cimxml::Request& request, const Caller& caller,
+                   std::size_t enough = std::numeric_limits<std::size_t>::max());
 
 private:
-    std::string content(const cimxml::Request& request, const Caller& caller);
+    cimxml::Pieces content(const cimxml::Request& request, const Caller& caller);
 
     std::vector<NameSpace> nameSpaces;
     std::string hostName;
@@ -36,33 +42,33 @@ private:
 
 /// What stands in an IMETHODRESPONSE for each operation. They throw CimError.
 struct Call;
-std::string getInstance(const Call& call);
-std::string enumerateInstances(const Call& call);
-std::string enumerateInstanceNames(const Call& call);
-std::string createInstance(const Call& call);
-std::string modifyInstance(const Call& call);
-std::string deleteInstance(const Call& call);
-std::string getProperty(const Call& call);
-std::string setProperty(const Call& call);
-std::string associators(const Call& call);
-std::string associatorNames(const Call& call);
-std::string references(const Call& call);
-std::string referenceNames(const Call& call);
-std::string getClass(const Call& call);
-std::string enumerateClasses(const Call& call);
-std::string enumerateClassNames(const Call& call);
-std::string getQualifier(const Call& call);
-std::string enumerateQualifiers(const Call& call);
-std::string openEnumerateInstances(const Call& call);
-std::string openEnumerateInstancePaths(const Call& call);
-std::string openAssociatorInstances(const Call& call);
-std::string openAssociatorInstancePaths(const Call& call);
-std::string openReferenceInstances(const Call& call);
-std::string openReferenceInstancePaths(const Call& call);
-std::string pullInstancesWithPath(const Call& call);
-std::string pullInstancePaths(const Call& call);
-std::string closeEnumeration(const Call& call);
+cimxml::Pieces getInstance(const Call& call);
+cimxml::Pieces enumerateInstances(const Call& call);
+cimxml::Pieces enumerateInstanceNames(const Call& call);
+cimxml::Pieces createInstance(const Call& call);
+cimxml::Pieces modifyInstance(const Call& call);
+cimxml::Pieces deleteInstance(const Call& call);
+cimxml::Pieces getProperty(const Call& call);
+cimxml::Pieces setProperty(const Call& call);
+cimxml::Pieces associators(const Call& call);
+cimxml::Pieces associatorNames(const Call& call);
+cimxml::Pieces references(const Call& call);
+cimxml::Pieces referenceNames(const Call& call);
+cimxml::Pieces getClass(const Call& call);
+cimxml::Pieces enumerateClasses(const Call& call);
+cimxml::Pieces enumerateClassNames(const Call& call);
+cimxml::Pieces getQualifier(const Call& call);
+cimxml::Pieces enumerateQualifiers(const Call& call);
+cimxml::Pieces openEnumerateInstances(const Call& call);
+cimxml::Pieces openEnumerateInstancePaths(const Call& call);
+cimxml::Pieces openAssociatorInstances(const Call& call);
+cimxml::Pieces openAssociatorInstancePaths(const Call& call);
+cimxml::Pieces openReferenceInstances(const Call& call);
+cimxml::Pieces openReferenceInstancePaths(const Call& call);
+cimxml::Pieces pullInstancesWithPath(const Call& call);
+cimxml::Pieces pullInstancePaths(const Call& call);
+cimxml::Pieces closeEnumeration(const Call& call);
 /// What stands in a METHODRESPONSE.
-std::string invokeMethod(const Call& call);
+cimxml::Pieces invokeMethod(const Call& call);
 
 } // namespace endpoint

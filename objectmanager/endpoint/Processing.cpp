@@ -19,11 +19,13 @@ Processing::Processing(Operations& asked, const Authentication& by, const Limits
       checkers(given.passwordChecks, given.queue, given.passwordChecks * (1 + mostReplacements)) {}
 
 void Processing::begin(const WorkPointer& work) {
-    const std::lock_guard lock(mutex);
     work->started = Work::Clock::now();
-    working.insert(work);
     work->caller.user = claimedUser(*work);
     MHD_suspend_connection(work->handle);
+    {
+        const std::lock_guard lock(mutex);
+        working.insert(work);
+    }
     if (authentication.takesPassword(*work)) {
         hand(work, checkers, &Processing::authenticate);
     } else {
@@ -31,23 +33,20 @@ void Processing::begin(const WorkPointer& work) {
     }
 }
 
-/// Under the lock.
+/// Without the lock: the thread that is woken would wait for it.
 void Processing::hand(const WorkPointer& work, Workers& to, void (Processing::*job)(const WorkPointer&)) {
-    work->workers = &to;
-    if (!to.post([this, work, job] { (this->*job)(work); })) finish(work, plainAnswer(503, "too many requests"));
-}
-
-/// Whether a job still has to be done when its turn comes: one that waited for too long has been answered.
-bool Processing::take(Work& work, const char* doing) {
+    {
+        const std::lock_guard lock(mutex);
+        work->workers = &to;
+    }
+    if (to.post([this, work, job] { (this->*job)(work); })) return;
     const std::lock_guard lock(mutex);
-    if (work.isFinished()) return false;
-    work.note(doing);
-    return true;
+    finish(work, plainAnswer(503, "too many requests"));
 }
 
 /// In a thread for passwords.
 void Processing::authenticate(const WorkPointer& work) {
-    if (!take(*work, "authentication of its client")) return;
+    if (!work->start("authentication of its client")) return; // it waited for too long and was answered
     PasswordCheck check;
     try {
         check = checkPassword(work->http, work->connection->address);
@@ -58,45 +57,41 @@ void Processing::authenticate(const WorkPointer& work) {
         done(work, std::move(check.refusal));
         return;
     }
-    const std::lock_guard lock(mutex);
-    if (work->isFinished()) {
-        cameBack(*work);
-        return;
+    {
+        const std::lock_guard lock(mutex);
+        if (work->isFinished()) {
+            cameBack(*work);
+            return;
+        }
+        work->connection->know(std::move(*check.caller));
+        work->connection->authorization = headerOf(work->http, "Authorization").value_or("");
+        work->note({});
     }
-    work->connection->know(std::move(*check.caller));
-    work->connection->authorization = headerOf(work->http, "Authorization").value_or("");
-    work->note({});
     hand(work, workers, &Processing::operate);
 }
 
 /// In a worker.
 void Processing::operate(const WorkPointer& work) {
-    if (!take(*work, "the rights of its client")) return;
+    if (!work->start("the rights of its client")) return;
     const CurrentWork current(*work);
     HttpAnswer made;
     try {
         const Caller caller = authentication.callerOf(*work);
-        know(*work, caller);
-        made = exchange(operations, work->http, caller,
-                        [&](const HttpAnswer& asked, bool changes, Caller& by) { permit(*work, asked, changes, by); });
+        work->know(caller); // also for the log line of a request that hangs
+        const Permit permission = [&](const HttpAnswer& asked, bool changes, Caller& by) {
+            permit(*work, asked, changes, by);
+        };
+        made = exchange(operations, work->http, caller, permission, limits.wholeAnswer);
     } catch (const std::exception& error) {
         made = plainAnswer(500, error.what());
     }
     done(work, std::move(made));
 }
 
-/// Also for the log line of a request that hangs.
-void Processing::know(Work& work, const Caller& caller) {
-    const std::lock_guard lock(mutex);
-    if (!work.isFinished()) work.caller = caller;
-}
-
 /// The last step before an operation: what was given up while the rights were looked up is not carried out.
 void Processing::permit(Work& work, const HttpAnswer& asked, bool changes, Caller& caller) const {
     if (changes) caller = authentication.renewed(work, caller);
-    const std::lock_guard lock(mutex);
-    if (work.isFinished()) throw std::runtime_error("answered already");
-    work.asked = asked;
+    if (!work.ask(asked)) throw std::runtime_error("answered already");
 }
 
 void Processing::done(const WorkPointer& work, HttpAnswer made) {
@@ -116,7 +111,11 @@ void Processing::cameBack(const Work& work) {
 
 /// Under the lock.
 void Processing::finish(const WorkPointer& work, HttpAnswer made) {
-    if (!work->finish(std::move(made))) return;
+    if (work->finish(std::move(made))) resume(work);
+}
+
+/// Under the lock.
+void Processing::resume(const WorkPointer& work) {
     working.erase(work);
     MHD_resume_connection(work->handle);
 }
@@ -126,15 +125,17 @@ void Processing::answerForHanging() {
     const Work::Clock::time_point now = Work::Clock::now();
     for (const WorkPointer& work : std::set<WorkPointer>(working)) {
         if (now - work->started <= limits.answer) continue;
+        HttpAnswer late = work->question(); // for the log: what it was about
+        late.status = 503;
+        late.detail = "no answer in time";
+        if (!work->finish(std::move(late))) continue;
+        // From here on no thread begins with it: one that has is one that hangs.
         const std::string doing = work->noted();
         work->hangs = !doing.empty();
         work->replaced = work->hangs && work->workers->replace();
         log("no answer in time: " + (doing.empty() ? "all threads were busy" : doing) +
             (work->replaced || !work->hangs ? "" : "; no other thread takes its place"));
-        HttpAnswer late = work->asked; // for the log: what it was about
-        late.status = 503;
-        late.detail = "no answer in time";
-        finish(work, std::move(late));
+        resume(work);
     }
 }
 

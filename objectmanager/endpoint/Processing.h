@@ -29,12 +29,11 @@ private:
     void hand(const WorkPointer& work, Workers& to, void (Processing::*job)(const WorkPointer&));
     void authenticate(const WorkPointer& work);
     void operate(const WorkPointer& work);
-    bool take(Work& work, const char* doing);
-    void know(Work& work, const Caller& caller);
     void permit(Work& work, const HttpAnswer& asked, bool changes, Caller& caller) const;
     void done(const WorkPointer& work, HttpAnswer made);
     static void cameBack(const Work& work);
     void finish(const WorkPointer& work, HttpAnswer made);
+    void resume(const WorkPointer& work);
 
     Operations& operations;
     const Authentication& authentication;

@@ -3,6 +3,7 @@
 #include "objectmanager/endpoint/Results.h"
 
 #include <algorithm>
+#include <iterator>
 
 namespace endpoint {
 namespace {
@@ -34,13 +35,13 @@ std::chrono::seconds timeoutOf(const Call& call) {
 }
 
 /// The next elements, and where the enumeration stands after them. `name` is empty while it is not kept yet.
-std::string deliver(const Call& call, Enumeration enumeration, std::uint32_t count, std::string name) {
-    const std::size_t most = std::min(count, mostObjects);
-    std::string elements;
-    for (std::size_t sent = 0; sent < most && enumeration.next < enumeration.elements.size(); ++sent) {
-        elements += enumeration.elements[enumeration.next];
-        enumeration.elements[enumeration.next++] = std::string(); // its memory goes at once
-    }
+cimxml::Pieces deliver(const Call& call, Enumeration enumeration, std::uint32_t count, std::string name) {
+    const std::size_t left = enumeration.elements.size() - enumeration.next;
+    const auto first = std::make_move_iterator(enumeration.elements.begin() + static_cast<long>(enumeration.next));
+    const std::size_t sent = std::min<std::size_t>({count, mostObjects, left});
+    std::vector<om::Result> elements(first, first + static_cast<long>(sent));
+    cimxml::Pieces pieces = returned(cimxml::Pieces(cimxml::oneByOne(std::move(elements), enumeration.write)));
+    enumeration.next += sent;
     const bool end = enumeration.next == enumeration.elements.size();
     if (end) {
         name.clear();
@@ -50,10 +51,10 @@ std::string deliver(const Call& call, Enumeration enumeration, std::uint32_t cou
         call.contexts.putBack(name, std::move(enumeration));
     }
     cimxml::Writer writer;
-    writer.raw(returned(std::move(elements)));
     writer.parameter("EndOfSequence", {CMPI_boolean, end});
     writer.parameter("EnumerationContext", {CMPI_string, name});
-    return writer.take();
+    pieces.enclose({}, writer.text());
+    return pieces;
 }
 
 /// What an opening operation asks of its enumeration, made and checked before a provider is asked.
@@ -72,40 +73,46 @@ Opening opening(const Call& call, bool paths) {
     return {std::move(enumeration), call.parameters.number("MaxObjectCount").value_or(0)};
 }
 
-std::string openInstances(const Call& call, Opening opened, const Selection& selection,
-                          const std::vector<om::Instance>& instances) {
-    for (const om::Instance& instance : instances) {
-        cimxml::Writer writer;
-        writer.open("VALUE.INSTANCEWITHPATH");
-        writer.instancePath(instance.path, call.host);
-        selection.write(writer, instance);
-        writer.close("VALUE.INSTANCEWITHPATH");
-        opened.enumeration.elements.push_back(writer.take());
-    }
+/// The enumeration of these objects, as it begins.
+template <class Object>
+cimxml::Pieces begin(const Call& call, Opening opened, std::vector<Object> objects, Enumeration::Write write) {
+    opened.enumeration.elements.assign(std::make_move_iterator(objects.begin()),
+                                       std::make_move_iterator(objects.end()));
+    opened.enumeration.write = std::move(write);
     return deliver(call, std::move(opened.enumeration), opened.firstCount, {});
 }
 
-std::string openPaths(const Call& call, Opening opened, const std::vector<om::ObjectPath>& paths) {
-    for (const om::ObjectPath& path : paths) {
-        cimxml::Writer writer;
-        writer.instancePath(path, call.host);
-        opened.enumeration.elements.push_back(writer.take());
-    }
-    return deliver(call, std::move(opened.enumeration), opened.firstCount, {});
+cimxml::Pieces openInstances(const Call& call, Opening opened, const Selection& selection,
+                             std::vector<om::Instance> instances) {
+    return begin(call, std::move(opened), std::move(instances),
+                 [selection, &host = call.host](cimxml::Writer& writer, const om::Result& result) {
+                     const auto& instance = std::get<om::Instance>(result);
+                     writer.open("VALUE.INSTANCEWITHPATH");
+                     writer.instancePath(instance.path, host);
+                     selection.write(writer, instance);
+                     writer.close("VALUE.INSTANCEWITHPATH");
+                 });
+}
+
+cimxml::Pieces openPaths(const Call& call, Opening opened, std::vector<om::ObjectPath> paths) {
+    return begin(call, std::move(opened), std::move(paths),
+                 [&host = call.host](cimxml::Writer& writer, const om::Result& result) {
+                     writer.instancePath(std::get<om::ObjectPath>(result), host);
+                 });
 }
 
 Traversal openedTraversal(const Call& call, bool toReferences) {
     return traversalFrom(call, call.parameters.requiredInstanceName("InstanceName"), toReferences);
 }
 
-std::string openTraversedInstances(const Call& call, bool toReferences) {
+cimxml::Pieces openTraversedInstances(const Call& call, bool toReferences) {
     const Selection selection(call);
     Opening opened = opening(call, false);
     const Traversal traversal = openedTraversal(call, toReferences);
     return openInstances(call, std::move(opened), selection, associatedInstances(call, traversal, selection));
 }
 
-std::string openTraversedPaths(const Call& call, bool toReferences) {
+cimxml::Pieces openTraversedPaths(const Call& call, bool toReferences) {
     Opening opened = opening(call, true);
     return openPaths(call, std::move(opened), associatedPaths(call, openedTraversal(call, toReferences)));
 }
@@ -120,7 +127,7 @@ Enumeration takeContext(const Call& call, const std::string& name, std::optional
     fail(invalidContext, "");
 }
 
-std::string pull(const Call& call, bool paths) {
+cimxml::Pieces pull(const Call& call, bool paths) {
     const std::string name = call.parameters.requiredText("EnumerationContext");
     const std::optional<std::uint32_t> count = call.parameters.number("MaxObjectCount");
     if (!count) fail(CMPI_RC_ERR_INVALID_PARAMETER, "parameter MaxObjectCount is missing");
@@ -129,38 +136,38 @@ std::string pull(const Call& call, bool paths) {
 
 } // namespace
 
-std::string openEnumerateInstances(const Call& call) {
+cimxml::Pieces openEnumerateInstances(const Call& call) {
     Opening opened = opening(call, false);
     Selection selection(call);
-    const std::vector<om::Instance> instances = instancesOfClass(call, selection);
-    return openInstances(call, std::move(opened), selection, instances);
+    std::vector<om::Instance> instances = instancesOfClass(call, selection);
+    return openInstances(call, std::move(opened), selection, std::move(instances));
 }
 
-std::string openEnumerateInstancePaths(const Call& call) {
+cimxml::Pieces openEnumerateInstancePaths(const Call& call) {
     Opening opened = opening(call, true);
     return openPaths(call, std::move(opened), pathsOfClass(call));
 }
 
-std::string openAssociatorInstances(const Call& call) {
+cimxml::Pieces openAssociatorInstances(const Call& call) {
     return openTraversedInstances(call, false);
 }
-std::string openAssociatorInstancePaths(const Call& call) {
+cimxml::Pieces openAssociatorInstancePaths(const Call& call) {
     return openTraversedPaths(call, false);
 }
-std::string openReferenceInstances(const Call& call) {
+cimxml::Pieces openReferenceInstances(const Call& call) {
     return openTraversedInstances(call, true);
 }
-std::string openReferenceInstancePaths(const Call& call) {
+cimxml::Pieces openReferenceInstancePaths(const Call& call) {
     return openTraversedPaths(call, true);
 }
-std::string pullInstancesWithPath(const Call& call) {
+cimxml::Pieces pullInstancesWithPath(const Call& call) {
     return pull(call, false);
 }
-std::string pullInstancePaths(const Call& call) {
+cimxml::Pieces pullInstancePaths(const Call& call) {
     return pull(call, true);
 }
 
-std::string closeEnumeration(const Call& call) {
+cimxml::Pieces closeEnumeration(const Call& call) {
     takeContext(call, call.parameters.requiredText("EnumerationContext"), std::nullopt);
     return {};
 }

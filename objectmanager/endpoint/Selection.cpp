@@ -30,10 +30,10 @@ std::string_view originOfMethod(const om::Schema& schema, std::string_view class
 }
 
 Selection::Selection(const Call& given)
-    : call(given), list(given.parameters.names("PropertyList")),
+    : schema(given.schema()), list(given.parameters.names("PropertyList")),
       origins(given.parameters.flag("IncludeClassOrigin", false)) {
-    call.parameters.flag("LocalOnly", false);
-    call.parameters.flag("IncludeQualifiers", false);
+    given.parameters.flag("LocalOnly", false);
+    given.parameters.flag("IncludeQualifiers", false);
 }
 
 bool Selection::wants(const om::ResolvedClass* known, const std::string& property) const {
@@ -43,7 +43,7 @@ bool Selection::wants(const om::ResolvedClass* known, const std::string& propert
 }
 
 om::Instance Selection::of(om::Instance instance) const {
-    const om::ResolvedClass* known = call.schema().resolve(instance.path.className);
+    const om::ResolvedClass* known = schema.resolve(instance.path.className);
     auto& properties = instance.properties;
     properties.erase(std::remove_if(properties.begin(), properties.end(),
                                     [&](const om::NamedValue& each) { return !wants(known, each.first); }),
@@ -58,7 +58,7 @@ void Selection::write(cimxml::Writer& writer, const om::Instance& instance) cons
     }
     const std::string& className = instance.path.className;
     writer.instance(instance, [&](const std::string& property) {
-        const std::string_view found = originOfProperty(call.schema(), className, property);
+        const std::string_view found = originOfProperty(schema, className, property);
         return found.empty() ? std::string_view(className) : found;
     });
 }

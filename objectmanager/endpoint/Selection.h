@@ -9,7 +9,8 @@
 
 namespace endpoint {
 
-/// Which part of an instance a client wants. Providers may leave all of that to the object manager.
+/// Which part of an instance a client wants. Providers may leave all of that to the object manager. It may outlive the
+/// call.
 class Selection {
 public:
     /// What the parameters PropertyList and IncludeClassOrigin say. LocalOnly and IncludeQualifiers are ignored on
@@ -28,7 +29,7 @@ public:
 private:
     bool wants(const om::ResolvedClass* known, const std::string& property) const;
 
-    const Call& call;
+    const om::Schema& schema;
     std::optional<std::vector<std::string>> list;
     bool origins;
     const om::ResolvedClass* limit = nullptr;

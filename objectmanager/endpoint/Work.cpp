@@ -3,6 +3,7 @@
 #include "objectmanager/endpoint/Log.h"
 
 #include <array>
+#include <utility>
 
 namespace endpoint {
 namespace {
@@ -29,6 +30,28 @@ bool Work::isFinished() const {
     return finished;
 }
 
+bool Work::start(std::string text) {
+    const std::lock_guard lock(mutex);
+    if (!finished) doing = std::move(text);
+    return !finished;
+}
+
+void Work::know(const Caller& who) {
+    const std::lock_guard lock(mutex);
+    if (!finished) caller = who;
+}
+
+bool Work::ask(const HttpAnswer& what) {
+    const std::lock_guard lock(mutex);
+    if (!finished) asked = what;
+    return !finished;
+}
+
+HttpAnswer Work::question() const {
+    const std::lock_guard lock(mutex);
+    return asked;
+}
+
 void Work::note(std::string text) {
     const std::lock_guard lock(mutex);
     doing = std::move(text);
@@ -50,12 +73,37 @@ bool Work::receive(std::string_view piece, std::size_t longest) {
     return received <= longest * 8;
 }
 
+std::size_t Work::take(char* to, std::size_t room) {
+    if (sent == answer.body.size()) {
+        answer.body.clear();
+        sent = 0;
+        cimxml::Writer writer(std::move(answer.body));
+        answer.rest.writeTo(writer, room);
+        answer.body = writer.take();
+    }
+    const std::size_t taken = answer.body.copy(to, room, sent);
+    sent += taken;
+    return taken;
+}
+
+void Work::breakOff(std::string_view reason) {
+    if (std::exchange(broken, true)) return;
+    if (!answer.detail.empty()) answer.detail += "; ";
+    answer.detail += reason;
+}
+
 std::string Work::logLine() const {
     const auto elapsed = std::chrono::duration_cast<std::chrono::microseconds>(Clock::now() - started);
-    std::string line = connection->address + ' ' + logged(caller.user) + ' ' + logged(answer.operation) + ' ' +
-                       logged(answer.nameSpace) + ' ' + logged(answer.className) +
-                       " http=" + std::to_string(answer.status) + " cim=" + std::to_string(answer.cimStatus) +
-                       " us=" + std::to_string(elapsed.count());
+    std::string line;
+    line.reserve(200); // of nearly all of them
+    line += connection->address;
+    for (const std::string* word : {&caller.user, &answer.operation, &answer.nameSpace, &answer.className}) {
+        line += ' ';
+        line += logged(*word);
+    }
+    line += " http=" + std::to_string(answer.status);
+    line += " cim=" + std::to_string(answer.cimStatus);
+    line += " us=" + std::to_string(elapsed.count());
     if (!answer.detail.empty()) line += ": " + detailed(answer.detail);
     return line;
 }

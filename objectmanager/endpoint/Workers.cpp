@@ -29,10 +29,24 @@ void Workers::start() {
     }
 }
 
+/// Under the lock. Nobody, where all are at work.
+std::shared_ptr<Workers::Sleeper> Workers::called(Shared& shared) {
+    if (shared.asleep.empty()) return nullptr;
+    std::shared_ptr<Sleeper> sleeper = std::move(shared.asleep.back());
+    shared.asleep.pop_back();
+    sleeper->called = true;
+    return sleeper;
+}
+
 void Workers::work(const std::shared_ptr<Shared>& shared) {
+    const auto own = std::make_shared<Sleeper>();
     std::unique_lock lock(shared->mutex);
     for (;;) {
-        shared->changed.wait(lock, [&] { return shared->stopping || shared->surplus > 0 || !shared->queue.empty(); });
+        while (!shared->stopping && shared->surplus == 0 && shared->queue.empty()) {
+            own->called = false;
+            shared->asleep.push_back(own);
+            own->changed.wait(lock, [&] { return own->called; });
+        }
         if (shared->stopping || shared->surplus > 0) break;
         const std::function<void()> job = std::move(shared->queue.front());
         shared->queue.pop_front();
@@ -46,10 +60,14 @@ void Workers::work(const std::shared_ptr<Shared>& shared) {
 }
 
 bool Workers::post(std::function<void()> job) {
-    const std::lock_guard lock(shared->mutex);
-    if (shared->stopping || shared->queue.size() >= longest) return false;
-    shared->queue.push_back(std::move(job));
-    shared->changed.notify_one();
+    std::shared_ptr<Sleeper> sleeper;
+    {
+        const std::lock_guard lock(shared->mutex);
+        if (shared->stopping || shared->queue.size() >= longest) return false;
+        shared->queue.push_back(std::move(job));
+        sleeper = called(*shared);
+    }
+    if (sleeper) sleeper->changed.notify_one(); // who is woken need not wait for the lock
     return true;
 }
 
@@ -72,14 +90,14 @@ void Workers::cameBack(bool replaced) {
     --shared->hanging;
     if (!replaced) return;
     ++shared->surplus;
-    shared->changed.notify_all();
+    if (const auto sleeper = called(*shared)) sleeper->changed.notify_one();
 }
 
 bool Workers::stop(std::chrono::milliseconds patience, std::chrono::milliseconds patienceWithHanging) {
     std::unique_lock lock(shared->mutex);
     shared->stopping = true;
     shared->queue.clear();
-    shared->changed.notify_all();
+    while (const auto sleeper = called(*shared)) sleeper->changed.notify_one();
     shared->ended.wait_for(lock, patience, [&] { return shared->threads <= shared->hanging; });
     return shared->ended.wait_for(lock, patienceWithHanging, [&] { return shared->threads == 0; });
 }

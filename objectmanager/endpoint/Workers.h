@@ -7,6 +7,7 @@
 #include <functional>
 #include <memory>
 #include <mutex>
+#include <vector>
 
 namespace endpoint {
 
@@ -33,11 +34,17 @@ public:
     bool stop(std::chrono::milliseconds patience, std::chrono::milliseconds patienceWithHanging);
 
 private:
+    /// A thread that waits for a job.
+    struct Sleeper {
+        std::condition_variable changed;
+        bool called = false;
+    };
+
     /// Outlives the object while a thread hangs.
     struct Shared {
         std::mutex mutex;
-        std::condition_variable changed;
-        std::condition_variable ended; ///< a thread
+        std::vector<std::shared_ptr<Sleeper>> asleep; ///< whoever fell asleep last is called first: its memory is warm
+        std::condition_variable ended;                ///< a thread
         std::deque<std::function<void()>> queue;
         std::size_t threads = 0;
         std::size_t hanging = 0; ///< of them
@@ -46,6 +53,7 @@ private:
     };
 
     static void work(const std::shared_ptr<Shared>& shared);
+    static std::shared_ptr<Sleeper> called(Shared& shared);
     void start();
 
     std::shared_ptr<Shared> shared = std::make_shared<Shared>();

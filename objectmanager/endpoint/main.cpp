@@ -6,6 +6,7 @@
 #include "objectmanager/endpoint/Settings.h"
 #include "objectmanager/endpoint/Work.h"
 #include "objectmanager/vkcim/DefaultLibrary.h"
+#include "objectmanager/vkcim/Terminal.h"
 
 #include <sys/utsname.h>
 #include <systemd/sd-daemon.h>
@@ -108,7 +109,7 @@ int serve(const endpoint::Settings& settings) {
 
 int main(int argc, char** argv) {
     const auto parsed = endpoint::parseSettings(std::vector<std::string>(argv + (argc > 0), argv + argc));
-    std::cout << parsed.output << std::flush;
+    std::cout << vkcim::wrapped(parsed.output, vkcim::lookOfStandardOutput().width) << std::flush;
     std::cerr << parsed.error;
     if (!parsed.settings) return parsed.exitStatus;
     handleSignals();

@@ -23,6 +23,7 @@ const MethodDeclaration* ResolvedClass::findMethod(std::string_view name) const 
 Schema::Schema(const std::vector<ClassDeclaration>& classes) : classes_(classes.begin(), classes.end()) {
     for (const ClassDeclaration& declared : classes_) index_[declared.name].declaration = &declared;
     for (auto& [name, resolved] : index_) inherit(resolved);
+    for (const ClassDeclaration& declared : classes_) serve(declared);
 }
 
 const ClassDeclaration& Schema::add(ClassDeclaration declared) {
@@ -30,6 +31,7 @@ const ClassDeclaration& Schema::add(ClassDeclaration declared) {
     ResolvedClass& resolved = index_[added.name];
     resolved.declaration = &added;
     inherit(resolved);
+    serve(added);
     return added;
 }
 
@@ -53,28 +55,23 @@ const ClassDeclaration* Schema::find(std::string_view className) const {
     return resolved == nullptr ? nullptr : resolved->declaration;
 }
 
-std::vector<std::string> Schema::served(bool associations) const {
-    static constexpr std::string_view standard = "CIM_";
-    std::vector<std::string> names;
-    for (const ClassDeclaration& declared : classes_) {
-        const bool own = !sameName(std::string_view(declared.name).substr(0, standard.size()), standard);
-        if (own && declared.association == associations) names.push_back(declared.name);
+void ServedNames::add(const ClassDeclaration& declared) {
+    if (containsName(all, declared.name)) return; // of a class that is its own ancestor
+    if (declared.association) {
+        associations.push_back(declared.name);
+        all.push_back(declared.name);
+    } else {
+        all.insert(all.begin() + static_cast<long>(classes.size()), declared.name);
+        classes.push_back(declared.name);
     }
-    return names;
 }
 
-std::vector<std::string> Schema::servedClasses() const {
-    return served(false);
-}
-
-std::vector<std::string> Schema::servedAssociations() const {
-    return served(true);
-}
-
-std::vector<std::string> Schema::served() const {
-    std::vector<std::string> names = servedClasses();
-    for (std::string& association : servedAssociations()) names.push_back(std::move(association));
-    return names;
+/// Once, so that requests need not look at every class.
+void Schema::serve(const ClassDeclaration& declared) {
+    static constexpr std::string_view standard = "CIM_";
+    if (sameName(std::string_view(declared.name).substr(0, standard.size()), standard)) return;
+    served_.add(declared);
+    for (const ClassDeclaration* c : line(declared.name)) index_.find(c->name)->second.below.add(declared);
 }
 
 const PropertyDeclaration* Schema::findProperty(std::string_view className, std::string_view property) const {
@@ -92,10 +89,10 @@ std::vector<std::string_view> Schema::wordsFor(std::string_view className, const
     return declared == nullptr ? std::vector<std::string_view>() : om::wordsFor(declared->qualifiers, property.second);
 }
 
-std::vector<std::string> Schema::servedBelow(std::string_view className) const {
-    std::vector<std::string> found = served();
-    std::erase_if(found, [&](const std::string& each) { return !isA(each, className); });
-    return found;
+const std::vector<std::string>& Schema::servedBelow(std::string_view className) const {
+    static const std::vector<std::string> none;
+    const ResolvedClass* resolved = resolve(className);
+    return resolved == nullptr ? none : resolved->below.all;
 }
 
 std::vector<const ClassDeclaration*> Schema::line(std::string_view className) const {

@@ -54,6 +54,15 @@ struct ClassDeclaration {
     Place place = {};
 };
 
+/// Names of classes that a provider serves, in the order of their declaration.
+struct ServedNames {
+    std::vector<std::string> classes;
+    std::vector<std::string> associations;
+    std::vector<std::string> all; ///< the classes and then the associations
+
+    void add(const ClassDeclaration& declared);
+};
+
 /// A class with all that it inherits, for look-ups by name.
 struct ResolvedClass {
     template <class T>
@@ -63,6 +72,7 @@ struct ResolvedClass {
     Table<PropertyDeclaration> properties;
     Table<MethodDeclaration> methods;
     std::vector<const PropertyDeclaration*> keys;
+    ServedNames below; ///< the class itself and those that derive from it
 
     const PropertyDeclaration* findProperty(std::string_view name) const;
     const MethodDeclaration* findMethod(std::string_view name) const;
@@ -85,11 +95,11 @@ public:
     const std::deque<ClassDeclaration>& classes() const { return classes_; }
     /// Names of the classes, or of the associations, that are not the standard's (CIM_): the ones that a provider
     /// serves, in the order of their declaration. `served` is the classes and then the associations.
-    std::vector<std::string> servedClasses() const;
-    std::vector<std::string> servedAssociations() const;
-    std::vector<std::string> served() const;
+    const std::vector<std::string>& servedClasses() const { return served_.classes; }
+    const std::vector<std::string>& servedAssociations() const { return served_.associations; }
+    const std::vector<std::string>& served() const { return served_.all; }
     /// Those of `served` that are the class or derive from it.
-    std::vector<std::string> servedBelow(std::string_view className) const;
+    const std::vector<std::string>& servedBelow(std::string_view className) const;
     /// The class, property or method of that name, or null.
     const ClassDeclaration* find(std::string_view className) const;
     const ResolvedClass* resolve(std::string_view className) const;
@@ -104,10 +114,11 @@ public:
 
 private:
     void inherit(ResolvedClass& resolved) const;
-    std::vector<std::string> served(bool associations) const;
+    void serve(const ClassDeclaration& declared);
 
     std::deque<ClassDeclaration> classes_; ///< only ever added to: the tables point into it
     std::unordered_map<std::string_view, ResolvedClass, NameHash, NameEqual> index_;
+    ServedNames served_;
 };
 
 } // namespace om

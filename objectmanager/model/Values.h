@@ -53,12 +53,14 @@ bool operator==(const Value& a, const Value& b);
 bool operator==(const ObjectPath& a, const ObjectPath& b);
 bool operator==(const Instance& a, const Instance& b);
 
+using Result = std::variant<ObjectPath, Instance>;
+
 /// What one operation answered.
 struct Answer {
     CMPIrc code = CMPI_RC_OK;
     std::optional<std::string> message;
     bool done = false; ///< whether the provider closed the result
-    std::vector<std::variant<ObjectPath, Instance>> results;
+    std::vector<Result> results;
     std::optional<Value> returnValue;
     std::vector<NamedValue> out;
     bool faulted = false; ///< whether the fault that the request asked for happened

@@ -1,5 +1,6 @@
 #include "objectmanager/vkcim/Advice.h"
 
+#include "objectmanager/model/TypeNames.h"
 #include "objectmanager/vkcim/SchemaText.h"
 #include "objectmanager/vkcim/Suggestion.h"
 
@@ -33,15 +34,26 @@ std::vector<std::string> propertyNames(const std::string& className, const om::S
     return names;
 }
 
+/// A type that was written out, or that a text without one seemed to have.
+void remarkOnType(const std::string& declaredName, const std::string& owner, CMPIType declared, const om::Value& value,
+                  std::vector<std::string>& remarks) {
+    if (value.type != declared)
+        remarks.push_back(fmt::format("{} of {} is {}, not {}", declaredName, owner, om::typeName(declared),
+                                      om::typeName(value.type)));
+}
+
 void remarkOnProperties(const om::Request& request, const om::ClassDeclaration& declared, const om::Schema& schema,
                         std::vector<std::string>& remarks) {
     const bool modifies = request.operation == om::Operation::ModifyInstance;
     for (const auto& [name, value] : request.values) {
         const om::PropertyDeclaration* property = schema.findProperty(declared.name, name);
-        if (property == nullptr)
+        if (property == nullptr) {
             remarks.push_back(remarkOnProperty(declared.name, name, schema));
-        else if (modifies && !om::isMarked(property->qualifiers, "Write"))
+            continue;
+        }
+        if (modifies && !om::isMarked(property->qualifiers, "Write"))
             remarks.push_back(fmt::format("{} of {} is not writable", property->name, declared.name));
+        remarkOnType(property->name, declared.name, property->type, value, remarks);
     }
 }
 
@@ -55,9 +67,14 @@ void remarkOnMethod(const om::Request& request, const om::ClassDeclaration& decl
     }
     const std::vector<std::string> known = namesOf(method->parameters);
     for (const auto& [name, value] : request.values) {
-        if (!om::containsName(known, name))
+        const auto parameter =
+            std::find_if(method->parameters.begin(), method->parameters.end(),
+                         [&given = name](const auto& each) { return om::sameName(each.name, given); });
+        if (parameter == method->parameters.end())
             remarks.push_back(
                 fmt::format("{} has no parameter {}{}", method->name, name, namesInstead(name, known, "parameters")));
+        else
+            remarkOnType(parameter->name, method->name, parameter->type, value, remarks);
     }
 }
 

@@ -120,7 +120,6 @@ private:
     }
 
     void addOptions() {
-        const CLI::Validator notEmpty([](const std::string& text) { return text.empty() ? "is empty" : ""; }, "");
         app.add_option("--library", arguments.library, "Provider library (the one beside vkcim)")
             ->type_name("FILE")
             ->check(notEmpty);
@@ -165,7 +164,8 @@ private:
     void addRemote() {
         url = app.add_option("--url", arguments.remote.url,
                              "Ask the CIM server there: https://HOST:5989, http://HOST:5988 or unix:PATH")
-                  ->type_name("URL");
+                  ->type_name("URL")
+                  ->check(notEmpty); // else this host would be asked in place of another one
         app.add_option("--user", arguments.remote.user, "With --url: who asks; the password is asked for")
             ->type_name("NAME")
             ->needs(url);
@@ -267,6 +267,7 @@ private:
         const bool answers = operates || command.action == Action::Report;
         refuse(operates, {repeat, threads, fault});
         refuse(answers, {timing});
+        refuse(answers || command.action == Action::Value, {url});
         refuse(command.action == Action::Report, {verbose});
         refuse(command.action == Action::Report && arguments.format == Format::OpenMetrics, {withSerials});
         refuse(command.operation == om::Operation::ModifyInstance || command.operation == om::Operation::InvokeMethod,
@@ -285,6 +286,7 @@ private:
         }
     }
 
+    const CLI::Validator notEmpty{[](const std::string& text) { return text.empty() ? "is empty" : ""; }, ""};
     CLI::App app;
     Arguments arguments;
     std::string formatName = "text";

@@ -1,5 +1,6 @@
 #include "objectmanager/vkcim/Facts.h"
 
+#include "objectmanager/model/DateTime.h"
 #include "objectmanager/model/TypeNames.h"
 
 #include <fmt/format.h>
@@ -86,6 +87,12 @@ std::optional<std::string> hostOf(const std::vector<om::Instance>& computers) {
     return known != nullptr ? std::optional(*known) : std::nullopt;
 }
 
+/// What is known of a clock: the file of a simulated host may hold any text as the time.
+HostClock whatIsKnown(HostClock clock) {
+    if (clock.time && (om::isInterval(*clock.time) || !om::microseconds(*clock.time))) clock.time.reset();
+    return clock;
+}
+
 /// A class that is answered with an error would look like one of which the host has nothing.
 std::vector<std::string> errorNotes(const Report& report) {
     std::vector<std::string> notes;
@@ -104,7 +111,7 @@ Facts gatherFacts(const om::Schema& schema, const std::string& nameSpace,
     const Subjects subjects = {{computerClass, chassisClass, timeServiceClass}, {}};
     Facts facts;
     const Report report = makeReport(subjects, nameSpace, properties, run, [&] {
-        facts.clock = clock();
+        facts.clock = whatIsKnown(clock());
         return notes();
     });
     facts.computers = instancesOf(computerClass, report, schema);

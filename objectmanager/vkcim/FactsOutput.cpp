@@ -19,11 +19,7 @@ public:
     }
     void addText(const std::string& name, std::string_view text) { add(name, jsonString(text)); }
 
-    void addTexts(const std::string& name, const std::vector<std::string>& texts) {
-        std::string list;
-        for (const std::string& text : texts) list += (list.empty() ? "" : ",") + jsonString(text);
-        add(name, '[' + list + ']');
-    }
+    void addTexts(const std::string& name, const std::vector<std::string>& texts) { add(name, jsonStrings(texts)); }
 
     /// Every property, and the words of those that have some.
     void add(const std::string& prefix, const om::Instance& instance) {

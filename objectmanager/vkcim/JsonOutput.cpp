@@ -38,7 +38,7 @@ public:
         return object({member("host", jsonString(report.host)), member("version", jsonString(report.version)),
                        member("time", jsonString(utcText(report.time))), member("classes", answers(report.classes)),
                        member("associations", answers(report.associations)),
-                       member("notes", list(report.notes, [](const std::string& note) { return jsonString(note); }))});
+                       member("notes", jsonStrings(report.notes))});
     }
 
     /// The value without its type.
@@ -59,6 +59,11 @@ public:
         return real && !std::isfinite(*real) ? jsonString(om::numberText(value)) : om::numberText(value);
     }
 
+    template <typename List, typename Text>
+    static std::string list(const List& items, const Text& text) {
+        return joined('[', items, ']', text);
+    }
+
 private:
     static std::string member(std::string_view name, const std::string& value) {
         return jsonString(name) + ':' + value;
@@ -72,10 +77,6 @@ private:
             all += text(item);
         }
         return all + close;
-    }
-    template <typename List, typename Text>
-    static std::string list(const List& items, const Text& text) {
-        return joined('[', items, ']', text);
     }
     static std::string object(const std::vector<std::string>& members) {
         return joined('{', members, '}', [](const std::string& text) { return text; });
@@ -134,6 +135,10 @@ std::string jsonText(const Report& report, const std::string& nameSpace, const o
 
 std::string jsonText(const om::Value& value, const std::string& nameSpace, const om::Schema& schema) {
     return JsonWriter(nameSpace, schema).bare(value);
+}
+
+std::string jsonStrings(const std::vector<std::string>& texts) {
+    return JsonWriter::list(texts, jsonString);
 }
 
 } // namespace vkcim

@@ -6,6 +6,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// Answers as JSON: one object on one line, without the line's end.
 namespace vkcim {
@@ -16,5 +17,6 @@ std::string jsonText(const Report& report, const std::string& nameSpace, const o
 /// The bare value, without its type.
 std::string jsonText(const om::Value& value, const std::string& nameSpace, const om::Schema& schema);
 std::string jsonString(std::string_view text);
+std::string jsonStrings(const std::vector<std::string>& texts);
 
 } // namespace vkcim

@@ -1,8 +1,11 @@
 #include "objectmanager/vkcim/LinkTree.h"
 
+#include "objectmanager/vkcim/Utf8.h"
+
 #include <algorithm>
 #include <map>
 #include <set>
+#include <sstream>
 
 namespace vkcim {
 namespace {
@@ -27,7 +30,7 @@ public:
 private:
     void drawFrom(const std::string& root) {
         if (drawn.count(root) != 0) return;
-        lines.push_back(root);
+        draw(root, "", "", 0);
         drawBelow(root, "", 0);
     }
 
@@ -50,8 +53,18 @@ private:
     void drawLink(const Link& link, const std::string& before, const std::string& below, std::size_t indent) {
         const std::string association = "  (" + link.association + ')';
         const bool fits = look.width == 0 || indent + link.below.size() + association.size() <= look.width;
-        lines.push_back(before + link.below + (fits ? association : ""));
+        draw(link.below + (fits ? association : ""), before, below, indent);
         if (!fits) lines.push_back(below + association);
+    }
+
+    /// One line, or several where the text is too long for one.
+    void draw(const std::string& text, const std::string& first, const std::string& others, std::size_t indent) {
+        const std::size_t room = look.width > indent ? look.width - indent : look.width;
+        std::istringstream parts(wrapped(printable(text), room));
+        std::string part;
+        std::getline(parts, part);
+        lines.push_back(first + part);
+        while (std::getline(parts, part)) lines.push_back(others + part);
     }
 
     const Look& look;

@@ -109,7 +109,8 @@ std::string missingSources(const Facts& facts) {
     const std::string name = "vk_source_missing";
     std::set<std::string> missing;
     for (const std::string& note : facts.notes)
-        if (const std::optional<std::string> source = missingSource(note)) missing.insert(*source);
+        if (const std::optional<std::string> source = missingSource(note))
+            missing.insert(cleanUtf8(*source)); // the same series twice refuses the whole text
     std::string samples;
     for (const std::string& source : missing) samples += sample(name, {{"source", source}}, "1");
     return family(name, "What the host does not say of itself, or says with a fault, always 1.", samples);

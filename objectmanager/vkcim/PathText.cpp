@@ -178,7 +178,7 @@ private:
     om::ObjectPath path;
 };
 
-std::string inQuotes(std::string_view text) {
+std::string keyInQuotes(std::string_view text) {
     std::string result = "\"";
     for (const char c : text) {
         if (c == '"' || c == '\\') result += '\\';
@@ -191,14 +191,14 @@ std::string keyText(const om::ObjectPath& path, const om::NamedValue& key, const
                     const om::Schema& schema) {
     const om::Value& value = key.second;
     if (const auto* flag = std::get_if<bool>(&value.data)) return *flag ? "TRUE" : "FALSE";
-    if (const auto* text = std::get_if<std::string>(&value.data)) return inQuotes(*text);
+    if (const auto* text = std::get_if<std::string>(&value.data)) return keyInQuotes(*text);
     if (const auto* reference = std::get_if<std::shared_ptr<const om::ObjectPath>>(&value.data);
         reference && *reference) {
         const om::PropertyDeclaration* declared = schema.findProperty(path.className, key.first);
         const char* prefix = declared && declared->type == CMPI_ref ? "" : "ref:";
-        return prefix + inQuotes(qualifiedPathText(**reference, nameSpace, schema));
+        return prefix + keyInQuotes(qualifiedPathText(**reference, nameSpace, schema));
     }
-    if (std::holds_alternative<double>(value.data)) return inQuotes(om::numberText(value));
+    if (std::holds_alternative<double>(value.data)) return keyInQuotes(om::numberText(value));
     const std::string number = om::numberText(value);
     return number.empty() ? "NULL" : number;
 }

@@ -107,7 +107,7 @@ private:
         std::vector<std::string> remarks;
         const om::Request request = makeRequest(arguments, schema, streams.input, &remarks);
         for (const std::string& remark : remarks) complain(remark);
-        if (arguments.dryRun) return show(dryRunText(request));
+        if (arguments.dryRun) return dryRun(request);
         const Outcome outcome = ask(request);
         const Repeated& repeated = outcome.repeated;
         const std::vector<std::string> missing = lackOf(request, outcome);
@@ -209,9 +209,18 @@ private:
         return lacks && answer.results.empty() ? "" : plainAnswer(answer, style(nameSpace));
     }
 
-    std::string dryRunText(const om::Request& request) const {
+    int dryRun(const om::Request& request) const {
         if (isRemote()) throw std::runtime_error("--dry-run does not go with --url");
         const om::ObjectManager manager(library(), arguments.provider, request.path.nameSpace, schema);
+        const int shown = show(dryRunText(request));
+        const std::string problem = hostProblemHere();
+        if (problem.empty()) return shown;
+        complain(cannotRead(problem));
+        return nothingDone;
+    }
+
+    /// While the provider's library is loaded.
+    std::string dryRunText(const om::Request& request) const {
         const bool calls = request.operation == om::Operation::InvokeMethod;
         std::string text =
             fmt::format("host      {}\nprovider  {} in {}\npath      {}\n{}\n", hostDescribed(arguments.provider),

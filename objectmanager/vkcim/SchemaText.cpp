@@ -81,7 +81,7 @@ std::string parameterText(const om::ParameterDeclaration& parameter) {
 }
 
 std::string classesText(const om::Schema& schema) {
-    const std::vector<std::string> names = schema.served();
+    const std::vector<std::string>& names = schema.served();
     std::size_t width = 0;
     for (const std::string& name : names) width = std::max(width, name.size());
     std::string text;
@@ -101,7 +101,7 @@ std::string classText(const om::ClassDeclaration& declared, const om::Schema& sc
     if (!declared.methods.empty()) text += "\nMethods\n";
     for (const om::MethodDeclaration& method : declared.methods) text += methodText(method);
     // A provider supplies what its class declares itself.
-    const std::vector<std::string> served = schema.served();
+    const std::vector<std::string>& served = schema.served();
     const bool isServed = std::find(served.begin(), served.end(), declared.name) != served.end();
     const char* properties = isServed ? "Inherited properties, not supplied here" : "Inherited properties";
     const char* methods = isServed ? "Inherited methods, not offered here" : "Inherited methods";

@@ -154,7 +154,7 @@ std::string plainReport(const Report& report, const TextStyle& style) {
     Look tree = style.look;
     if (tree.width > 2) tree.width -= 2;
     for (const std::string& line : drawLinks(links(report.associations, style.nameSpace, style.schema), tree))
-        text += "  " + printable(line) + '\n';
+        text += "  " + line + '\n';
     for (const auto& [className, answer] : report.associations) {
         if (answer.code == CMPI_RC_OK && !answer.results.empty()) continue;
         text += "  " + group(className, answer, style);

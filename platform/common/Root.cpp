@@ -44,7 +44,7 @@ FileDescriptor openRoot(const std::string& directory) {
     return FileDescriptor(::open(directory.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
 }
 
-Root::Contents failure(int error) {
+Root::Contents failed(int error) {
     noteShortage(error);
     Root::Contents contents;
     contents.error = error;
@@ -72,7 +72,7 @@ Root::Contents readAll(int fd, std::size_t limit) {
     std::array<char, 4096> chunk;
     for (;;) {
         const ssize_t count = readSome(fd, chunk.data(), chunk.size());
-        if (count < 0) return failure(errno);
+        if (count < 0) return failed(errno);
         if (count == 0) return contents;
         const std::size_t room = limit - contents.text.size();
         const std::size_t length = std::min(static_cast<std::size_t>(count), room);
@@ -126,23 +126,23 @@ int Root::openBelow(const std::string& path, int flags, mode_t mode) const {
 Root::Contents Root::read(const std::string& path, std::size_t limit) const {
     if (asked != nullptr) asked->read.push_back(path);
     const int opened = open(path, O_RDONLY | O_NONBLOCK);
-    if (opened < 0) return failure(-opened);
+    if (opened < 0) return failed(-opened);
     const FileDescriptor fd(opened);
-    if (const int error = checkRegular(fd.get()); error != 0) return failure(error);
+    if (const int error = checkRegular(fd.get()); error != 0) return failed(error);
     return readAll(fd.get(), limit);
 }
 
 Root::Contents Root::readLink(const std::string& path) const {
     if (asked != nullptr) asked->followed.push_back(path);
     const int opened = open(path, O_PATH | O_NOFOLLOW);
-    if (opened < 0) return failure(-opened);
+    if (opened < 0) return failed(-opened);
     const FileDescriptor fd(opened);
     struct stat status {};
-    if (fstat(fd.get(), &status) != 0) return failure(errno);
-    if (!S_ISLNK(status.st_mode)) return failure(EINVAL);
+    if (fstat(fd.get(), &status) != 0) return failed(errno);
+    if (!S_ISLNK(status.st_mode)) return failed(EINVAL);
     std::array<char, PATH_MAX> target;
     const ssize_t length = readlinkat(fd.get(), "", target.data(), target.size());
-    if (length < 0) return failure(errno);
+    if (length < 0) return failed(errno);
     Contents contents;
     contents.text.assign(target.data(), static_cast<std::size_t>(length));
     return contents;
@@ -151,9 +151,9 @@ Root::Contents Root::readLink(const std::string& path) const {
 Root::Contents Root::resolve(const std::string& path) const {
     if (asked != nullptr) asked->followed.push_back(path);
     FileDescriptor root = openRoot(directory);
-    if (!root) return failure(errno);
+    if (!root) return failed(errno);
     RootWalk walk(std::move(root));
-    if (const int error = walk.walk(path, true); error != 0) return failure(error);
+    if (const int error = walk.walk(path, true); error != 0) return failed(error);
     Contents contents;
     contents.text = walk.path();
     return contents;

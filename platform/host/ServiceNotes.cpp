@@ -22,7 +22,8 @@ std::string timeNote(const TimeFacts& facts) {
     if (!facts.zone.empty()) note += "zone " + facts.zone + ", ";
     if (facts.automaticDst)
         note += std::string("automatic daylight saving ") + (*facts.automaticDst != 0 ? "on" : "off") + ", ";
-    return note + "NTP daemon " + (facts.ntpDaemonRuns ? "running" : "not running");
+    // By its name, as the time service looks for it: chronyd and systemd-timesyncd may run all the same.
+    return note + "NTP daemon ntpd " + (facts.ntpDaemonRuns ? "running" : "not running");
 }
 
 bool isNtpDaemonRunning(const Root& root) {

@@ -20,6 +20,9 @@ namespace {
 
 std::atomic<const NVLogWatch*> watching{nullptr};
 
+/// Of the lines of the logger itself, which are about its settings: no watch is shown them.
+constexpr const char* ownCategory = "Norvane.Logger";
+
 /// What a call must leave as it found it: errno, and the thread's cancelability (a cancellation in here could not be
 /// thrown out of a function that throws nothing).
 class CallerState {
@@ -75,7 +78,8 @@ __attribute__((noinline)) void write(Channel channel, const char* function, cons
     const Settings& settings = currentSettings();
     const Event event = {channel, function, file, line, category, level, text};
     const CallerState state;
-    if (const NVLogWatch* const watch = watching.load(); watch != nullptr && channel == Channel::Log)
+    if (const NVLogWatch* const watch = watching.load();
+        watch != nullptr && channel == Channel::Log && category != ownCategory)
         watch->take(watch->context, level, text.c_str());
     if (writeToSink(settings, event)) return;
     if (event.channel == Channel::Log || settings.sink == Settings::Syslog || settings.traceInSyslog)
@@ -89,7 +93,7 @@ __attribute__((noinline)) const Settings& firstSettings() noexcept {
     static std::atomic_flag announced = ATOMIC_FLAG_INIT;
     if (settings.unknown[0] == 0 || settings.sink == Settings::None || announced.test_and_set()) return settings;
     try {
-        write(Channel::Log, "readSettings", "Settings", __LINE__, "Norvane.Logger", 6000,
+        write(Channel::Log, "readSettings", "Settings", __LINE__, ownCategory, 6000,
               std::string("not understood: ") + settings.unknown.data());
     } catch (...) { // without memory there is no line
     }
@@ -97,6 +101,7 @@ __attribute__((noinline)) const Settings& firstSettings() noexcept {
 }
 
 bool isKept(Channel channel, int level) noexcept {
+    if (!mayBeKept(channel, level)) return false;
     const bool known = knownSettings.known.load(std::memory_order_acquire);
     return (known ? knownSettings.settings : firstSettings()).keeps(channel, level);
 }

@@ -98,9 +98,19 @@ void readEnvironment() {
     knownSettings.settings =
         parseSettings(secure_getenv("NVLOG_SINK"), secure_getenv("NVLOG_LEVELS"), secure_getenv("NVLOG_CHANNELS"));
     knownSettings.known.store(true, std::memory_order_release);
+    for (const Channel channel : {Channel::Log, Channel::Trace})
+        knownSettings.bits[static_cast<std::size_t>(channel)] = knownSettings.settings.bits(channel);
 }
 
 } // namespace
+
+std::uint64_t Settings::bits(Channel channel) const noexcept {
+    if (!(channel == Channel::Log ? log : trace)) return 0;
+    if (allLevels) return ~std::uint64_t{0};
+    std::uint64_t found = 0;
+    for (std::size_t i = 0; i < levelCount; ++i) found |= bitOf(levels[i]);
+    return found;
+}
 
 Settings parseSettings(const char* sink, const char* levels, const char* channels) noexcept {
     Settings settings;

@@ -4,6 +4,7 @@
 #include <atomic>
 #include <climits>
 #include <cstddef>
+#include <cstdint>
 
 namespace NVLog {
 
@@ -32,6 +33,13 @@ struct Settings {
         }
         return false;
     }
+
+    /// The bits of all levels that a channel keeps.
+    std::uint64_t bits(Channel channel) const noexcept;
+    /// One bit for many levels, and of its own for each of those in use.
+    static constexpr std::uint64_t bitOf(int level) noexcept {
+        return std::uint64_t{1} << ((static_cast<unsigned int>(level) >> 3U) & 63U);
+    }
 };
 
 /// Reads the three variables' texts; null and empty ones mean the defaults. Entries of a list that cannot be used
@@ -43,8 +51,16 @@ Settings parseSettings(const char* sink, const char* levels, const char* channel
 struct KnownSettings {
     std::atomic<bool> known{false};
     Settings settings;
+    /// Those of the two channels, for a quick look; all until the settings are known.
+    std::array<std::atomic<std::uint64_t>, 2> bits{~std::uint64_t{0}, ~std::uint64_t{0}};
 };
 extern KnownSettings knownSettings;
+
+/// Whether a line of that level may be kept, in a few instructions: of most lines the answer is no.
+inline bool mayBeKept(Channel channel, int level) noexcept {
+    const std::uint64_t bits = knownSettings.bits[static_cast<std::size_t>(channel)].load(std::memory_order_relaxed);
+    return (bits & Settings::bitOf(level)) != 0;
+}
 
 const Settings& readSettings() noexcept;
 

@@ -17,7 +17,7 @@ namespace {
 
 constexpr std::int64_t earliest = 946684800; // 2000-01-01
 
-bool refuse(const std::string& reason) {
+bool notSet(const std::string& reason) {
     logLine(failure, "setProperty", __LINE__, "clock not set: " + reason);
     return false;
 }
@@ -75,14 +75,14 @@ tm hardwareClockTime(Instant instant, int offsetSeconds) {
 
 bool changeClock(const Root& root, const std::string& text) {
     Instant instant;
-    if (const std::string problem = checkClockText(text, instant); !problem.empty()) return refuse(problem);
-    if (!root.isLive()) return refuse("a snapshot has none");
+    if (const std::string problem = checkClockText(text, instant); !problem.empty()) return notSet(problem);
+    if (!root.isLive()) return notSet("a snapshot has none");
     timespec before{};
     clock_gettime(CLOCK_REALTIME, &before);
     const timespec wanted{instant.seconds, instant.microseconds * 1000};
     if (clock_settime(CLOCK_REALTIME, &wanted) != 0) {
         const int error = errno;
-        return refuse(errorText(error) + (error == EPERM ? "; this takes the privilege CAP_SYS_TIME" : ""));
+        return notSet(errorText(error) + (error == EPERM ? "; this takes the privilege CAP_SYS_TIME" : ""));
     }
     setHardwareClock(root, instant);
     logLine(notice, "setProperty", __LINE__,

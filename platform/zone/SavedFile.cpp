@@ -9,7 +9,7 @@ namespace VK::Zone {
 
 namespace {
 
-constexpr std::string_view header = "vk-zone 1\n";
+constexpr std::string_view magic = "vk-zone 1\n";
 constexpr std::string_view kinds[] = {"absent", "link", "file"};
 
 /// Takes one of the two off the front.
@@ -60,8 +60,8 @@ int putBack(int directory, const std::string& name, const SavedFile& saved, int 
 }
 
 std::optional<SavedZone> readSavedZone(std::string_view bytes) {
-    if (bytes.substr(0, header.size()) != header) return std::nullopt;
-    bytes.remove_prefix(header.size());
+    if (bytes.substr(0, magic.size()) != magic) return std::nullopt;
+    bytes.remove_prefix(magic.size());
     SavedZone zone;
     if (!take(bytes, zone.localTime) || !take(bytes, zone.zoneName) || !bytes.empty()) return std::nullopt;
     return zone;

@@ -30,6 +30,22 @@ class Names(unittest.TestCase):
             self.assertIn(test, sources, f"{document}: {program}")
 
 
+class Words(unittest.TestCase):
+    def test_that_made_readers_stop_stay_away(self):
+        stumbling = re.compile(r"deliver\w* indications again|nothing current|installed twice|(?:does not|cannot|could not) tell\b|"
+                               r"\bis so already|floors? of this house|same one by the same")
+        texts = [*documents(), *SOURCE.glob("docs/**/*.in"), *SOURCE.glob("docs/json/*"), *SOURCE.glob("schema/*.mof"),
+                 *SOURCE.glob("tools/**/*"), *SOURCE.glob("objectmanager/vkcim/*"), *SOURCE.glob("platform/**/*Notes.cpp")]
+        for text in filter(Path.is_file, texts):
+            found = stumbling.search(" ".join(text.read_text(encoding="utf-8").split()))
+            self.assertIsNone(found, text)
+
+    def test_on_the_licence_are_the_same_wherever_they_must_be(self):
+        for name in ("README.md", "packaging/debian/copyright"):
+            text = " ".join((SOURCE / name).read_text(encoding="utf-8").split())
+            self.assertRegex(text, r"No licence is granted yet.*: the owner decides", name)
+
+
 class Classes(unittest.TestCase):
     def test_each_has_a_row_in_the_readme(self):
         text = (SOURCE / "README.md").read_text(encoding="utf-8")

@@ -1,4 +1,5 @@
-"""How scripts/common.sh builds a tree, tried with a project of one file: what it refuses, what it builds anew, what it shows."""
+"""How scripts/common.sh builds a tree, tried with a project of one file: what it refuses, what it builds anew, what it shows;
+and that it names the packages that it may not install."""
 
 import os
 import pty
@@ -116,6 +117,21 @@ class Progress(Checkout):
         self.assertEqual(output, "first\n")
         self.assertRegex(shown, r"^(\r\x1b\[Kconfiguring)+\r\x1b\[Kbuilding: 1 of 1\r\x1b\[Kend$")
         self.assertEqual(self.build_on_a_terminal(), ("first\n", "end"))
+
+
+class Packages(unittest.TestCase):
+    INSTALL = 'set -euo pipefail; . "$0"; install_packages cmake ninja-build'
+
+    def test_that_a_user_without_sudo_lacks_are_named(self):
+        with tempfile.TemporaryDirectory() as commands:
+            for name, what in (("dpkg-query", "exit 1"), ("id", "echo 1000")):
+                command = Path(commands) / name
+                command.write_text(f"#!/bin/sh\n{what}\n", encoding="ascii")
+                command.chmod(0o755)
+            done = subprocess.run(["/bin/bash", "-c", self.INSTALL, COMMON], env={"PATH": commands}, capture_output=True,
+                                  text=True, check=False)
+        self.assertEqual((done.returncode, done.stdout), (3, ""))
+        self.assertTrue(done.stderr.endswith("installing them takes root or sudo: cmake ninja-build\n"), done.stderr)
 
 
 if __name__ == "__main__":

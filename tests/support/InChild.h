@@ -41,4 +41,13 @@ inline std::string inChild(const std::function<std::string()>& run) {
     return text;
 }
 
+/// The same for what answers nothing; fails where one of its expectations did.
+inline void inOwnProcess(const std::function<void()>& run) {
+    EXPECT_EQ(inChild([&] {
+                  run();
+                  return std::string();
+              }),
+              "");
+}
+
 } // namespace support

@@ -3,35 +3,20 @@
 
 #include "support/InChild.h"
 #include "support/Provider.h"
+#include "support/RunLevel.h"
+#include "system/CoarseClock.h"
 #include "system/Namespaces.h"
 
 #include <gmock/gmock.h>
 
-#include <atomic>
-#include <ctime>
 #include <fstream>
-#include <functional>
 #include <list>
 #include <sys/resource.h>
-#include <sys/syscall.h>
-#include <unistd.h>
 
 namespace {
 
-std::atomic<long> coarseMilliseconds{100'000};
-
-} // namespace
-
-// Found before the C library's.
-extern "C" int clock_gettime(clockid_t clock, timespec* time) noexcept {
-    if (clock != CLOCK_MONOTONIC_COARSE) return static_cast<int>(syscall(SYS_clock_gettime, clock, time));
-    const long now = coarseMilliseconds;
-    *time = {now / 1000, now % 1000 * 1'000'000};
-    return 0;
-}
-
-namespace {
-
+using support::inOwnProcess;
+using test::coarseMilliseconds;
 using testing::IsEmpty;
 using testing::SizeIs;
 
@@ -80,7 +65,7 @@ private:
     rlimit before{};
 };
 
-/// A host that runs, of which each test asks for the first time.
+/// A host that runs, of which each test asks for the first time: in a process of its own.
 class ChangingFacts : public test::NamespaceTest {
 protected:
     void SetUp() override {
@@ -97,15 +82,6 @@ protected:
     static void useZone(const char* zone) {
         std::filesystem::remove("/etc/localtime");
         std::filesystem::create_symlink(std::string("/usr/share/zoneinfo/") + zone, "/etc/localtime");
-    }
-
-    /// Runs in a process of its own, whose first request is its first; empty where nothing failed.
-    static void inOwnProcess(const std::function<void()>& run) {
-        EXPECT_EQ(support::inChild([&] {
-                      run();
-                      return std::string();
-                  }),
-                  "");
     }
 
 private:
@@ -130,6 +106,22 @@ TEST_F(ChangingFacts, PowerStateAndMemoryErrorsShowWithinASecond) {
         coarseMilliseconds += 1000;
         EXPECT_EQ(enabledState(), 2U);
         EXPECT_EQ(healthState(), 0U);
+    });
+}
+
+TEST_F(ChangingFacts, TheRunLevelOfAShutdownShowsWithinASecond) {
+    inOwnProcess([] {
+        const std::string running = support::runLevel('5');
+        write("/run/utmp", running);
+        EXPECT_EQ(enabledState(), 2U);
+        write("/run/utmp", running + support::runLevel('6', '5'));
+        coarseMilliseconds += 999;
+        EXPECT_EQ(enabledState(), 2U) << "nothing is read within the second";
+        coarseMilliseconds += 1;
+        EXPECT_EQ(enabledState(), 4U);
+        write("/run/utmp", running);
+        coarseMilliseconds += 1000;
+        EXPECT_EQ(enabledState(), 2U);
     });
 }
 

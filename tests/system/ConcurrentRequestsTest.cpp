@@ -1,6 +1,8 @@
 // Many requests at once, with commands among them.
 
 #include "support/FakeCommands.h"
+#include "support/HostName.h"
+#include "support/OpenDescriptors.h"
 #include "support/Provider.h"
 #include "support/SimulatedHost.h"
 
@@ -10,25 +12,14 @@
 #include <cerrno>
 #include <sys/wait.h>
 #include <thread>
-#include <unistd.h>
 
 namespace {
 
+using support::openDescriptors;
 using testing::SizeIs;
 
 constexpr unsigned threads = 8;
 constexpr unsigned requestsOfAThread = 500;
-
-std::size_t openDescriptors() {
-    const std::filesystem::directory_iterator begin("/proc/self/fd");
-    return static_cast<std::size_t>(std::distance(begin, std::filesystem::directory_iterator()));
-}
-
-std::string hostName() {
-    char name[256] = {};
-    gethostname(name, sizeof name - 1);
-    return name;
-}
 
 /// Whether the request of that number was answered as it has to be.
 bool ask(unsigned number) {
@@ -65,7 +56,7 @@ bool ask(unsigned number) {
 TEST(ConcurrentRequests, AreAnsweredRightAndLeaveNothingBehind) {
     test::FakeCommands commands;
     commands.add(commands.path("product/vcm/bin/cimconfig"), "echo 'Current value: 20'");
-    test::simulate({test::computer(0, hostName()), test::chassis(0, 0, "CZ1")},
+    test::simulate({test::computer(0, test::hostName()), test::chassis(0, 0, "CZ1")},
                    {{"rootDirectory", commands.path("product/platform/").string()}, {"kvm", false}});
     for (unsigned number = 0; number < 8; ++number) EXPECT_TRUE(ask(number)) << number;
     commands.take();

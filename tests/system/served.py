@@ -61,12 +61,24 @@ class UnixConnection(http.client.HTTPConnection):
         self.sock.connect(self.path)
 
 
+class LoopbackConnection(http.client.HTTPSConnection):
+    """To 127.0.0.1 by the name that the certificate has, which a host without /etc/hosts does not know."""
+
+    def __init__(self, port, context):
+        super().__init__("localhost", port, context=context, timeout=60)
+        self.context = context
+
+    def connect(self):
+        plain = socket.create_connection(("127.0.0.1", self.port), self.timeout)
+        self.sock = self.context.wrap_socket(plain, server_hostname=self.host)
+
+
 def https(port, certificates, **options):
     """A connection that is not made yet."""
     context = ssl.create_default_context(cafile=certificates)
     for name, value in options.items():
         setattr(context, name, value)
-    return http.client.HTTPSConnection("localhost", port, context=context, timeout=60)
+    return LoopbackConnection(port, context)
 
 
 def ask(connection, operation, value, parameter="ClassName", user=None):

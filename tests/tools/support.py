@@ -17,6 +17,10 @@ def run(*command, **options):
     return subprocess.run([str(word) for word in command], **options)
 
 
+def widest(text):
+    return max(map(len, text.splitlines()))
+
+
 def directory() -> Path:
     """A new directory, removed at the end."""
     made = Path(tempfile.mkdtemp(prefix="vk-tools-"))

@@ -6,7 +6,7 @@ import re
 import unittest
 from pathlib import Path
 
-from support import BUILD, NOBODY, directory, run, run_as_nobody
+from support import BUILD, NOBODY, directory, run, run_as_nobody, widest
 
 CHECK = BUILD / "installed/vk-provider-check"
 
@@ -176,6 +176,10 @@ class Check(unittest.TestCase):
         self.assertIn("reading,setting", done.stderr)
         self.assertEqual(run(CHECK, "--root", "/nonexistent").returncode, 2)
         self.assertIn("Example:", run(CHECK, "--help").stdout)
+
+    def test_the_help_is_as_wide_as_the_terminal(self):
+        self.assertLessEqual(widest(run(CHECK, "--help", env={"COLUMNS": "80"}).stdout), 80)
+        self.assertGreater(widest(run(CHECK, "--help").stdout), 80)
 
 
 if __name__ == "__main__":

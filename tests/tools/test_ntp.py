@@ -2,10 +2,12 @@
 daemons tests/system/ntp_daemon tries them."""
 
 import os
+import shutil
+import subprocess
 import unittest
 from pathlib import Path
 
-from support import directory, install, run
+from support import NOBODY, directory, install, run, widest
 
 SOURCE = Path(__file__).resolve().parents[2]
 PREFIX = "/opt/vk"
@@ -190,6 +192,8 @@ class OneShot(Test):
         self.refuse(self.openntpd("settimeofday: Operation not permitted"), "openntpd: settimeofday: Operation not permitted")
         self.refuse(self.openntpd("/etc/openntpd/ntpd.conf:1: syntax error", end="exit 1"),
                     "openntpd: /etc/openntpd/ntpd.conf:1: syntax error")
+        self.refuse(self.openntpd("fatal: pipe closed", "ntp engine exiting", "Terminating", end="exit 1"),
+                    "openntpd: fatal: pipe closed")
         self.refuse(self.openntpd(), f"openntpd {NO_RESULT}")
 
     def test_of_chronyd_sets_the_clock(self):
@@ -332,10 +336,29 @@ class Setup(Test):
                             f"until grep -q sfcbd /proc/$!/comm; do sleep 0.1; done; {PREFIX}/sbin/vk-ntp-setup status")
             self.assertRegex(done.stdout, rf"(?m)^sfcbd \d+: finds {found} in its PATH {path}$")
 
+    def test_says_of_an_object_manager_whose_path_it_does_not_see_nothing_else(self):
+        done = Host(ntpd=ntpd("ntpd ntpsec-1.2.2")).run(
+            "/bin/sh", "-c", "cp /usr/bin/sleep /tmp/sfcbd; env -i /tmp/sfcbd 100 & "
+            f"until grep -q sfcbd /proc/$!/comm; do sleep 0.1; done; {PREFIX}/sbin/vk-ntp-setup status")
+        self.assertRegex(done.stdout, r"(?m)^sfcbd \d+: its PATH is not known$")
+
+    @unittest.skipIf(os.geteuid() != 0, "takes root to become somebody else")
+    def test_says_that_somebody_elses_environment_cannot_be_read(self):
+        place = directory()
+        place.chmod(0o755)
+        MADE.chmod(0o755)
+        program = shutil.copy("/usr/bin/sleep", place / "sfcbd")
+        with subprocess.Popen([program, "100"]) as manager:
+            done = run("setpriv", f"--reuid={NOBODY}", "--clear-groups", f"{MADE}{PREFIX}/sbin/vk-ntp-setup", "status")
+            manager.kill()
+        self.assertIn(f"sfcbd {manager.pid}: its PATH cannot be read; that takes root or its user\n", done.stdout)
+        self.assertEqual(done.stderr, "")
+
     def test_refuses_unusable_arguments(self):
         for words in ([], ["install", "now"], ["upgrade"], ["--upgrade"]):
             self.assertEqual(Host().run(f"{PREFIX}/sbin/vk-ntp-setup", *words).returncode, 2)
         self.assertIn("Usage:", Host().setup("--help").stdout)
+        self.assertLessEqual(widest(Host().setup("--help").stdout), 80)
         self.assertRegex(Host().setup("--version").stdout, r"^vk-ntp-setup \d")
 
 

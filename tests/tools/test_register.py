@@ -7,7 +7,7 @@ import unittest
 
 import fakes
 from registering import CLASSES, MODULE, PREFIX, SHARE, Register
-from support import LIBRARY, directory, snapshot_of
+from support import LIBRARY, directory, snapshot_of, widest
 
 
 class WithoutObjectManager(Register):
@@ -471,6 +471,7 @@ class Arguments(Register):
 
     def test_help_and_version(self):
         self.assertIn("--dry-run", self.register("--help").stdout)
+        self.assertLessEqual(widest(self.register("--help").stdout), 80)
         self.assertRegex(self.register("--version").stdout, r"^vk-provider-register \d+\.\d+\.\d+$")
 
 

@@ -6,7 +6,7 @@ import shutil
 import unittest
 
 from hosts import SNAPSHOT, make_host, properties, take
-from support import NOBODY, directory, run, run_as_nobody, snapshot_of
+from support import NOBODY, directory, run, run_as_nobody, snapshot_of, widest
 
 
 class Plain(unittest.TestCase):
@@ -34,6 +34,8 @@ class Plain(unittest.TestCase):
 
     def test_a_call_without_a_directory_is_refused(self):
         self.assertEqual(run(SNAPSHOT).returncode, 2)
+        done = run(SNAPSHOT, "")
+        self.assertEqual((done.returncode, done.stderr.splitlines()[0]), (2, "vk-host-snapshot: DIR is empty"))
 
     def test_says_whether_serial_numbers_are_in_it(self):
         for words, said in [([], ", masked"), (["--mask"], ", masked"),
@@ -141,6 +143,10 @@ class Directory(unittest.TestCase):
             self.assertEqual({m for n, m in found.items() if (target / n).is_dir()}, {0o700})
             self.assertEqual({m for n, m in found.items() if not (target / n).is_dir()}, {0o600})
             self.assertEqual({target.stat().st_mode & 0o777, target.parent.stat().st_mode & 0o777}, {0o700})
+
+    def test_the_help_is_as_wide_as_the_terminal(self):
+        self.assertLessEqual(widest(run(SNAPSHOT, "--help", env={"COLUMNS": "80"}).stdout), 80)
+        self.assertGreater(widest(run(SNAPSHOT, "--help").stdout), 80)
 
     def test_the_example_is_not_where_everybody_writes(self):
         self.assertNotIn("/tmp", run(SNAPSHOT, "--help").stdout)

@@ -103,7 +103,22 @@ class Width(unittest.TestCase):
         for words in (["report"], ["describe", "VESKA_ComputerSystem"], ["classes"], ["--help"], ["modify", "--help"]):
             for line in self.shown(*words, COLUMNS="80", LC_ALL="C.UTF-8"):
                 self.assertLessEqual(len(line), 80, line)
-        self.assertIn("    server read as 0, which then means nothing", self.shown("report", COLUMNS="80"))
+
+    def test_of_the_terminal_breaks_notes(self):
+        tree = json.loads(Path(HOST["VK_INSTRUMENTATION_TREE"]).read_text(encoding="utf-8"))
+        tree["product"]["rootDirectory"] = "/nowhere/platform/"  # whatever commands this machine has
+        host = directory() / "tree.json"
+        host.write_text(json.dumps(tree), encoding="utf-8")
+        lines = self.shown("report", COLUMNS="80", VK_INSTRUMENTATION_TREE=str(host))
+        first = lines.index("  - no /nowhere/vcm/bin/cimconfig: the delivery settings of the CIM server read")
+        self.assertEqual(lines[first + 1], "    as 0, which then means nothing")
+
+    def test_of_the_terminal_breaks_messages(self):
+        words = [VKCIM, "invoke", "VESKA_TimeService", "ManageTime"]
+        lines = on_a_terminal(words, COLUMNS="80").splitlines()
+        self.assertIn("vkcim: ManageTime takes GetRequest (boolean, in), TimeData (datetime, in and", lines)
+        self.assertLessEqual(max(map(len, lines)), 80)
+        self.assertGreater(max(map(len, run(*words, env={**HOST, "COLUMNS": "80"}).stderr.splitlines())), 80)
 
     def test_of_no_terminal_leaves_lines_whole(self):
         self.assertGreater(max(map(len, self.shown("report"))), 110)

@@ -62,7 +62,7 @@ int run(const std::vector<std::string>& words, tools::Output output) {
     std::string format = "text";
     std::string directory = "/";
     CLI::App app("Looks for each thing outside the provider that its classes need, and says what does not work without "
-                 "it:\nfor reading what the host is, and for setting its time, zone and CIM server.",
+                 "it: for reading what the host is, and for setting its time, zone and CIM server.",
                  "vk-provider-check");
     tools::addCommonOptions(app);
     app.add_option("PART", asked, "What the exit status is about: reading or setting (reading)")

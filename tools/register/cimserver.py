@@ -125,5 +125,5 @@ class CimServer(Manager):
 
     def status(self):
         up = self.modules() is not None
-        known = "registered" if up or self.on_disk() else "registered, as far as can be told"
+        known = "registered" if up or self.on_disk() else "registered, as far as can be seen"
         return super().status(", running" if up else ", not running", known)

@@ -43,7 +43,7 @@ class Owner:
     # Commands.
 
     def locate(self, name, directories=(), but_not=None):
-        """The first command of that name in FOLDERS, where commands usually are, or on this host in PATH."""
+        """The first command of that name in DIRECTORIES, where commands usually are, or on this host in PATH."""
         directories = [directory for directory in [*directories, *self.usual] if os.path.realpath(directory) != but_not]
         found = (os.path.abspath(f"{directory}/{name}") for directory in directories)
         return next((file for file in found if os.path.isfile(file) and os.access(file, os.X_OK)), None)

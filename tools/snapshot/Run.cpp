@@ -12,8 +12,6 @@ namespace snapshot {
 
 namespace {
 
-constexpr mode_t forOthers = 077;
-
 struct Arguments {
     std::string directory;
     std::string root = "/";
@@ -25,18 +23,18 @@ struct Arguments {
 void describe(CLI::App& app, Arguments& arguments) {
     tools::addCommonOptions(app);
     app.add_option("DIR", arguments.directory,
-                   "A directory that is not there yet, or an empty one of your own that is closed\n"
-                   "to others; in any other one a new one is made")
+                   "A directory that is not there yet, or an empty one of your own that is closed to others; in any "
+                   "other one a new one is made")
         ->required()
         ->type_name("");
     app.add_flag("--mask", arguments.masked,
-                 "Replace serial numbers, UUIDs and the machine id by others of the same shape:\nthe default");
+                 "Replace serial numbers, UUIDs and the machine id by others of the same shape: the default");
     app.add_flag("--with-serials", arguments.withSerials, "Leave them as they are");
     app.add_option("--host-name", arguments.hostName, "Write NAME in place of the host's name")->type_name("NAME");
     app.add_option("--root", arguments.root, "Read below DIR (/)")->type_name("DIR");
     app.footer("With VK_INSTRUMENTATION_ROOT=DIR the provider answers as on this host.\n"
                "Exit status: 0 done; 1 some file is there and cannot be read (most take root), or cannot be written, "
-               "and\nthen nothing is left; 2 unusable arguments.\n"
+               "and then nothing is left; 2 unusable arguments.\n"
                "Example: vk-host-snapshot --host-name node7 ~/snapshot");
 }
 
@@ -75,10 +73,11 @@ int take(Target& target, const Arguments& arguments, tools::Output output) {
 int run(const std::vector<std::string>& words, tools::Output output) {
     Arguments arguments;
     CLI::App app("Copies the files of this host that the provider reads into DIR, for bug reports and for developers "
-                 "of\nconsoles.",
+                 "of consoles.",
                  "vk-host-snapshot");
     describe(app, arguments);
     if (const std::optional<int> status = tools::parse(app, words, output)) return *status;
+    if (arguments.directory.empty()) return tools::refuse(app, "DIR is empty", output);
     if (arguments.masked && arguments.withSerials)
         return tools::refuse(app, "--mask and --with-serials exclude each other", output);
     if (const auto problem = tools::problemOfDirectory(arguments.root)) return tools::refuse(app, *problem, output);

@@ -15,7 +15,6 @@ namespace fs = std::filesystem;
 namespace {
 
 constexpr mode_t closedDirectory = 0700;
-constexpr mode_t forOthers = 077;
 constexpr mode_t closedFile = 0600;
 
 /// A final slash would follow a link.

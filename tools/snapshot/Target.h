@@ -7,9 +7,13 @@
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <sys/types.h>
 #include <vector>
 
 namespace snapshot {
+
+/// What users other than the owner may do with a file; nothing of a snapshot is for them.
+constexpr mode_t forOthers = 077;
 
 /// A file or directory that cannot be made, or a directory that is not to be written to; says which and why.
 class Failure : public std::runtime_error {

@@ -2,7 +2,8 @@
 
 extern "C" {
 
-/// Receives the lines of the log channel that a process keeps, from any thread. It must not log itself.
+/// Receives the lines of the log channel that a process keeps, from any thread, but not those on the logger's own
+/// settings. It must not log itself.
 struct NVLogWatch {
     void (*take)(void* context, int level, const char* text);
     void* context;

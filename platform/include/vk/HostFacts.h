@@ -29,7 +29,7 @@ std::string hostUuid();
 bool hostIsKVM();
 
 /// For people: one line for each thing that the host does not say, and why: it lacks the source, or we may not see
-/// it; then one on time, zone, daylight saving and whether the NTP daemon runs, and one where the CIM server's
+/// it; then one on time, zone, daylight saving and whether the NTP daemon ntpd runs, and one where the CIM server's
 /// configuration command is missing. Nothing is thrown but std::bad_alloc.
 std::vector<std::string> hostNotes();
 

@@ -1,17 +1,18 @@
 #include "objectmanager/endpoint/Connections.h"
 
+#include "support/OpenDescriptors.h"
 #include "tests/objectmanager/endpoint/RunningServer.h"
 
 #include <gmock/gmock.h>
 
 #include <arpa/inet.h>
 
-#include <filesystem>
 #include <random>
 
 namespace endpoint {
 namespace {
 
+using support::openDescriptors;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
@@ -81,11 +82,6 @@ TEST_F(ConnectionLimits, AreThoseOfTheManual) {
     Clients clients;
     for (int n = 2; n < 2 + 64; ++n) clients.push_back(served(ports[n % 2], n));
     EXPECT_THAT(refused(ports[0], 100), IsEmpty());
-}
-
-std::size_t openDescriptors() {
-    using Directory = std::filesystem::directory_iterator;
-    return static_cast<std::size_t>(std::distance(Directory("/proc/self/fd"), Directory()));
 }
 
 TEST_F(ConnectionLimits, AThousandClientsThatGoAwayAtAnyPointDoNoHarm) {

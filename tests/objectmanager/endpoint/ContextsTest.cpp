@@ -11,7 +11,7 @@ using namespace std::chrono_literals;
 
 Enumeration enumeration(std::size_t bytes = 1) {
     Enumeration made;
-    made.elements = {std::string(bytes, 'x')};
+    made.elements = {om::ObjectPath{{}, {}, std::string(bytes, 'x'), {}}};
     made.timeout = 60s;
     return made;
 }
@@ -56,6 +56,15 @@ TEST(Contexts, NobodyTakesThoseOfOthers) {
     EXPECT_NO_THROW(contexts.keep(enumerationOf("greedy")));
 }
 
+TEST(Contexts, WhatReferencesAndArraysHoldCountsToo) {
+    using Reference = std::shared_ptr<const om::ObjectPath>;
+    const om::ObjectPath large{{}, {}, std::string(Contexts::mostBytes, 'x'), {}};
+    const std::vector<om::Value> list = {{CMPI_ref, Reference()}, {CMPI_ref, std::make_shared<om::ObjectPath>(large)}};
+    Enumeration made = enumeration();
+    made.elements = {om::Instance{{}, {{"Partners", {CMPI_refA, list}}}}};
+    EXPECT_THROW(Contexts().keep(made), cimxml::CimError);
+}
+
 TEST(Contexts, NumberAndSizeAreBounded) {
     Contexts contexts;
     const Contexts::Clock::time_point start{};
@@ -64,10 +73,10 @@ TEST(Contexts, NumberAndSizeAreBounded) {
     EXPECT_THROW(contexts.keep(enumeration(), start), cimxml::CimError);
     EXPECT_NO_THROW(contexts.keep(enumeration(), start + 60s)); // the others are gone by then
     EXPECT_THROW(contexts.keep(enumeration(Contexts::mostBytes + 1), start + 60s), cimxml::CimError);
-    const std::string large = contexts.keep(enumeration(Contexts::mostBytes - 1), start + 60s);
-    EXPECT_THROW(contexts.keep(enumeration(), start + 60s), cimxml::CimError);
+    const std::string large = contexts.keep(enumeration(Contexts::mostBytes - 1024), start + 60s);
+    EXPECT_THROW(contexts.keep(enumeration(1024), start + 60s), cimxml::CimError);
     contexts.take(large, start + 60s);
-    EXPECT_NO_THROW(contexts.keep(enumeration(), start + 60s));
+    EXPECT_NO_THROW(contexts.keep(enumeration(1024), start + 60s));
 }
 
 } // namespace

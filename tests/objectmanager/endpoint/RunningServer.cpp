@@ -56,23 +56,58 @@ void Client::sendSome(const std::string& text) const {
 }
 
 std::string Client::receive() {
-    for (;;) {
-        const std::size_t end = buffer.find("\r\n\r\n");
-        if (end != std::string::npos) {
-            const std::size_t at = buffer.find("Content-Length: ");
-            const std::size_t length = at < end ? std::stoul(buffer.substr(at + 16)) : 0;
-            if (buffer.size() >= end + 4 + length) return take(end + 4 + length);
-        }
-        char bytes[65536];
-        const ssize_t count = recv(socket, bytes, sizeof bytes, 0);
-        if (count <= 0) return take(buffer.size());
-        buffer.append(bytes, static_cast<std::size_t>(count));
+    std::string answer = receiveHead();
+    receiveBody(answer.substr(), [&answer](std::string_view piece) { answer += piece; });
+    return answer;
+}
+
+void Client::receiveBody(const std::string& head, const std::function<void(std::string_view)>& take) {
+    constexpr std::string_view announcement = "Content-Length: ";
+    if (head.find("Transfer-Encoding: chunked") == std::string::npos) {
+        const std::size_t at = head.find(announcement);
+        take(exactly(at == std::string::npos ? std::string::npos : std::stoul(head.substr(at + announcement.size()))));
+        return;
+    }
+    for (std::size_t length = 1; length > 0;) {
+        length = std::strtoul(through("\r\n").c_str(), nullptr, 16);
+        take(exactly(length));
+        through("\r\n");
     }
 }
 
-void Client::waitForEnd() const {
+bool Client::receiveMore() {
+    char bytes[65536];
+    const ssize_t count = recv(socket, bytes, sizeof bytes, 0);
+    if (count > 0) buffer.append(bytes, static_cast<std::size_t>(count));
+    return count > 0;
+}
+
+std::string Client::through(std::string_view end) {
+    while (buffer.find(end) == std::string::npos) {
+        if (!receiveMore()) return take(buffer.size());
+    }
+    return take(buffer.find(end) + end.size());
+}
+
+std::string Client::exactly(std::size_t length) {
+    while (buffer.size() < length && receiveMore()) continue;
+    return take(std::min(length, buffer.size()));
+}
+
+std::string Client::receiveAll() {
+    std::string all;
+    for (std::string each = receive(); !each.empty(); each = receive()) all += each;
+    return all;
+}
+
+bool Client::hasEnded(std::chrono::milliseconds patience) const {
     pollfd end = {socket, 0, 0}; // POLLHUP alone
-    poll(&end, 1, -1);
+    return poll(&end, 1, static_cast<int>(patience.count())) > 0;
+}
+
+void Client::waitForEnd() const {
+    while (!hasEnded(std::chrono::hours(1))) {
+    }
 }
 
 Client& waitForEither(Client& a, Client& b) {

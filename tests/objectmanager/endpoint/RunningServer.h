@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <condition_variable>
+#include <functional>
 #include <mutex>
 #include <optional>
 #include <string>
@@ -29,9 +30,17 @@ public:
     /// As far as the other end takes it.
     void sendSome(const std::string& text) const;
 
-    /// One answer, its head and its body; what came so far where the connection ends.
+    /// One answer, its head and its body, also one that comes in chunks; what came so far where the connection ends.
     std::string receive();
+    std::string receiveHead() { return through("\r\n\r\n"); }
+    /// What follows such a head, as it comes.
+    void receiveBody(const std::string& head, const std::function<void(std::string_view)>& take);
 
+    /// All that comes until the connection ends.
+    std::string receiveAll();
+
+    /// Whether the other end hangs up in that time.
+    bool hasEnded(std::chrono::milliseconds patience) const;
     /// Until the other end hangs up. What it sent before stays to be received.
     void waitForEnd() const;
 
@@ -44,6 +53,9 @@ public:
     }
 
 private:
+    bool receiveMore();
+    std::string through(std::string_view end);
+    std::string exactly(std::size_t length);
     std::string take(std::size_t length);
 
     int socket;
@@ -67,7 +79,7 @@ protected:
 
     /// Lets what hangs go on.
     void release();
-    om::Answer provide(const om::Request& asked);
+    virtual om::Answer provide(const om::Request& asked);
     void waitForHanging(int count);
 
     support::TemporaryDirectory directory;

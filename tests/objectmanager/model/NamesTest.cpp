@@ -8,10 +8,13 @@ namespace {
 TEST(NamesTest, OnlyLettersOfTheAlphabetHaveCase) {
     EXPECT_TRUE(sameName("OperationalStatus", "operationalSTATUS"));
     EXPECT_FALSE(sameName("Name", "Names"));
+    EXPECT_TRUE(sameName({}, {}));      // a pointer that is null has no bytes to compare
     EXPECT_FALSE(sameName("a[", "A{")); // the characters beside the letters, 32 apart
     EXPECT_FALSE(sameName("a@", "a`"));
     EXPECT_EQ(NameHash()("ElementName"), NameHash()("ELEMENTNAME"));
     EXPECT_NE(NameHash()("ElementName"), NameHash()("Name"));
+    EXPECT_EQ(NameHash()("OperationalStatus"), NameHash()("operationalstatuS")); // the last one after whole words
+    EXPECT_NE(NameHash()("OperationalStatus"), NameHash()("OperationalStatut"));
 }
 
 TEST(NamesTest, AReplacedValueKeepsItsPlaceAndSpelling) {

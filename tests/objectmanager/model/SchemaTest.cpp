@@ -53,6 +53,19 @@ TEST(SchemaTest, ServesTheClassesAndThenTheAssociationsThatAreNotTheStandards) {
     EXPECT_EQ(schema.served(), (List{"X_Thing", "A", "X_Link"}));
 }
 
+TEST(SchemaTest, ServedBelowAClassAreItselfAndWhatDerivesFromIt) {
+    using List = std::vector<std::string>;
+    Schema schema({{"X_Thing", "CIM_Top", false, {}, {}}, {"CIM_Top", "", false, {}, {}}});
+    schema.add({"X_Link", "CIM_Top", true, {}, {}});
+    schema.add({"X_Better", "X_Thing", false, {}, {}});
+    EXPECT_EQ(schema.servedBelow("cim_top"), (List{"X_Thing", "X_Better", "X_Link"}));
+    EXPECT_EQ(schema.servedBelow("X_Thing"), (List{"X_Thing", "X_Better"}));
+    EXPECT_EQ(schema.servedBelow("X_Link"), (List{"X_Link"}));
+    EXPECT_EQ(schema.servedBelow("Unknown"), List());
+    const Schema circle({{"A", "A", false, {}, {}}, {"B", "", false, {}, {}}});
+    EXPECT_EQ(circle.servedBelow("A"), (List{"A"}));
+}
+
 TEST(SchemaTest, TheNearestDeclarationCounts) {
     const Schema& schema = Schema::builtin();
     EXPECT_EQ(schema.findProperty("VESKA_ComputerSystemPackage", "Antecedent")->referenceClass,

@@ -27,19 +27,30 @@ om::Request call(const char* className, const char* method, std::vector<om::Name
 }
 
 const om::Value yes{CMPI_boolean, true};
+const om::Value text{CMPI_string, std::string("a")};
 
 TEST(Advice, NamesPropertiesThatTheClassLacksOrThatAreNotWritable) {
     EXPECT_THAT(
         remarksOn(request(om::Operation::ModifyInstance, "veska_timeservice",
-                          {{"automaticdstadjustment", yes}, {"Region", yes}, {"Regoin", yes}, {"Zzzzzzzz", yes}}),
+                          {{"automaticdstadjustment", yes}, {"Region", text}, {"Regoin", yes}, {"Zzzzzzzz", yes}}),
                   schema()),
         ElementsAre("Region of VESKA_TimeService is not writable",
                     "VESKA_TimeService has no property Regoin; did you mean Region?",
                     "VESKA_TimeService has no property Zzzzzzzz"));
     EXPECT_THAT(
-        remarksOn(request(om::Operation::CreateInstance, "VESKA_ComputerSystem", {{"Name", yes}, {"Nmae", yes}}),
+        remarksOn(request(om::Operation::CreateInstance, "VESKA_ComputerSystem", {{"Name", text}, {"Nmae", yes}}),
                   schema()),
         ElementsAre("VESKA_ComputerSystem has no property Nmae; did you mean Name?"));
+}
+
+TEST(Advice, NamesTypesThatAreNotTheDeclaredOnes) {
+    EXPECT_THAT(
+        remarksOn(request(om::Operation::ModifyInstance, "VESKA_TimeService", {{"automaticdstadjustment", text}}),
+                  schema()),
+        ElementsAre("AutomaticDSTAdjustment of VESKA_TimeService is boolean, not string"));
+    EXPECT_THAT(
+        remarksOn(call("VESKA_TimeService", "ManageTime", {{"getrequest", {CMPI_uint8, std::uint64_t{1}}}}), schema()),
+        ElementsAre("GetRequest of ManageTime is boolean, not uint8"));
 }
 
 TEST(Advice, NamesThePropertyWhoseValueWasWanted) {

@@ -109,6 +109,7 @@ TEST(Arguments, OptionsThatACommandWouldIgnoreAreRefused) {
         {{"delete", "A", "--dry-run"}, "delete: --dry-run does not go with it"},
         {{"report", "--dry-run"}, "report: --dry-run does not go with it"},
         {{"value", "A", "x", "--repeat", "2"}, "value: --repeat does not go with it"},
+        {{"describe", "A", "--url", "unix:/s"}, "describe: --url does not go with it"},
         {{"classes", "--timing"}, "classes: --timing does not go with it"},
         {{"--format", "json", "classes"}, "classes: its output is text alone"},
         {{"--format", "mof", "describe", "A"}, "describe: its output is text alone"},

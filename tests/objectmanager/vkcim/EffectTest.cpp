@@ -49,6 +49,16 @@ TEST(Effect, HasTheReasonBehindIt) {
                 ElementsAre("not changed: Speed is 7 (no right)"));
 }
 
+TEST(Effect, HasNoReasonForWhatCannotBeWritten) {
+    om::Request request;
+    request.path.className = "VESKA_TimeService";
+    request.values = {{"AutomaticDSTAdjustment", {CMPI_boolean, false}}, {"Region", number(1)}, {"Regoin", number(1)}};
+    const om::Answer afterwards = instance({{"AutomaticDSTAdjustment", {CMPI_boolean, true}}});
+    EXPECT_THAT(notChanged(request, afterwards, "no right", om::Schema::builtin()),
+                ElementsAre("not changed: AutomaticDSTAdjustment is true (no right)",
+                            "not changed: Region has no value", "not changed: Regoin has no value"));
+}
+
 TEST(Effect, IsNoneWhereTheInstanceIsNotThere) {
     EXPECT_THAT(unchanged({{"Speed", number(8)}}, {}), ElementsAre("not changed: no such instance"));
 }

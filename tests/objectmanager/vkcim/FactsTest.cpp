@@ -53,7 +53,7 @@ TEST(Facts, NoteEachClassThatIsAnsweredWithAnError) {
     }));
     EXPECT_EQ(facts.at("notes"), json({"no VESKA_ComputerSystem: CMPI_RC_ERR_ACCESS_DENIED (2)",
                                        "no VESKA_PhysicalPackage: CMPI_RC_ERR_ACCESS_DENIED (2)",
-                                       "no UUID: the host has none", "time service: NTP daemon running"}));
+                                       "no UUID: the host has none", "time service: NTP daemon ntpd running"}));
 }
 
 TEST(Facts, KeepIdentifiersAndTheirDescriptionsTogether) {
@@ -77,6 +77,15 @@ TEST(Facts, HoldTheClockWhereItIsKnown) {
     facts.clock = {};
     EXPECT_FALSE(jsonOf(facts).contains("time_service_time"));
     EXPECT_FALSE(jsonOf(facts).contains("time_service_offset_minutes"));
+}
+
+TEST(Facts, HaveNoTimeThatIsNoDateTime) {
+    const auto nothing = [](const om::Request&) { return om::Answer(); };
+    for (const char* time : {"soon", "Unknown", "20261121******.******+000", "00000001000000.000000:000"}) {
+        const json facts = jsonOf(factsFrom(nothing, time));
+        EXPECT_FALSE(facts.contains("time_service_time")) << time;
+        EXPECT_EQ(facts.at("time_service_offset_minutes"), -300);
+    }
 }
 
 } // namespace

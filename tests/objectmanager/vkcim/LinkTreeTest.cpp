@@ -40,6 +40,17 @@ TEST(LinkTree, AnAssociationThatDoesNotFitStandsOnTheNextLine) {
                 ElementsAre("a", "├─ bbbbb  (Link)", "│  └─ ddd", "│       (Link)", "└─ cccccc", "     (Link)"));
 }
 
+TEST(LinkTree, APathThatDoesNotFitGoesOnBehindItsCommas) {
+    Look narrow;
+    narrow.width = 24;
+    EXPECT_THAT(drawLinks({{R"(Service.Name="aaa",System="b")", R"(Computer.Name="b")", "L"}}, narrow),
+                ElementsAre(R"(Service.Name="aaa",)", R"(  System="b")", R"(└─ Computer.Name="b")", "     (L)"));
+}
+
+TEST(LinkTree, WhatWouldSteerATerminalIsWrittenOut) {
+    EXPECT_THAT(drawLinks({{"a\x1b[31m", "b\n", "L"}}), ElementsAre(R"(a\x1b[31m)", R"(└─ b\n  (L))"));
+}
+
 TEST(LinkTree, NoLinksDrawNothing) {
     EXPECT_THAT(drawLinks({}), IsEmpty());
 }

@@ -76,13 +76,20 @@ TEST(Metrics, HoldSerialNumbersOnlyWhereAsked) {
     EXPECT_THAT(metrics(facts, true), Not(HasSubstr("4c4c4544")));
 }
 
+TEST(Metrics, HaveOneSampleForSourcesThatAreShownAlike) {
+    Facts facts = factsOf({});
+    facts.notes = {"/a\xff: is broken", "/a\xfe: is broken", "/a\xff: is broken"};
+    EXPECT_THAT(metrics(facts), HasSubstr("always 1.\n# TYPE vk_source_missing gauge\n"
+                                          "vk_source_missing{source=\"/a\xef\xbf\xbd\"} 1\n# HELP"));
+}
+
 TEST(Metrics, TakeWhatIsMissingFromTheNotes) {
     const std::pair<const char*, std::optional<std::string>> notes[] = {
         {"no UUID: the host has none", "UUID"},
         {"no SMBIOS tables: /sys/firmware/dmi/tables/DMI may be read by root alone", "SMBIOS tables"},
         {"/sys/firmware/dmi/tables/DMI: the table ends early", "/sys/firmware/dmi/tables/DMI"},
         {"no VESKA_ComputerSystem: CMPI_RC_ERR_ACCESS_DENIED (2)", "VESKA_ComputerSystem"},
-        {"time service: NTP daemon running", std::nullopt},
+        {"time service: NTP daemon ntpd running", std::nullopt},
         {"no /usr/sbin/cimconfig: the delivery settings of the CIM server read as 0", std::nullopt},
         {"a note", std::nullopt},
         {"", std::nullopt}};

@@ -6,16 +6,20 @@
 
 namespace {
 
+using nlohmann::json;
 using support::Outcome;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
 
-/// A report on a host that lacks nearly everything, the CIM server's command too.
+/// A report on a host that lacks everything, the CIM server's command too, whatever this machine has.
 Outcome report(std::vector<std::string> options, const char* sink) {
-    const support::TemporaryDirectory bare;
+    const support::TemporaryDirectory host;
+    const json product = {{"rootDirectory", host.path("platform/")}, {"kvm", false}};
+    host.write("tree.json", json::object({{"product", product}, {"nodes", json::array()}}).dump());
     options.insert(options.begin(), {VKCIM, "report"});
-    return support::runCommand(options, "", {{"VK_INSTRUMENTATION_ROOT", bare.path()}, {"NVLOG_SINK", sink}});
+    return support::runCommand(options, "",
+                               {{"VK_INSTRUMENTATION_TREE", host.path("tree.json")}, {"NVLOG_SINK", sink}});
 }
 
 TEST(QuietErrors, KeepWhatCommandsPrintFromAReport) {

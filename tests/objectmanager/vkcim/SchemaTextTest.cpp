@@ -38,7 +38,7 @@ TEST(SchemaText, DescribesPropertiesWithTypeMarksAndWords) {
 
 TEST(SchemaText, DescribesMethodsWithTheirParameters) {
     const std::string service = described("VESKA_TimeService");
-    EXPECT_THAT(service, HasSubstr("\nMethods\n  ManageTime(): uint32\n      Tells or sets the host's time."));
+    EXPECT_THAT(service, HasSubstr("\nMethods\n  ManageTime(): uint32\n      Reads or sets the host's time."));
     EXPECT_THAT(service, HasSubstr("\n    TimeData: datetime, in and out\n      The time to set"));
     EXPECT_THAT(service, HasSubstr("\n    ManagedElement: ref to CIM_ManagedElement, in\n"));
     EXPECT_THAT(service, HasSubstr("\nInherited methods, not offered here\n  StartService, StopService\n"));

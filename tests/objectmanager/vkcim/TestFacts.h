@@ -26,15 +26,16 @@ inline om::Instance instance(const char* className, std::vector<om::NamedValue> 
     return {{"", testNameSpace, className, {{"Name", text(name)}}}, std::move(properties)};
 }
 
-/// The facts of a host that answers so.
-inline Facts factsFrom(const std::function<om::Answer(const om::Request&)>& run) {
+/// The facts of a host that answers so, whose clock says so.
+inline Facts factsFrom(const std::function<om::Answer(const om::Request&)>& run,
+                       const char* time = "20261121060000.123456-300") {
     return gatherFacts(
         om::Schema::builtin(), testNameSpace, {}, run,
-        [] {
-            return HostClock{"20261121060000.123456-300", "-300"};
+        [&] {
+            return HostClock{time, "-300"};
         },
         [] {
-            return std::vector<std::string>{"no UUID: the host has none", "time service: NTP daemon running"};
+            return std::vector<std::string>{"no UUID: the host has none", "time service: NTP daemon ntpd running"};
         });
 }
 

@@ -1,6 +1,7 @@
 #include "vk/Root.h"
 
 #include "support/InChild.h"
+#include "support/OpenDescriptors.h"
 #include "support/TemporaryDirectory.h"
 
 #include <cerrno>
@@ -13,6 +14,7 @@
 #include <sys/syscall.h>
 #include <unistd.h>
 
+using support::openDescriptors;
 using support::TemporaryDirectory;
 using testing::ElementsAre;
 using testing::StartsWith;
@@ -204,7 +206,6 @@ TEST_F(SnapshotRoot, OpensForWritingBelowTheRootOnly) {
 TEST_F(SnapshotRoot, LeavesNoDescriptorOpen) {
     directory.write("etc/file", "x");
     directory.link("/etc/file", "link");
-    const auto openDescriptors = [] { return Root("/").list("/proc/self/fd").names.size(); };
     const std::size_t before = openDescriptors();
     root.read("/link");
     root.read("/etc");

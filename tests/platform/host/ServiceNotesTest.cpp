@@ -15,9 +15,10 @@ using namespace VK::Host;
 TEST(ServiceNotes, TellTheTimeServiceInOneLine) {
     EXPECT_EQ(timeNote({"20240101120000.000000+060", "Europe/Berlin", 1U, true}),
               "time service: time 20240101120000.000000+060, zone Europe/Berlin, automatic daylight saving on, "
-              "NTP daemon running");
-    EXPECT_EQ(timeNote({"", "", 0U, false}), "time service: automatic daylight saving off, NTP daemon not running");
-    EXPECT_EQ(timeNote({}), "time service: NTP daemon not running");
+              "NTP daemon ntpd running");
+    EXPECT_EQ(timeNote({"", "", 0U, false}),
+              "time service: automatic daylight saving off, NTP daemon ntpd not running");
+    EXPECT_EQ(timeNote({}), "time service: NTP daemon ntpd not running");
 }
 
 TEST(ServiceNotes, FindTheDaemonAmongTheProcesses) {

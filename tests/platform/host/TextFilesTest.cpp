@@ -1,15 +1,16 @@
 #include "host/TextFiles.h"
+#include "support/RunLevel.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <cstring>
 #include <utmp.h>
 
 namespace VK::Host {
 
 namespace {
 
+using support::runLevel;
 using testing::ElementsAre;
 using testing::Pair;
 
@@ -53,15 +54,6 @@ TEST(HostNameFile, HoldsTheNameInItsFirstRealLine) {
     EXPECT_EQ(hostNameFromFile("# name\n\n  node7 \nother\n"), "node7");
     EXPECT_EQ(hostNameFromFile("\n"), "");
     EXPECT_EQ(hostNameFromFile(""), "");
-}
-
-std::string runLevel(char now, char before = 'N') {
-    utmp entry{};
-    entry.ut_type = RUN_LVL;
-    entry.ut_pid = now + 256 * before;
-    std::string bytes(sizeof entry, '\0');
-    std::memcpy(bytes.data(), &entry, sizeof entry);
-    return bytes;
 }
 
 TEST(Utmp, TellsAShutdownByTheLastRunLevel) {

@@ -86,6 +86,20 @@ TEST(LogWatch, SeesTheLinesOfTheLogChannelThatAreKept) {
     });
 }
 
+TEST(LogWatch, IsNotShownWhatIsWrongWithTheSettings) {
+    TemporaryDirectory directory;
+    quietly({{"NVLOG_SINK", "file:" + directory.path("log")}, {"NVLOG_LEVELS", "many"}}, [] {
+        std::string seen;
+        const NVLogWatch watch = {
+            [](void* context, int, const char* text) { *static_cast<std::string*>(context) += text; }, &seen};
+        nvLogWatch(&watch);
+        log("a");
+        nvLogWatch(nullptr);
+        EXPECT_EQ(seen, "a");
+    });
+    EXPECT_EQ(splitLines(directory.read("log")).size(), 2U);
+}
+
 TEST(StandardError, GetsTheSameLines) {
     TemporaryDirectory directory;
     quietly({{"NVLOG_SINK", "stderr"}}, [&] {

@@ -54,6 +54,26 @@ TEST(Settings, KeepTheLevelsListed) {
     for (const int dropped : {3000, 6000, 0, 5}) EXPECT_FALSE(settings.keeps(Channel::Log, dropped)) << dropped;
 }
 
+TEST(Settings, AQuickLookHidesNoLineThatIsKept) {
+    for (const char* list : {"", "4000, 17,-5", "3000", "2147483647,-2147483648", "all"}) {
+        const Settings settings = withLevels(list);
+        for (const int level : {-2147483647 - 1, -5, 0, 16, 17, 511, 3000, 3007, 4000, 6000, 2147483647}) {
+            for (const Channel channel : {Channel::Log, Channel::Trace}) {
+                const bool seen = (settings.bits(channel) & Settings::bitOf(level)) != 0;
+                EXPECT_TRUE(seen || !settings.keeps(channel, level)) << list << ' ' << level;
+            }
+        }
+    }
+}
+
+TEST(Settings, AQuickLookSeparatesTheLevelsInUse) {
+    const std::uint64_t bits = parseSettings(nullptr, nullptr, nullptr).bits(Channel::Log);
+    EXPECT_NE(bits & Settings::bitOf(3000), 0U);
+    EXPECT_NE(bits & Settings::bitOf(6000), 0U);
+    EXPECT_EQ(bits & Settings::bitOf(4000), 0U);
+    EXPECT_EQ(parseSettings("none", "all", nullptr).bits(Channel::Log), 0U);
+}
+
 TEST(Settings, KeepAllLevels) {
     for (const char* list : {"all", "3000,all", " all "})
         for (const int level : {0, 1, 4000, -1, 2147483647})

@@ -3,6 +3,7 @@
 #include "host/HardwareFacts.h"
 #include "host/State.h"
 #include "support/HostCopy.h"
+#include "support/RunLevel.h"
 #include "support/SmbiosImage.h"
 #include "tree/SimulatedHost.h"
 #include "zone/ZoneInForce.h"
@@ -11,18 +12,17 @@
 
 #include <atomic>
 #include <chrono>
-#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <functional>
 #include <set>
 #include <thread>
-#include <utmp.h>
 
 namespace VK::Tree {
 
 namespace {
 
+using support::runLevel;
 using support::SmbiosChassisImage;
 using support::SmbiosImage;
 using support::SmbiosSystemImage;
@@ -178,15 +178,6 @@ TEST(ChangingFiles, OfTheHostsNameAreOneNameOrNone) {
                        removing(host, file)});
     churn.expectOnly<std::string>({"", "node7", "a-much-longer-name.example"},
                                   [&] { return Host::hostName(Root(host.path())).value_or(""); });
-}
-
-std::string runLevel(char level) {
-    utmp entry{};
-    entry.ut_type = RUN_LVL;
-    entry.ut_pid = static_cast<unsigned char>(level);
-    std::string bytes(sizeof entry, '\0');
-    std::memcpy(bytes.data(), &entry, sizeof entry);
-    return bytes;
 }
 
 TEST(ChangingFiles, OfShutdownsTellOneOnlyWhereItIsDue) {

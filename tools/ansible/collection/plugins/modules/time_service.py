@@ -9,8 +9,8 @@ options:
   automatic_dst_adjustment:
     description:
       - Whether local time follows daylight saving. C(false) replaces the time zone by one without, and remembers it;
-        C(true) brings it back, and fails where none is remembered. Only the attempt shows whether one is: in check mode
-        C(true) warns of that, and says that it would change.
+        C(true) brings it back, and fails where none is remembered. Only the attempt shows whether one is. So in check
+        mode C(true) warns of that, and says that it would change.
     type: bool
   time:
     description:
