@@ -8,6 +8,8 @@ set(VK_PROVIDER_VENDOR VK)
 
 # The product's root directory, with a final slash.
 set(VK_ROOT_DIRECTORY ${CMAKE_INSTALL_PREFIX}/lib/vk/platform/)
+# For the single sources that use it: with another prefix nothing else is compiled anew.
+set(vk_root_definition "VK_ROOT_DIRECTORY=\"${VK_ROOT_DIRECTORY}\"")
 # Where the provider looks for the object manager's command cimconfig.
 set(VK_COMMAND_FOLDER ${CMAKE_INSTALL_PREFIX}/lib/vk/vcm/bin)
 set(VK_MULTIARCH ${CMAKE_LIBRARY_ARCHITECTURE})
