@@ -179,14 +179,15 @@ protected:
         return answer;
     }
 
-    /// How far the process's memory grows while an answer of so many instances is received, in bytes.
-    std::size_t peakFor(int instances) {
+    /// How far the process's memory grows while an answer of so many instances is received, in bytes; below 0 where the
+    /// kernel, which counts for each thread by itself, had not counted everything before.
+    std::ptrdiff_t peakFor(int instances) {
         results = instances;
         Client client(path);
         const std::string message = cimxml::intrinsic(
             "EnumerateInstances", cimxml::parameter("ClassName", cimxml::className("VESKA_ComputerSystem")));
         std::ofstream("/proc/self/clear_refs") << "5"; // the peak is what there is now
-        const std::size_t before = resident("VmRSS:");
+        const std::ptrdiff_t before = resident("VmRSS:");
         client.send(posted("EnumerateInstances", message));
         std::size_t length = 0;
         client.receiveBody(client.receiveHead(), [&](std::string_view piece) { length += piece.size(); });
@@ -195,11 +196,11 @@ protected:
     }
 
 private:
-    static std::size_t resident(const std::string& name) {
+    static std::ptrdiff_t resident(const std::string& name) {
         std::ifstream status("/proc/self/status");
         for (std::string word; status >> word;) {
-            std::size_t kilobytes = 0;
-            if (word == name && status >> kilobytes) return kilobytes << 10U;
+            std::ptrdiff_t kilobytes = 0;
+            if (word == name && status >> kilobytes) return kilobytes * 1024;
         }
         return 0;
     }
@@ -215,9 +216,9 @@ private:
 TEST_F(SharedTexts, TheTextOfALargeAnswerIsNeverInMemoryAtOnce) {
     start();
     peakFor(100); // what the threads and the allocator take for good
-    const std::size_t small = peakFor(100);
-    const std::size_t large = peakFor(1000); // 64 MiB
-    EXPECT_LT(large, small + (std::size_t{4} << 20U));
+    const std::ptrdiff_t small = peakFor(100);
+    const std::ptrdiff_t large = peakFor(1000); // 64 MiB
+    EXPECT_LT(large, small + 4 * 1024 * 1024);
 }
 
 #endif
