@@ -48,6 +48,8 @@ class Programs:
         self.copy = copy
         self.size = size
         self.known = sorted(self.read_targets(), key=lambda program: program.target)
+        if not self.known:
+            raise workspace.Failure("the copy has no test programs")
         self.environments = {}
         self.locks = collections.defaultdict(threading.Lock)
         self.seconds = {}  # by program: what it takes unchanged

@@ -63,7 +63,7 @@ class Workspace:
         (self.tree / BUILD / "Testing").mkdir(exist_ok=True)
         (self.tree / BUILD / "reached").touch()
         # A program is not linked again because a library's insides have changed.
-        command = ["cmake", "--preset", "release", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON"]
+        command = ["cmake", "--preset", "release", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON", "-DBUILD_TESTING=ON"]
         if self.logged(command) != 0:
             raise Failure(f"the copy cannot be configured:\n{self.log.read_text(errors='replace')[-2000:]}")
 
