@@ -18,7 +18,7 @@ endif()
 # Debug information names the sources from the tree's root on, not where the tree lay when it was built.
 # gcov's notes name them as they are.
 if(NOT VK_COVERAGE)
-    foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_model om_mof om_broker vkcim_core vkcim
+    foreach(target IN LISTS runtime_libraries ITEMS provider_parts vkcommon_inside om_schema om_model om_mof om_broker vkcim_terminal vkcim_core vkcim
             vk_command_line vk_snapshot vk-host-snapshot vk_check vk-provider-check ${endpoint_targets})
         target_compile_options(${target} PRIVATE
             -ffile-prefix-map=${CMAKE_SOURCE_DIR}/= -ffile-prefix-map=${CMAKE_BINARY_DIR}=build)

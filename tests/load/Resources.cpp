@@ -1,9 +1,10 @@
 #include "load/Resources.h"
 
+#include "support/OpenDescriptors.h"
+
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
-#include <filesystem>
 #include <fstream>
 
 #include <malloc.h>
@@ -53,7 +54,7 @@ Resources Resources::now() {
         std::ifstream("/proc/self/statm") >> pages >> pages; // the second number
         found.resident = pages * static_cast<std::size_t>(sysconf(_SC_PAGESIZE));
     }
-    for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator("/proc/self/fd")) ++found.descriptors;
+    found.descriptors = support::openDescriptors();
     return found;
 }
 
