@@ -9,6 +9,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <csignal>
 #include <cstdio>
@@ -19,6 +20,7 @@
 #include <stdexcept>
 #include <system_error>
 #include <thread>
+#include <utility>
 
 namespace bench {
 namespace {
@@ -105,9 +107,15 @@ pid_t forked() {
 } // namespace
 
 ServerProcess::~ServerProcess() {
-    if (process <= 0) return;
+    end();
+}
+
+bool ServerProcess::end() {
+    if (process <= 0) return false;
+    int status = -1;
     kill(process, SIGTERM);
-    waitpid(process, nullptr, 0);
+    waitpid(std::exchange(process, -1), &status, 0);
+    return WIFEXITED(status) && WEXITSTATUS(status) == 0;
 }
 
 std::size_t ServerProcess::residentMemory() const {
@@ -132,8 +140,7 @@ double ServerProcess::processorTime() const {
 }
 
 // Its lines go to a file that nobody reads, but for the first: a pipe would have to be emptied by us.
-Endpoint::Endpoint(const std::string& program) {
-    std::FILE* const log = std::tmpfile();
+Endpoint::Endpoint(const std::string& program) : log(std::tmpfile()) {
     if (log == nullptr) fail("tmpfile");
     process = forked();
     if (process == 0) {
@@ -151,8 +158,23 @@ Endpoint::Endpoint(const std::string& program) {
         if (end != std::string::npos) listening = std::stoi(text.substr(text.rfind(':', end) + 1));
         std::this_thread::sleep_for(std::chrono::milliseconds(10));
     }
+    if (listening != 0) return;
     std::fclose(log);
-    if (listening == 0) throw std::runtime_error(program + " does not start");
+    throw std::runtime_error(program + " does not start");
+}
+
+Endpoint::~Endpoint() {
+    end();
+    std::fclose(log);
+}
+
+std::string Endpoint::lastWords() const {
+    constexpr long most = 20000;
+    std::string words(most, '\0');
+    std::fseek(log, 0, SEEK_END);
+    std::fseek(log, std::max(0L, std::ftell(log) - most), SEEK_SET);
+    words.resize(std::fread(words.data(), 1, words.size(), log));
+    return words;
 }
 
 Constant::Constant(bool worker) {

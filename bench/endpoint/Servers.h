@@ -3,6 +3,7 @@
 #include <sys/types.h>
 
 #include <cstddef>
+#include <cstdio>
 #include <string>
 
 namespace bench {
@@ -20,6 +21,8 @@ public:
     std::size_t descriptors() const;
     /// Of all its threads, in microseconds.
     double processorTime() const;
+    /// Ends it. Whether it ended with status 0, which a sanitizer that found something changes.
+    bool end();
 
 protected:
     ServerProcess() = default;
@@ -32,6 +35,13 @@ protected:
 class Endpoint : public ServerProcess {
 public:
     explicit Endpoint(const std::string& program);
+    ~Endpoint();
+
+    /// The end of its log.
+    std::string lastWords() const;
+
+private:
+    std::FILE* const log;
 };
 
 /// libmicrohttpd as vkcimd uses it, which answers a request for the path /N with N bytes: at once, or by way of a

@@ -1,8 +1,8 @@
+#include "support/RealMachines.h"
 #include "support/Command.h"
 
 #include <gmock/gmock.h>
 
-#include <cstdlib>
 #include <filesystem>
 
 // What the tables of real machines come to. The directory of their snapshots is named by VK_TEST_HOSTS.
@@ -49,8 +49,8 @@ constexpr Machine machines[] = {
 class RealMachines : public testing::TestWithParam<Machine> {
 protected:
     void SetUp() override {
-        const char* const hosts = std::getenv("VK_TEST_HOSTS");
-        if (hosts == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name the directory of the machines' snapshots";
+        const char* const hosts = support::realMachines();
+        if (hosts == nullptr) GTEST_SKIP() << support::noRealMachines;
         const std::filesystem::path directory = std::filesystem::path(hosts) / GetParam().directory;
         ASSERT_TRUE(std::filesystem::is_directory(directory)) << directory;
         environment = "NVLOG_SINK=none VK_INSTRUMENTATION_ROOT=" + test::quoted(directory.string());

@@ -1,6 +1,7 @@
 #include "host/Placeholder.h"
 
 #include "host/Smbios.h"
+#include "support/RealMachines.h"
 #include "vk/Root.h"
 
 #include <gmock/gmock.h>
@@ -8,7 +9,6 @@
 
 #include <algorithm>
 #include <cctype>
-#include <cstdlib>
 #include <iterator>
 #include <map>
 #include <set>
@@ -98,8 +98,8 @@ std::set<std::string_view> reasonsOn(const Smbios& smbios) {
 }
 
 TEST(Placeholder, RulesStateOnHowManyOfTheTestsMachinesTheyWereSeen) {
-    const char* directory = std::getenv("VK_TEST_HOSTS");
-    if (directory == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a directory with snapshots of real machines";
+    const char* const directory = support::realMachines();
+    if (directory == nullptr) GTEST_SKIP() << support::noRealMachines;
     std::map<std::string_view, unsigned int> machines;
     for (const std::string& name : Root(directory).list("/").names) {
         const Root machine(std::string(directory) + "/" + name);

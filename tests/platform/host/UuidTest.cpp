@@ -1,12 +1,12 @@
 #include "host/Uuid.h"
 
 #include "host/SmbiosTable.h"
+#include "support/RealMachines.h"
 #include "vk/Root.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <map>
 
 namespace VK::Host {
@@ -95,8 +95,8 @@ std::string hexDigits(std::string_view bytes) {
 }
 
 TEST(Uuid, SharedOnesStateOnHowManyOfTheTestsMachinesTheyWereSeen) {
-    const char* directory = std::getenv("VK_TEST_HOSTS");
-    if (directory == nullptr) GTEST_SKIP() << "VK_TEST_HOSTS does not name a directory with snapshots of real machines";
+    const char* const directory = support::realMachines();
+    if (directory == nullptr) GTEST_SKIP() << support::noRealMachines;
     std::map<std::string, unsigned int> machines;
     for (const std::string& name : Root(directory).list("/").names) {
         const std::string table = Root(std::string(directory) + "/" + name).read("/sys/firmware/dmi/tables/DMI").text;
