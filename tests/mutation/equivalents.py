@@ -1,12 +1,13 @@
 """The list of mutants that no test can notice."""
 import pathlib
+import re
 
 FILE = pathlib.Path(__file__).with_name("equivalent")
 
 
 class Equivalents:
     def __init__(self, text):
-        self.reasons = {}  # by function, kind and change; the change may be missing
+        self.reasons = {}  # by function, kind and change; the change may be missing, or a /regular expression/
         entry = None
         for number, line in enumerate(text.splitlines(), 1):
             if line.startswith(" ") and entry:
@@ -22,18 +23,22 @@ class Equivalents:
             if not reason:
                 raise ValueError(f"no reason stands below {': '.join(filter(None, entry))}")
 
-    @staticmethod
-    def entries_of(mutant):
-        return [(mutant.function, mutant.kind, ""), (mutant.function, mutant.kind, mutant.change())]
-
     def reason(self, mutant):
         """Why a mutant is equivalent; None when it is not in the list."""
-        return next((self.reasons[entry] for entry in self.entries_of(mutant) if entry in self.reasons), None)
+        return next((reason for entry, reason in self.reasons.items() if covers(entry, mutant)), None)
 
     def stale(self, mutants):
         """The entries that none of the mutants is found by."""
-        used = {entry for mutant in mutants for entry in self.entries_of(mutant)}
-        return [": ".join(filter(None, entry)) for entry in self.reasons if entry not in used]
+        return [": ".join(filter(None, entry)) for entry in self.reasons if not any(covers(entry, each) for each in mutants)]
+
+
+def covers(entry, mutant):
+    function, kind, change = entry
+    if (function, kind) != (mutant.function, mutant.kind):
+        return False
+    if change.startswith("/") and change.endswith("/"):
+        return re.search(change[1:-1], mutant.change()) is not None
+    return change in ("", mutant.change())
 
 
 def read():

@@ -47,7 +47,7 @@ class Programs:
     def __init__(self, copy, size, quick=False):
         self.copy = copy
         self.size = size
-        self.quick = quick  # without those that are no GoogleTest programs, which take minutes for each survivor
+        self.quick = quick  # with the nearest ones alone: all others take a minute for each survivor
         self.known = sorted(self.read_targets(), key=lambda program: program.target)
         if not self.known:
             raise workspace.Failure("the copy has no test programs")
@@ -76,10 +76,13 @@ class Programs:
         mirrored = [part for part in map(lambda program: self.mirror(program, file.stem), self.known) if part]
         nearest = [part for part in mirrored if part.is_in(room)] or mirrored
         whole = {part.target for part in nearest if not part.suites}
+        provider = pathlib.PurePath("tests/provider")  # looks at all of it
         same_room = [program for program in self.known if program.is_in(room) and program.target not in whole]
         seen = whole | {program.target for program in same_room}
         others = [program for program in self.known if program.target not in seen]
-        others.sort(key=lambda program: not program.is_in(pathlib.PurePath("tests/provider")))  # they look at all of it
+        others.sort(key=lambda program: not program.is_in(provider))
+        if self.quick:
+            others = [program for program in others if program.is_in(provider)]
         return [each for each in (nearest, same_room, *in_parts(others)) if each]
 
     def likely(self, file):
@@ -111,8 +114,7 @@ class Programs:
         for test in listed:
             given = [value for each in test["properties"] if each["name"] == "ENVIRONMENT" for value in each["value"]]
             self.environments[test["name"].split(".")[0]] = dict(value.split("=", 1) for value in given)
-        if not self.quick:
-            self.known += [Program(test["name"]) for test in listed if WHOLE.match(test["name"])]
+        self.known += [Program(test["name"]) for test in listed if WHOLE.match(test["name"])]
 
     def quickest(self, programs):
         """Quick ones first, and before them those of which nothing is known yet."""

@@ -144,6 +144,11 @@ class EquivalentsTest(Checkout):
         self.assertEqual(listed.reason(self.constant), "Nobody counts.")
         self.assertIsNone(listed.reason(self.comparison))
 
+    def test_changes_may_be_named_by_an_expression(self):
+        listed = equivalents.Equivalents("first: constant: /^4 -> [0-9]$/\n  Nobody counts.\nfirst: constant: /7/\n  Nor here.\n")
+        self.assertEqual(listed.reason(self.constant), "Nobody counts.")
+        self.assertEqual(listed.stale([self.constant]), ["first: constant: /7/"])
+
     def test_an_entry_without_mutants_is_stale(self):
         listed = equivalents.Equivalents("first: constant\n  So.\nfirst: boundary\n  So.\nfirst: constant: 4 -> 6\n  So.\n")
         self.assertEqual(listed.stale([self.comparison, self.constant]), ["first: boundary", "first: constant: 4 -> 6"])
