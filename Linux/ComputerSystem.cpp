@@ -139,22 +139,15 @@ bool ComputerSystem::getOperationalStatus(std::vector<unsigned short>& states) c
 
 bool ComputerSystem::getEnabledState(unsigned short& state) const {
     const TraceScope scope(VK_SCOPE(source));
-    unsigned int powerState = 0;
+    unsigned int powerState{};
     if (!node().getProperty(NodeLexicon::PowerStateProperty, powerState)) return false;
-    switch (powerState) {
-    case 0:
+    if (powerState == 0)
         state = 0; // Unknown
-        break;
-    case 1:
+    else if (powerState == 1)
         state = 2; // Enabled
-        break;
-    case 16:
+    else if (powerState == 16)
         state = 4; // Shutting Down
-        break;
-    default: // on purpose: the state stays as it was, and is supplied
-        break;
-    }
-    return true;
+    return true;   // on purpose: with any other power state the output stays as it was, and is supplied
 }
 
 bool ComputerSystem::getDedicated(std::vector<unsigned short>& purposes) const {

@@ -92,7 +92,7 @@ bool PhysicalPackage::getPackageType(unsigned short& type) const {
         12,
     };
     constexpr unsigned short other = 1;
-    unsigned int number = 0;
+    unsigned int number{};
     type = 0;
     if (node().getProperty(NodeLexicon::PackageTypeProperty, number))
         type = number < std::size(cimTypes) ? cimTypes[number] : other;

@@ -19,7 +19,6 @@ const TraceSource& CMPITimeService::traceSource() {
 
 void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** propertyList) {
     const ParameterTraceScope scope(VK_SCOPE(source), " referenceInstance=", instance, " properties=", propertyList);
-    if (instance == nullptr) return;
     bool automatic{};
     if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic)) {
         data.setAutomaticDSTAdjustment(automatic); // on purpose: its result is ignored
@@ -34,14 +33,11 @@ namespace {
 using Cmpi::hasService;
 using Cmpi::hasSlot;
 
-/// An argument's data; of type CMPI_null when it is missing.
+/// An argument's data; of type CMPI_null when it is missing. "GetRequest" was read before, so that the slot is there.
 CMPIData argument(const CMPIArgs* in, const char* name) {
-    CMPIData absent = {};
-    absent.state = CMPI_nullValue | CMPI_notFound;
-    if (!hasSlot(in, &CMPIArgsFT::getArg)) return absent;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPIData data = in->ft->getArg(in, name, &status);
-    return status.rc == CMPI_RC_OK ? data : absent;
+    return status.rc == CMPI_RC_OK ? data : CMPIData{};
 }
 
 /// Refuses an argument of the wrong type. The status with its message stays here on purpose: the caller sees the

@@ -98,10 +98,10 @@ private:
             return true;
         }
         CMPIObjectPath* computerPath = nullptr;
-        if (!ProviderUtilities::getKeyProperty(objectPath, Self::computerRole, &computerPath)) return false;
         std::string name;
         std::string locatedName;
-        if (!ProviderUtilities::getKeyProperty(computerPath, "Name", name) ||
+        if (!ProviderUtilities::getKeyProperty(objectPath, Self::computerRole, &computerPath) ||
+            !ProviderUtilities::getKeyProperty(computerPath, "Name", name) ||
             !ProviderUtilities::getKeyProperty(located, "Name", locatedName) || name != locatedName)
             return false;
         computer.setObjectPath(located);

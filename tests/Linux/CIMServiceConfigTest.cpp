@@ -50,8 +50,10 @@ TEST_F(CIMServiceConfigTest, IsNamedAfterItsClass) {
     };
     for (const auto& [getter, expected] : texts) {
         std::string text;
+        test::takeLog();
         EXPECT_TRUE((config.*getter)(text));
         EXPECT_EQ(text, expected);
+        EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(" LOG 4000 .* get[A-Za-z]+: ENTERING: "))) << expected;
     }
 }
 

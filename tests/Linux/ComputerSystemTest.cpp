@@ -1,5 +1,6 @@
 #include "Linux/ComputerSystem.h"
 #include "Linux/OneComputer.h"
+#include "Linux/Untouched.h"
 #include "support/SimulatedHost.h"
 
 #include <gmock/gmock.h>
@@ -10,12 +11,14 @@
 namespace {
 
 using namespace std::string_literals;
+using test::expectUntouched;
 using testing::ElementsAre;
+using testing::HasSubstr;
 using testing::IsEmpty;
+using testing::IsSupersetOf;
 using VK::BaseServerProvider::ComputerSystem;
 using Filter = ComputerSystem::FilterType;
 using Texts = std::vector<std::string>;
-using Numbers = std::vector<unsigned short>;
 
 Texts remainingNames(ComputerSystem& system) {
     Texts names;
@@ -182,45 +185,35 @@ TEST(ComputerSystem, AppendsWhatIdentifiesItAndClearsBeforeEitherHalf) {
     EXPECT_TRUE(system.getIdentifyingInfo(descriptions, values));
     EXPECT_EQ(values.size(), 7U);
     EXPECT_EQ(values.front(), "mine");
+    test::takeLog();
     EXPECT_TRUE(system.getOtherIdentifyingInfo(values));
     EXPECT_TRUE(system.getIdentifyingDescriptions(descriptions));
+    EXPECT_THAT(test::takeLog(), IsSupersetOf({HasSubstr(" getOtherIdentifyingInfo: ENTERING: "),
+                                               HasSubstr(" getIdentifyingDescriptions: ENTERING: ")}));
     EXPECT_EQ(values.size(), 6U);
     EXPECT_EQ(values.front(), "4c4c4544-0043-3010-8052-000000000000");
     EXPECT_EQ(descriptions.size(), 6U);
     EXPECT_EQ(descriptions.front(), "CIM:GUID");
 }
 
-/// Asks a getter that never has a value.
-template <class Value>
-void expectUntouched(const ComputerSystem& system, bool (ComputerSystem::*getter)(Value&) const, const Value& before) {
-    Value value = before;
-    EXPECT_FALSE((system.*getter)(value));
-    EXPECT_EQ(value, before);
-}
-
 TEST(ComputerSystem, SuppliesNoTextThatTheNodeLacks) {
     test::simulateOne([](test::Node& node) { node.properties.clear(); });
-    for (const TextGetter getter : {&ComputerSystem::getName, &ComputerSystem::getElementName, &ComputerSystem::getUUID,
-                                    &ComputerSystem::getPrimaryOwnerContact, &ComputerSystem::getPrimaryOwnerName})
-        expectUntouched(ComputerSystem(), getter, std::string("before"));
+    expectUntouched(ComputerSystem(), &ComputerSystem::getName, &ComputerSystem::getElementName,
+                    &ComputerSystem::getUUID, &ComputerSystem::getPrimaryOwnerContact,
+                    &ComputerSystem::getPrimaryOwnerName);
 }
 
 TEST(ComputerSystem, LeavesTheOutputOfWhatTheHostCannotSupply) {
     test::simulateOne([](test::Node&) {});
-    const ComputerSystem system;
-    for (const auto getter :
-         {&ComputerSystem::getCaption, &ComputerSystem::getInstallDate, &ComputerSystem::getOtherEnabledState,
-          &ComputerSystem::getTimeOfLastStateChange, &ComputerSystem::getNameFormat})
-        expectUntouched(system, getter, std::string("before"));
-    for (const auto getter : {&ComputerSystem::getPrimaryStatus, &ComputerSystem::getDetailedStatus,
-                              &ComputerSystem::getOperatingStatus, &ComputerSystem::getCommunicationStatus,
-                              &ComputerSystem::getRequestedState, &ComputerSystem::getEnabledDefault,
-                              &ComputerSystem::getTransitioningToState, &ComputerSystem::getResetCapability})
-        expectUntouched(system, getter, static_cast<unsigned short>(77));
-    for (const auto getter : {&ComputerSystem::getStatusDescriptions, &ComputerSystem::getRoles,
-                              &ComputerSystem::getOtherDedicatedDescriptions})
-        expectUntouched(system, getter, Texts{"before"});
-    expectUntouched(system, &ComputerSystem::getAvailableRequestedStates, Numbers{77});
+    expectUntouched(ComputerSystem(), &ComputerSystem::getCaption, &ComputerSystem::getInstallDate,
+                    &ComputerSystem::getOtherEnabledState, &ComputerSystem::getTimeOfLastStateChange,
+                    &ComputerSystem::getNameFormat, &ComputerSystem::getPrimaryStatus,
+                    &ComputerSystem::getDetailedStatus, &ComputerSystem::getOperatingStatus,
+                    &ComputerSystem::getCommunicationStatus, &ComputerSystem::getRequestedState,
+                    &ComputerSystem::getEnabledDefault, &ComputerSystem::getTransitioningToState,
+                    &ComputerSystem::getResetCapability, &ComputerSystem::getStatusDescriptions,
+                    &ComputerSystem::getRoles, &ComputerSystem::getOtherDedicatedDescriptions,
+                    &ComputerSystem::getAvailableRequestedStates);
 }
 
 TEST(ComputerSystem, MakesNoIdentifyingTextsForAnInstanceWithoutAChassisAndHandsThemToADirectCaller) {
@@ -229,6 +222,7 @@ TEST(ComputerSystem, MakesNoIdentifyingTextsForAnInstanceWithoutAChassisAndHands
     Texts texts = {"before"};
     EXPECT_FALSE(system.supplyOtherIdentifyingInfo(texts));
     EXPECT_THAT(texts, IsEmpty());
+    texts = {"before"};
     EXPECT_FALSE(system.supplyIdentifyingDescriptions(texts));
     EXPECT_THAT(texts, IsEmpty());
     EXPECT_FALSE(system.getOtherIdentifyingInfo(texts));

@@ -1,4 +1,5 @@
 #include "Linux/PhysicalPackage.h"
+#include "Linux/Untouched.h"
 #include "support/SimulatedHost.h"
 
 #include <gmock/gmock.h>
@@ -134,6 +135,21 @@ TEST(PhysicalPackage, ReadsItsTextsFromTheNode) {
         EXPECT_TRUE((package.*getter)(value));
         EXPECT_EQ(value, expected);
     }
+}
+
+TEST(PhysicalPackage, LeavesTheOutputOfWhatTheHostCannotSupply) {
+    test::simulate({test::chassis(0, 0, "A")});
+    test::expectUntouched(
+        PhysicalPackage(), &PhysicalPackage::getCaption, &PhysicalPackage::getInstallDate, &PhysicalPackage::getName,
+        &PhysicalPackage::getOperationalStatus, &PhysicalPackage::getStatusDescriptions,
+        &PhysicalPackage::getHealthState, &PhysicalPackage::getPrimaryStatus, &PhysicalPackage::getDetailedStatus,
+        &PhysicalPackage::getOperatingStatus, &PhysicalPackage::getCommunicationStatus, &PhysicalPackage::getVersion,
+        &PhysicalPackage::getPartNumber, &PhysicalPackage::getOtherIdentifyingInfo, &PhysicalPackage::isPoweredOn,
+        &PhysicalPackage::getManufactureDate, &PhysicalPackage::getVendorEquipmentType,
+        &PhysicalPackage::getUserTracking, &PhysicalPackage::canBeFRUed, &PhysicalPackage::getRemovalConditions,
+        &PhysicalPackage::getHeight, &PhysicalPackage::getDepth, &PhysicalPackage::getWidth,
+        &PhysicalPackage::getWeight, &PhysicalPackage::getOtherPackageType,
+        &PhysicalPackage::getVendorCompatibilityStrings);
 }
 
 } // namespace

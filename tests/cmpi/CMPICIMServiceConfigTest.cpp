@@ -193,15 +193,27 @@ TEST_F(CMPICIMServiceConfigTest, RefusesMissingArgumentsAndACountThatFails) {
     CMPIValue five = {};
     five.uint32 = 5;
     CMAddArg(arguments, "deliveryRetryAttempts", &five, CMPI_uint32);
+    addCommand("exit 0");
     CMPIArgsFT table = *arguments->ft;
+    table.getArg = [](const CMPIArgs*, const char*, CMPIStatus*) {
+        CMPIData given = {CMPI_uint32, CMPI_goodValue, {}};
+        given.value.uint32 = 5;
+        return given;
+    };
     table.getArgCount = [](const CMPIArgs*, CMPIStatus* status) -> CMPICount {
         status->rc = CMPI_RC_ERR_FAILED;
         return 1;
     };
     const CMPIArgs failing = {arguments->hdl, &table};
-    EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 4U);
-    table.getArgCount = nullptr;
-    EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 4U);
+    test::isolated([&] {
+        EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 4U);
+        table.getArgCount = nullptr;
+        EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 4U);
+        EXPECT_THAT(commands.take(), IsEmpty());
+        table.getArgCount = [](const CMPIArgs*, CMPIStatus*) -> CMPICount { return 0; }; // the count does not matter
+        EXPECT_EQ(adapter.invokeMethod("SetCIMconfig", &failing, nullptr, nullptr), 0U);
+        EXPECT_THAT(commands.take(), SizeIs(2));
+    });
 }
 
 } // namespace

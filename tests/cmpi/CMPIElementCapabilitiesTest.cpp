@@ -99,6 +99,14 @@ TEST(CMPIElementCapabilities, LeadFromEitherEndToTheOtherAndBack) {
     EXPECT_EQ(test::print(back[0]), "VESKA_ComputerSystem.CreationClassName=\"VESKA_ComputerSystem\",Name=\"b\"");
 }
 
+TEST(CMPIElementCapabilities, LeadToAComputerWhoseNameIsEmpty) {
+    test::simulate({test::computer(0, "a"), test::computer(1, "")});
+    const std::vector<om::ObjectPath> found =
+        test::paths(test::associatorNames(capabilitiesPath("/computer/1"), className));
+    ASSERT_EQ(found.size(), 1U);
+    EXPECT_EQ(test::print(found[0]), "VESKA_ComputerSystem.CreationClassName=\"VESKA_ComputerSystem\",Name=\"\"");
+}
+
 TEST(CMPIElementCapabilities, GiveTheWholeInstanceAtTheOtherEnd) {
     test::simulate({test::computer(0, "node7")});
     const om::Answer answer = test::associators(computerPath("node7"), className);

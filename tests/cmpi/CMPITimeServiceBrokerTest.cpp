@@ -199,6 +199,19 @@ TEST_F(CMPITimeServiceBrokerTest, IgnoresANullInstance) {
     EXPECT_EQ(test::simulatedProperty("/computer/0", 200), 0);
 }
 
+TEST_F(CMPITimeServiceBrokerTest, LooksAtTheRegionOnlyWhereDaylightSavingIsNotGiven) {
+    static std::vector<std::string> asked;
+    asked.clear();
+    CMPIInstanceFT table = {};
+    table.getProperty = [](const CMPIInstance*, const char* name, CMPIStatus*) {
+        asked.emplace_back(name);
+        return CMPIData{CMPI_boolean, CMPI_goodValue, {}};
+    };
+    const CMPIInstance instance = {&table, &table};
+    CMPITimeService(broker, nullptr, path).modifyInstance(&instance, nullptr);
+    EXPECT_THAT(asked, ElementsAre("AutomaticDSTAdjustment"));
+}
+
 /// Arguments and a date-time whose slots can be taken away; those that are there ask the real ones.
 class WithoutSlots {
 public:
