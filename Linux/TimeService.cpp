@@ -59,7 +59,7 @@ bool TimeService::getSystemCreationClassName(std::string& className) const {
 
 bool TimeService::getAutomaticDSTAdjustment(bool& automatic) const {
     const TraceScope scope(VK_SCOPE(source));
-    unsigned int value = 0;
+    unsigned int value{};
     const bool known = instrumentation.getProperty(NodeLexicon::AutomaticDSTAdjustmentProperty, value);
     automatic = known && value != 0;
     return known;

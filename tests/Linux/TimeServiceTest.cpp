@@ -152,14 +152,18 @@ TEST_F(TimeServiceTest, HandsTheModeOn) {
 }
 
 TEST_F(TimeServiceTest, StopsNothingWhereNoDaemonRuns) {
+    test::takeLog();
     EXPECT_EQ(TimeService().StopService(), 0U);
+    EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(" LOG 4000 .* StopService: ENTERING: ")));
     EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps));
     EXPECT_THAT(commands.take(), ElementsAre("ps [-ef]"));
 }
 
 TEST_F(TimeServiceTest, StartsNothingWhereADaemonRuns) {
     runDaemon();
+    test::takeLog();
     EXPECT_EQ(TimeService().StartService(), 0U);
+    EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(" LOG 4000 .* StartService: ENTERING: ")));
     EXPECT_THAT(test::takeShellCalls(), ElementsAre(ps));
 }
 

@@ -43,7 +43,7 @@ public:
     Child(const Child&) = delete;
     Child& operator=(const Child&) = delete;
 
-    void killIt() const { kill(process, SIGKILL); }
+    void send(int signal) const { kill(process, signal); }
     int wait() {
         int status = -1;
         while (waitpid(process, &status, 0) < 0 && errno == EINTR) {
@@ -87,16 +87,21 @@ protected:
     /// Appends a word to the file `events`.
     void note(const std::string& word) const { std::ofstream(directory.path("events"), std::ios::app) << word << "\n"; }
 
-    /// Another process gets the lock when it is given back, and not before.
+    /// Another process gets the lock when it is given back, and not before, also where a signal comes meanwhile.
     void expectAnotherProcessToWait(std::optional<MachineLock>& held) const {
         Signal waiting;
         Child other([&] {
+            struct sigaction interrupting {}; // what waits, since nothing is to be done again
+            interrupting.sa_handler = [](int) {};
+            sigaction(SIGUSR1, &interrupting, nullptr);
             waiting.give();
             const MachineLock lock("x", directory.path());
             note(lock.keepsProcessesOut() ? "taken" : "not taken");
         });
         waiting.await();
         std::this_thread::sleep_for(std::chrono::milliseconds(50)); // in which it would be overtaken
+        other.send(SIGUSR1);
+        std::this_thread::sleep_for(std::chrono::milliseconds(50));
         note("given back");
         held.reset();
         EXPECT_EQ(other.wait(), 0);
@@ -190,7 +195,7 @@ TEST_F(MachineLockAmongProcesses, IsFreeOnceItsHolderIsDead) {
         pause();
     });
     taken.await();
-    holder.killIt();
+    holder.send(SIGKILL);
     holder.wait();
     EXPECT_TRUE(MachineLock("x", directory.path()).keepsProcessesOut());
 }
