@@ -228,7 +228,6 @@ void Parameter::addTo(TextBuffer<MessageBuffer::size + 1>& buffer) const {
         if (address != nullptr) buffer.add("0x");
         buffer.add(
             std::string_view(digits, std::to_chars(digits, end, reinterpret_cast<std::uintptr_t>(address), 16).ptr));
-        return;
     }
 }
 

@@ -1,7 +1,9 @@
 #include "common/CimDateTime.h"
 
+#include <algorithm>
 #include <array>
 #include <chrono>
+#include <cstddef>
 #include <cstdio>
 #include <cstdlib>
 
@@ -26,7 +28,8 @@ bool number(std::string_view text, std::size_t begin, std::size_t length, int& v
 /// Six digits; asterisks may stand for the last ones.
 bool fraction(std::string_view text, int& value) {
     std::string digits(text);
-    for (std::size_t i = digits.size(); i-- > 0 && digits[i] == '*';) digits[i] = '0';
+    const std::size_t known = text.find_last_not_of('*') + 1; // 0 where all are asterisks
+    std::fill(digits.begin() + static_cast<std::ptrdiff_t>(known), digits.end(), '0');
     return number(digits, 0, digits.size(), value);
 }
 

@@ -19,18 +19,26 @@ std::function<void()> logging;
 std::vector<const char*> logged; ///< the texts' own characters
 std::vector<const char*> traced;
 
+void expectNothing(const char* reserved, int reserved1, int reserved2) {
+    EXPECT_EQ(reserved, nullptr);
+    EXPECT_EQ(reserved1, 0);
+    EXPECT_EQ(reserved2, 0);
+}
+
 } // namespace
 
 namespace NVLog {
 
-void NVLogger::logLevelMessage(const char*, const char*, int, const std::string&, int, char*, int, int,
-                               const std::string& text) {
+void NVLogger::logLevelMessage(const char*, const char*, int, const std::string&, int, char* reserved, int reserved1,
+                               int reserved2, const std::string& text) {
+    expectNothing(reserved, reserved1, reserved2);
     logged.push_back(text.data());
     logging();
 }
 
-void NVLogger::traceLevelMessage(const char*, const char*, int, const std::string&, int, char*, int, int,
-                                 const std::string& text) {
+void NVLogger::traceLevelMessage(const char*, const char*, int, const std::string&, int, char* reserved, int reserved1,
+                                 int reserved2, const std::string& text) {
+    expectNothing(reserved, reserved1, reserved2);
     traced.push_back(text.data());
 }
 
