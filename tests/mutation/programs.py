@@ -42,12 +42,15 @@ class Program:
     def is_in(self, directory):
         return any(source.parent == directory for source in self.sources)
 
+    def is_of_rooms(self):
+        return any(source.parts[:1] == ("tests",) and source.parts[1] in ROOMS for source in self.sources)
+
 
 class Programs:
     def __init__(self, copy, size, quick=False):
         self.copy = copy
         self.size = size
-        self.quick = quick  # with the nearest ones alone: all others take a minute for each survivor
+        self.quick = quick  # with the rooms' own ones alone: the others take a minute for each survivor
         self.known = sorted(self.read_targets(), key=lambda program: program.target)
         if not self.known:
             raise workspace.Failure("the copy has no test programs")
@@ -76,13 +79,12 @@ class Programs:
         mirrored = [part for part in map(lambda program: self.mirror(program, file.stem), self.known) if part]
         nearest = [part for part in mirrored if part.is_in(room)] or mirrored
         whole = {part.target for part in nearest if not part.suites}
-        provider = pathlib.PurePath("tests/provider")  # looks at all of it
         same_room = [program for program in self.known if program.is_in(room) and program.target not in whole]
         seen = whole | {program.target for program in same_room}
         others = [program for program in self.known if program.target not in seen]
-        others.sort(key=lambda program: not program.is_in(provider))
+        others.sort(key=lambda program: not program.is_in(pathlib.PurePath("tests/provider")))  # they look at all of it
         if self.quick:
-            others = [program for program in others if program.is_in(provider)]
+            others = [program for program in others if program.is_of_rooms()]
         return [each for each in (nearest, same_room, *in_parts(others)) if each]
 
     def likely(self, file):
