@@ -19,13 +19,13 @@ const TraceSource& CMPITimeService::traceSource() {
 
 void CMPITimeService::modifyInstance(const CMPIInstance* instance, const char** propertyList) {
     const ParameterTraceScope scope(VK_SCOPE(source), " referenceInstance=", instance, " properties=", propertyList);
+    if (instance == nullptr) return;
     bool automatic{};
-    if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic)) {
+    unsigned short region{};
+    if (ProviderUtilities::getProperty(instance, "AutomaticDSTAdjustment", automatic))
         data.setAutomaticDSTAdjustment(automatic); // on purpose: its result is ignored
-        return;
-    }
-    unsigned short region{}; // on purpose: accepted and ignored
-    ProviderUtilities::getProperty(instance, "Region", region);
+    else
+        ProviderUtilities::getProperty(instance, "Region", region); // on purpose: accepted and ignored
 }
 
 namespace {
@@ -33,8 +33,9 @@ namespace {
 using Cmpi::hasService;
 using Cmpi::hasSlot;
 
-/// An argument's data; of type CMPI_null when it is missing. "GetRequest" was read before, so that the slot is there.
+/// An argument's data; of type CMPI_null when it is missing.
 CMPIData argument(const CMPIArgs* in, const char* name) {
+    if (!hasSlot(in, &CMPIArgsFT::getArg)) return {};
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPIData data = in->ft->getArg(in, name, &status);
     return status.rc == CMPI_RC_OK ? data : CMPIData{};

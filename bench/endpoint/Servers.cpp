@@ -112,10 +112,20 @@ ServerProcess::~ServerProcess() {
 
 bool ServerProcess::end() {
     if (process <= 0) return false;
+    constexpr int patience = 300; // tenths of a second
     int status = -1;
     kill(process, SIGTERM);
-    waitpid(std::exchange(process, -1), &status, 0);
+    for (int i = 0; i < patience && isRunning(status); ++i) std::this_thread::sleep_for(std::chrono::milliseconds(100));
+    if (process > 0) {
+        kill(process, SIGKILL);
+        waitpid(std::exchange(process, -1), &status, 0);
+    }
     return WIFEXITED(status) && WEXITSTATUS(status) == 0;
+}
+
+bool ServerProcess::isRunning(int& status) {
+    if (process > 0 && waitpid(process, &status, WNOHANG) != 0) process = -1;
+    return process > 0;
 }
 
 std::size_t ServerProcess::residentMemory() const {
@@ -150,7 +160,8 @@ Endpoint::Endpoint(const std::string& program) : log(std::tmpfile()) {
               "http://127.0.0.1:0", nullptr);
         _exit(127);
     }
-    while (listening == 0 && waitpid(process, nullptr, WNOHANG) == 0) {
+    int status = 0;
+    while (listening == 0 && isRunning(status)) {
         char line[200] = "";
         if (pread(fileno(log), line, sizeof line - 1, 0) < 0) fail("pread");
         const std::string text = line;
@@ -159,8 +170,9 @@ Endpoint::Endpoint(const std::string& program) : log(std::tmpfile()) {
         std::this_thread::sleep_for(std::chrono::milliseconds(10));
     }
     if (listening != 0) return;
+    const std::string said = lastWords();
     std::fclose(log);
-    throw std::runtime_error(program + " does not start");
+    throw std::runtime_error(program + " does not start: " + said);
 }
 
 Endpoint::~Endpoint() {

@@ -21,11 +21,14 @@ public:
     std::size_t descriptors() const;
     /// Of all its threads, in microseconds.
     double processorTime() const;
-    /// Ends it. Whether it ended with status 0, which a sanitizer that found something changes.
+    /// Ends it, after half a minute by force. Whether it ended with status 0, which a sanitizer that found something
+    /// changes.
     bool end();
 
 protected:
     ServerProcess() = default;
+    /// Sets the status of one that has ended.
+    bool isRunning(int& status);
 
     pid_t process = -1;
     int listening = 0;
@@ -37,7 +40,7 @@ public:
     explicit Endpoint(const std::string& program);
     ~Endpoint();
 
-    /// The end of its log.
+    /// The end of its log, once it has ended.
     std::string lastWords() const;
 
 private:

@@ -42,18 +42,22 @@ std::string binDirectory() {
 
 TEST_F(CIMServiceConfigTest, IsNamedAfterItsClass) {
     const CIMServiceConfig config;
-    const std::pair<bool (CIMServiceConfig::*)(std::string&) const, std::string> texts[] = {
-        {&CIMServiceConfig::getName, "VESKA_CIMServiceConfig"},
-        {&CIMServiceConfig::getCreationClassName, "VESKA_CIMServiceConfig"},
-        {&CIMServiceConfig::getSystemCreationClassName, "VESKA_ComputerSystem"},
-        {&CIMServiceConfig::getSystemName, test::hostName()},
+    const struct {
+        const char* name;
+        bool (CIMServiceConfig::*getter)(std::string&) const;
+        std::string expected;
+    } texts[] = {
+        {"getName", &CIMServiceConfig::getName, "VESKA_CIMServiceConfig"},
+        {"getCreationClassName", &CIMServiceConfig::getCreationClassName, "VESKA_CIMServiceConfig"},
+        {"getSystemCreationClassName", &CIMServiceConfig::getSystemCreationClassName, "VESKA_ComputerSystem"},
+        {"getSystemName", &CIMServiceConfig::getSystemName, test::hostName()},
     };
-    for (const auto& [getter, expected] : texts) {
+    for (const auto& [name, getter, expected] : texts) {
         std::string text;
         test::takeLog();
         EXPECT_TRUE((config.*getter)(text));
         EXPECT_EQ(text, expected);
-        EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(" LOG 4000 .* get[A-Za-z]+: ENTERING: "))) << expected;
+        EXPECT_THAT(test::takeLog(), Contains(ContainsRegex(" LOG 4000 .* " + std::string(name) + ": ENTERING: ")));
     }
 }
 

@@ -12,7 +12,7 @@ inline void fill(std::string& text) {
 }
 template <class Number>
 void fill(Number& number) {
-    number = static_cast<Number>(1);
+    number = static_cast<Number>(77);
 }
 template <class Value>
 void fill(std::vector<Value>& values) {
@@ -22,11 +22,13 @@ void fill(std::vector<Value>& values) {
 /// Asks getters that have no value: each answers false, and leaves its output as it was.
 template <class Data, class... Values>
 void expectUntouched(const Data& data, bool (Data::*... getters)(Values&) const) {
-    const auto ask = [&data](auto getter, auto value) {
+    int number = 0;
+    const auto ask = [&](auto getter, auto value) {
         fill(value);
         const auto before = value;
-        EXPECT_FALSE((data.*getter)(value));
-        EXPECT_EQ(value, before);
+        EXPECT_FALSE((data.*getter)(value)) << "getter " << number;
+        EXPECT_EQ(value, before) << "getter " << number;
+        ++number;
     };
     (ask(getters, Values()), ...);
 }

@@ -149,6 +149,7 @@ public:
             return empty ? CMPIStatus{CMPI_RC_OK, nullptr} : usualPaths->addKey(Usual(path).path, name, value, type);
         };
         paths.getKey = [](const CMPIObjectPath* path, const char* name, CMPIStatus* status) {
+            ++keysAsked;
             return usualPaths->getKey(Usual(path).path, name, status);
         };
         paths.getKeyCount = [](const CMPIObjectPath* path, CMPIStatus* status) {
@@ -158,6 +159,7 @@ public:
     }
 
     CMPIBroker broker = *usual();
+    static inline int keysAsked = 0;
 
 private:
     /// The usual broker knows its paths by their table.
@@ -181,8 +183,10 @@ TEST(CMPIElementCapabilities, AreNoneForAnUnknownComputerAlsoWhereTheBrokerHasNo
         CMPIObjectPath* const source =
             CMNewObjectPath(test::provider().broker(), "root/cimv2", "VESKA_ComputerSystem", nullptr);
         CMAddKey(source, "Name", reinterpret_cast<const CMPIValue*>(name), CMPI_chars);
+        BrokerWithoutEmptyKeys::keysAsked = 0;
         const VK::BaseServerProvider::CMPIElementCapabilities adapter(&without.broker, nullptr, source);
         EXPECT_EQ(static_cast<bool>(adapter), found) << name;
+        EXPECT_EQ(BrokerWithoutEmptyKeys::keysAsked, 1) << "by the walk, or to see whether it has an empty one";
     }
 }
 

@@ -1,3 +1,5 @@
+#include "cmpi/CMPIPhysicalPackage.h"
+#include "support/Provider.h"
 #include "support/Requests.h"
 #include "support/SimulatedHost.h"
 
@@ -86,6 +88,23 @@ TEST(CMPIPhysicalPackage, AnswersAnUnknownTagWithNothingAndNoError) {
     EXPECT_THAT(answer.results, IsEmpty());
     EXPECT_EQ(answer.code, CMPI_RC_OK);
     EXPECT_TRUE(answer.done);
+}
+
+TEST(CMPIPhysicalPackage, AsksAPathWithoutKeysForNone) {
+    static int asked;
+    asked = 0;
+    CMPIObjectPathFT table = {};
+    table.getKeyCount = [](const CMPIObjectPath*, CMPIStatus*) -> CMPICount { return 0; };
+    table.getKey = [](const CMPIObjectPath*, const char*, CMPIStatus*) {
+        ++asked;
+        return CMPIData{};
+    };
+    const CMPIObjectPath path = {&table, &table};
+    test::simulate({test::chassis(0, 0, "A")});
+    VK::BaseServerProvider::CMPIPhysicalPackage adapter(test::provider().broker(), nullptr, std::string("root/cimv2"));
+    adapter.setObjectPath(&path);
+    EXPECT_EQ(asked, 0);
+    EXPECT_TRUE(adapter);
 }
 
 } // namespace

@@ -201,15 +201,21 @@ TEST_F(CMPITimeServiceBrokerTest, IgnoresANullInstance) {
 
 TEST_F(CMPITimeServiceBrokerTest, LooksAtTheRegionOnlyWhereDaylightSavingIsNotGiven) {
     static std::vector<std::string> asked;
-    asked.clear();
+    static CMPIType type;
     CMPIInstanceFT table = {};
     table.getProperty = [](const CMPIInstance*, const char* name, CMPIStatus*) {
         asked.emplace_back(name);
-        return CMPIData{CMPI_boolean, CMPI_goodValue, {}};
+        return CMPIData{type, CMPI_goodValue, {}};
     };
     const CMPIInstance instance = {&table, &table};
+    asked.clear();
+    type = CMPI_boolean;
     CMPITimeService(broker, nullptr, path).modifyInstance(&instance, nullptr);
     EXPECT_THAT(asked, ElementsAre("AutomaticDSTAdjustment"));
+    asked.clear();
+    type = CMPI_uint16;
+    CMPITimeService(broker, nullptr, path).modifyInstance(&instance, nullptr);
+    EXPECT_THAT(asked, ElementsAre("AutomaticDSTAdjustment", "Region"));
 }
 
 /// Arguments and a date-time whose slots can be taken away; those that are there ask the real ones.

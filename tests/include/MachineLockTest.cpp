@@ -91,7 +91,7 @@ protected:
     void expectAnotherProcessToWait(std::optional<MachineLock>& held) const {
         Signal waiting;
         Child other([&] {
-            struct sigaction interrupting {}; // what waits, since nothing is to be done again
+            struct sigaction interrupting {}; // without SA_RESTART: the wait ends with EINTR
             interrupting.sa_handler = [](int) {};
             sigaction(SIGUSR1, &interrupting, nullptr);
             waiting.give();
@@ -154,6 +154,20 @@ TEST(MachineLock, CanBeHadInAChildThatWasForkedWhileAThreadHeldIt) {
             held.reset();
             const MachineLock lock("x", "/nowhere");
         });
+        Child holdersCopyAfterwards([&] {
+            std::optional<MachineLock> own(std::in_place, "x", "/nowhere");
+            held.reset();
+            std::atomic<bool> isIn{false};
+            std::thread other([&] {
+                const MachineLock lock("x", "/nowhere");
+                isIn = true;
+            });
+            std::this_thread::sleep_for(std::chrono::milliseconds(50));
+            EXPECT_FALSE(isIn) << "what is lost is no lock of this process";
+            own.reset();
+            other.join();
+        });
+        EXPECT_EQ(holdersCopyAfterwards.wait(), 0);
         EXPECT_EQ(holdersCopy.wait(), 0);
     }).join();
 }

@@ -140,6 +140,14 @@ TEST(TracePlace, MakesItsLinesOnce) {
     quiet = false;
 }
 
+TEST(TracePlace, NeedsNoMemoryForALongLineAfterAShortOne) {
+    quiet = true;
+    const std::string longText(400, 'x');
+    traceVariable(source, "name", "short");
+    EXPECT_EQ(support::allocationsDuring([&] { traceVariable(source, "name", longText.c_str()); }), 0U);
+    quiet = false;
+}
+
 void reachARacedPlace() {
     traceMethod(VK_METHOD_OF(source, "raced"));
 }

@@ -19,6 +19,11 @@ class Equivalents:
                     raise ValueError(f"{number}: not understood: {line}")
                 entry = (function, kind, change)
                 self.reasons[entry] = ""
+            if entry and is_expression(entry[2]):
+                try:
+                    re.compile(entry[2][1:-1])
+                except re.error as error:
+                    raise ValueError(f"{number}: {entry[2]}: {error}") from error
         for entry, reason in self.reasons.items():
             if not reason:
                 raise ValueError(f"no reason stands below {': '.join(filter(None, entry))}")
@@ -32,11 +37,15 @@ class Equivalents:
         return [": ".join(filter(None, entry)) for entry in self.reasons if not any(covers(entry, each) for each in mutants)]
 
 
+def is_expression(change):
+    return len(change) > 1 and change.startswith("/") and change.endswith("/")
+
+
 def covers(entry, mutant):
     function, kind, change = entry
     if (function, kind) != (mutant.function, mutant.kind):
         return False
-    if change.startswith("/") and change.endswith("/"):
+    if is_expression(change):
         return re.search(change[1:-1], mutant.change()) is not None
     return change in ("", mutant.change())
 

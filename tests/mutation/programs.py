@@ -50,7 +50,7 @@ class Programs:
     def __init__(self, copy, size, quick=False):
         self.copy = copy
         self.size = size
-        self.quick = quick  # with the rooms' own ones alone: the others take a minute for each survivor
+        self.quick = quick  # only those that mirror the rooms' sources: the others take a minute for each survivor
         self.known = sorted(self.read_targets(), key=lambda program: program.target)
         if not self.known:
             raise workspace.Failure("the copy has no test programs")

@@ -149,6 +149,10 @@ class EquivalentsTest(Checkout):
         self.assertEqual(listed.reason(self.constant), "Nobody counts.")
         self.assertEqual(listed.stale([self.constant]), ["first: constant: /7/"])
 
+    def test_an_expression_that_cannot_be_read_is_named(self):
+        with self.assertRaisesRegex(ValueError, r"^1: /\(/: "):
+            equivalents.Equivalents("first: constant: /(/\n  So.\n")
+
     def test_an_entry_without_mutants_is_stale(self):
         listed = equivalents.Equivalents("first: constant\n  So.\nfirst: boundary\n  So.\nfirst: constant: 4 -> 6\n  So.\n")
         self.assertEqual(listed.stale([self.comparison, self.constant]), ["first: boundary", "first: constant: 4 -> 6"])
