@@ -102,7 +102,7 @@ TEST_F(SnapshotRoot, StaysInsideWithoutTheKernelsHelp) {
     directory.link("../../../../../../passwd", "dots");
     directory.link("/etc/made", "link");
     directory.write("etc/other", "");
-    for (const int error : {ENOSYS, EPERM}) {
+    for (const int error : {ENOSYS, EPERM, EAGAIN}) {
         const std::string texts = support::inChild([this, error] {
             if (!refuseOpenat2(error)) return std::string("cannot refuse system calls");
             const int fd = root.open("/link", O_WRONLY | O_CREAT, 0640);
@@ -194,13 +194,23 @@ TEST_F(SnapshotRoot, ChecksWhetherSomethingExists) {
 TEST_F(SnapshotRoot, OpensForWritingBelowTheRootOnly) {
     directory.link("/etc/made", "link");
     directory.write("etc/other", "");
-    const int fd = root.open("/link", O_WRONLY | O_CREAT, 0640);
+    const int fd = root.open("/link", O_WRONLY | O_CREAT, 0600);
     ASSERT_GE(fd, 0);
     EXPECT_EQ(fcntl(fd, F_GETFD) & FD_CLOEXEC, FD_CLOEXEC);
     EXPECT_EQ(write(fd, "x", 1), 1);
     close(fd);
     EXPECT_EQ(root.read("/etc/made").text, "x");
+    struct stat status {};
+    ASSERT_EQ(stat(directory.path("etc/made").c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode & 07777, 0600U);
     EXPECT_EQ(root.open("/none/file", O_WRONLY | O_CREAT, 0640), -ENOENT);
+}
+
+TEST_F(SnapshotRoot, TakesNoNoticeOfAModeWhereNothingIsMade) {
+    directory.write("etc/other", "");
+    const int fd = root.open("/etc/other", O_RDONLY, 0640);
+    EXPECT_GE(fd, 0);
+    close(fd);
 }
 
 TEST_F(SnapshotRoot, LeavesNoDescriptorOpen) {
@@ -223,6 +233,16 @@ TEST(LiveRoot, ReadsTheKernelsFilesWhichStateNoSize) {
     EXPECT_EQ(root.getDirectory(), "/");
     EXPECT_THAT(root.read("/proc/self/status").text, StartsWith("Name:\t"));
     EXPECT_EQ(root.read("/dev/null").error, EINVAL);
+}
+
+TEST(LiveRoot, BeginsAtTheRootWhereverTheProcessIs) {
+    support::inOwnProcess([] {
+        EXPECT_EQ(chdir("/proc"), 0);
+        EXPECT_THAT(Root("/").read("proc/self/status").text, StartsWith("Name:\t"));
+        EXPECT_EQ(Root("/").read("self/status").error, ENOENT);
+        EXPECT_EQ(Root("/").read("/none").error, ENOENT);
+        EXPECT_EQ(Root("/").open("/none", O_RDONLY), -ENOENT);
+    });
 }
 
 TEST(LiveRoot, IsAlsoMeantByOtherSpellings) {
