@@ -3,8 +3,6 @@
 #include "vk/CmpiSlots.h"
 
 #include <cstdio>
-#include <optional>
-#include <utility>
 
 #include <strings.h>
 
@@ -15,13 +13,6 @@ static const TraceSource source{loggerCMPICIMServiceConfig, "CMPICIMServiceConfi
 
 const TraceSource& CMPICIMServiceConfig::traceSource() {
     return source;
-}
-
-/// An argument of the method, or none.
-static std::optional<unsigned int> argument(const CMPIArgs* in, const char* name) {
-    unsigned int value{};
-    if (!ProviderUtilities::getProperty(in, name, value)) return std::nullopt;
-    return value;
 }
 
 unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CMPIArgs* in, CMPIArgs* out,
@@ -36,18 +27,22 @@ unsigned int CMPICIMServiceConfig::invokeMethod(const char* methodName, const CM
     in->ft->getArgCount(in, &status);
     if (status.rc != CMPI_RC_OK) return CMPI_RC_ERR_INVALID_PARAMETER;
 
-    // Both are read before either is set.
-    const std::pair<const char*, std::optional<unsigned int>> settings[] = {
-        {"deliveryRetryIntervalSec", argument(in, "deliveryRetryIntervalSec")},
-        {"deliveryRetryAttempts", argument(in, "deliveryRetryAttempts")}};
+    struct Argument {
+        const char* name;
+        unsigned int value;
+        bool given;
+    };
+    Argument arguments[] = {{"deliveryRetryIntervalSec", {}, {}}, {"deliveryRetryAttempts", {}, {}}};
+    for (Argument& argument : arguments)
+        argument.given = ProviderUtilities::getProperty(in, argument.name, argument.value);
 
     // In this order; the first failure ends it; otherwise the last setting's result is returned.
     unsigned int answer = CMPI_RC_ERR_INVALID_PARAMETER;
-    for (const auto& [name, value] : settings) {
-        if (!value) continue;
+    for (const Argument& argument : arguments) {
+        if (!argument.given) continue;
         char request[256] = {};
         // Signed on purpose, so that a value above 2147483647 goes out negative.
-        std::snprintf(request, sizeof request, "%s%s%d", name, "=", static_cast<int>(*value));
+        std::snprintf(request, sizeof request, "%s%s%d", argument.name, "=", static_cast<int>(argument.value));
         answer = executeMethod(request) != 0 ? CMPI_RC_ERR_FAILED : CMPI_RC_OK;
         if (answer != CMPI_RC_OK) break;
     }
